@@ -1,0 +1,11 @@
+set(CMAKE_C_COMPILER ${BR_MINGW_TRIPLE}-gcc-posix)
+set(CMAKE_CXX_COMPILER ${BR_MINGW_TRIPLE}-g++-posix)
+set(CMAKE_RC_COMPILER ${BR_MINGW_TRIPLE}-windres)
+set(BR_WIDL ${BR_MINGW_TRIPLE}-widl)
+set(CMAKE_FIND_ROOT_PATH /usr/${BR_MINGW_TRIPLE})
+set(CMAKE_FIND_ROOT_PATH_MODE_PROGRAM NEVER)
+set(CMAKE_FIND_ROOT_PATH_MODE_LIBRARY ONLY)
+set(CMAKE_FIND_ROOT_PATH_MODE_INCLUDE ONLY)
+# No runtime DLLs beside BR_Info.dll or the test programs.
+set(CMAKE_EXE_LINKER_FLAGS_INIT "-static -static-libgcc -static-libstdc++")
+set(CMAKE_SHARED_LINKER_FLAGS_INIT "-static -static-libgcc -static-libstdc++")

@@ -1,0 +1,2 @@
+#include <doctest/doctest.h>
+TEST_CASE("smoke") { CHECK(1 + 1 == 2); }
