@@ -1,0 +1,93 @@
+#include "tides/engine/prediction.h"
+
+#include <climits>
+#include <cmath>
+
+#include "tides/engine/nodal_corrections.h"
+
+namespace br::tides {
+
+std::int32_t DaySampleCount(double step) {
+  const double q = 24.0 / step + 0.49;
+  // The quotient as a 32-bit number; one that does not fit reads as the most negative.
+  if (!(q > -2147483649.0 && q < 2147483647.0)) return INT32_MIN;
+  return static_cast<std::int32_t>(q) + 1;
+}
+
+double StartHours(std::int64_t localMidnightSeconds) {
+  return static_cast<double>(localMidnightSeconds - kPredictionEpochSeconds) / 3600.0;
+}
+
+void SetUpDay(double t0) {
+  TideEngine& e = TheTideEngine();
+  const AstronomicalAngles a = ArgumentsAt(e.arguments, t0);
+  // The epoch is a UT midnight, so t0 modulo 24 is the UT time of day of the start.
+  double utHours = std::fmod(t0, 24.0);
+  if (utHours < 0.0) utHours += 24.0;
+  const double tau = utHours * kSolarHourRate + a.h - a.s;
+
+  for (std::int32_t j = 1; j < e.workingCount; ++j) {
+    StationConstituent& w = e.working[static_cast<std::size_t>(j)];
+    const DoodsonRow& d = DoodsonTable[static_cast<std::size_t>(w.number)];
+    w.V = NormalizeAngle(d[0] * tau + d[1] * a.s + d[2] * a.h + d[3] * a.p + d[4] * a.N + d[5] * a.p1 +
+                         d[6] * (kPi / 2.0));
+  }
+  ApplyNodalCorrections(a.N, a.p);
+  for (std::int32_t j = 0; j < e.workingCount; ++j) {
+    StationConstituent& w = e.working[static_cast<std::size_t>(j)];
+    const ConstituentTableEntry& c = e.constituents[static_cast<std::size_t>(w.number)];
+    w.u = c.u;
+    w.f = c.f;
+  }
+}
+
+namespace {
+// The series in the form the sample loop wants: one multiply-add and one cosine per term.
+struct Term {
+  double amplitude;  // H x f
+  double phase;      // V + u - g, advanced by each step
+  double advance;    // step x speed
+};
+}  // namespace
+
+void SynthesizeSamples(double step, float* samples, std::int32_t count) {
+  TideEngine& e = TheTideEngine();
+  const std::int32_t n = e.workingCount;
+  Term terms[kConstituentCount];
+  for (std::int32_t j = 0; j < n; ++j) {
+    const StationConstituent& w = e.working[static_cast<std::size_t>(j)];
+    const double speed = e.constituents[static_cast<std::size_t>(w.number)].speed;
+    terms[j] = Term{w.H * w.f, w.V + w.u - w.g, step * speed};
+  }
+  for (std::int32_t k = 0; k < count; ++k) {
+    float sum = 0.0f;
+    for (std::int32_t j = 0; j < n; ++j) {
+      sum = static_cast<float>(sum + terms[j].amplitude * std::cos(terms[j].phase));
+      terms[j].phase += terms[j].advance;
+    }
+    samples[k] = sum;
+  }
+}
+
+DayPrediction PredictDay(const StationIndexRecord& key, StationHeader& header, const CalendarDate& date,
+                         double step, float* samples, std::size_t capacity, SunDay& sun,
+                         const LocalMidnightFunction& toLocalMidnight) {
+  DayPrediction result;
+  ResetConstituents();
+  StationHeader found;
+  if (!FindStation(key, found)) return result;
+  result.stationFound = true;
+  header = found;
+
+  sun = ComputeSunDay(date, found.latitude / 60.0, found.longitude / 60.0, found.zone);
+
+  const std::int32_t count = DaySampleCount(step);
+  SetUpDay(StartHours(toLocalMidnight(date)));
+  if (count < 1 || samples == nullptr) return result;
+  const std::size_t wanted = static_cast<std::size_t>(count);
+  result.sampleCount = static_cast<std::int32_t>(wanted < capacity ? wanted : capacity);
+  SynthesizeSamples(step, samples, result.sampleCount);
+  return result;
+}
+
+}  // namespace br::tides
