@@ -1,0 +1,48 @@
+// Writes station folders for the engine tests into fresh temporary folders.
+#pragma once
+
+#include <cstdint>
+#include <filesystem>
+#include <string>
+#include <vector>
+
+#include "tides/engine/station_files.h"
+
+namespace br::tides::testing {
+
+struct TestStation {
+  std::string name;
+  std::int16_t latitude = 0;   // minutes
+  std::int16_t longitude = 0;  // minutes
+  std::int8_t zone = 0;
+  std::vector<ConstituentRecord> constituents;
+  // Header count byte; when unset, the number of constituents.
+  bool overrideCount = false;
+  std::int8_t count = 0;
+};
+
+// A temporary folder removed with the object.
+class TempFolder {
+ public:
+  explicit TempFolder(const std::string& hint = "engine");
+  ~TempFolder();
+  TempFolder(const TempFolder&) = delete;
+  TempFolder& operator=(const TempFolder&) = delete;
+  const std::filesystem::path& path() const { return path_; }
+  std::string str() const { return path_.string(); }
+
+ private:
+  std::filesystem::path path_;
+};
+
+// Writes the three files of stations into folder (created if missing): "td_num.ntx" in the
+// given order, "td_crd.ntx" sorted by StationKey, blocks in "td_pnt.dat" in the given order.
+void WriteStationFolder(const std::filesystem::path& folder, const std::vector<TestStation>& stations);
+
+// Cuts a file down to size bytes.
+void TruncateFile(const std::filesystem::path& file, std::uintmax_t size);
+
+// Writes raw bytes as a file.
+void WriteBytes(const std::filesystem::path& file, const std::vector<std::uint8_t>& bytes);
+
+}  // namespace br::tides::testing

@@ -1,0 +1,155 @@
+#include <doctest/doctest.h>
+
+#include "tides/engine/calendar.h"
+#include "tides/engine/sun_events.h"
+#include "tides/engine/tide_engine.h"
+
+using namespace br::tides;
+
+namespace {
+
+bool Same(const HourMinute& hm, int hour, int minute) { return hm.hour == hour && hm.minute == minute; }
+
+SunDay Day(CalendarDate date, double lat, double lon, int zone) { return ComputeSunDay(date, lat, lon, zone); }
+
+}  // namespace
+
+TEST_CASE("calendar arithmetic") {
+  CHECK(JulianDayNumber({2000, 1, 1}) == 2451545);
+  CHECK(JulianDayNumber({2000, 3, 20}) == 2451624);
+  CHECK(DaysFromCivil({1970, 1, 1}) == 0);
+  CHECK(DaysFromCivil({1996, 1, 1}) * 86400 == kPredictionEpochSeconds);
+  CHECK(DaysFromCivil({1969, 12, 31}) == -1);
+  CHECK(DaysFromCivil({2000, 3, 1}) - DaysFromCivil({2000, 2, 28}) == 2);
+  CHECK(DaysFromCivil({2100, 3, 1}) - DaysFromCivil({2100, 2, 28}) == 1);
+  CHECK(DaysFromCivil({1601, 1, 1}) == -134774);
+  CHECK(DayCountDate({2000, 1, 1}, 0, 0) == 36526.0);
+  CHECK(DayCountDate({1899, 12, 30}, 12, 0) == 0.5);
+  CHECK(DayCountDate({2000, 1, 1}, 18, 0) == 36526.75);
+  CHECK(DayCountDate({1899, 12, 29}, 6, 0) == -1.25);
+  CHECK(FixedOffsetLocalMidnight(-5 * 3600)({1996, 1, 1}) == kPredictionEpochSeconds + 5 * 3600);
+  CHECK(FixedOffsetLocalMidnight(0)({2038, 1, 20}) > 2147483647LL);
+}
+
+TEST_CASE("sun position near J2000") {
+  double gha = 0, dec = 0;
+  SunPosition(2451545, 12.0, gha, dec);
+  CHECK(dec == doctest::Approx(-23.0).epsilon(0.01));
+  // Equation of time about -3.3 minutes on 1 January: the sun is late by about 0.8 degrees.
+  CHECK(gha == doctest::Approx(-0.8).epsilon(0.3));
+  SunPosition(2451716, 12.0, gha, dec);  // 2000-06-20
+  CHECK(dec == doctest::Approx(23.43).epsilon(0.005));
+}
+
+TEST_CASE("the equator at the March equinox") {
+  const std::int32_t J = JulianDayNumber({2000, 3, 20});
+  CHECK(ComputeSunEvent(J, 0, 0, +1, -12) == doctest::Approx(5.322).epsilon(2e-4));
+  CHECK(ComputeSunEvent(J, 0, 0, +1, kSunriseAltitude) == doctest::Approx(6.066).epsilon(2e-4));
+  CHECK(ComputeSunEvent(J, 0, 0, -1, kSunriseAltitude) == doctest::Approx(18.175).epsilon(2e-4));
+  CHECK(ComputeSunEvent(J, 0, 0, -1, -12) == doctest::Approx(18.919).epsilon(2e-4));
+  const SunDay d = Day({2000, 3, 20}, 0, 0, 0);
+  CHECK(Same(d.times.events[0], 5, 19));
+  CHECK(Same(d.times.events[1], 6, 3));
+  CHECK(Same(d.times.events[2], 18, 10));
+  CHECK(Same(d.times.events[3], 18, 55));
+  const PublishedSunTimes p = PublishSunTimes(d);
+  CHECK(p.kind == SunDayKind::kNormal);
+  for (int i = 0; i < 4; ++i) CHECK(Same(p.events[i], d.times.events[i].hour, d.times.events[i].minute));
+}
+
+TEST_CASE("midsummer at 50 and 60 degrees north") {
+  const SunDay d50 = Day({2000, 6, 21}, 50, 0, 0);
+  CHECK(d50.zoneHours[0] == doctest::Approx(2.006).epsilon(5e-4));
+  CHECK(d50.zoneHours[1] == doctest::Approx(3.846).epsilon(3e-4));
+  CHECK(d50.zoneHours[2] == doctest::Approx(20.218).epsilon(2e-4));
+  CHECK(d50.zoneHours[3] == doctest::Approx(22.057).epsilon(2e-4));
+
+  const SunDay d60 = Day({2000, 6, 21}, 60, 0, 0);
+  CHECK(d60.zoneHours[1] == doctest::Approx(2.598).epsilon(4e-4));
+  CHECK(d60.zoneHours[2] == doctest::Approx(21.466).epsilon(2e-4));
+  // The sun never gets down to -12 degrees: no twilight events.
+  CHECK(d60.zoneHours[0] == kNoSunEvent);
+  CHECK(d60.zoneHours[3] == kNoSunEvent);
+  CHECK(d60.outcomes[0] == SunEventOutcome::kSunStaysAbove);
+  CHECK(Same(d60.times.events[0], -1, 0));
+  const PublishedSunTimes p = PublishSunTimes(d60);
+  CHECK(p.kind == SunDayKind::kNormal);
+  CHECK(Same(p.events[0], 21, 0));
+  CHECK(Same(p.events[1], 2, 35));
+  CHECK(Same(p.events[2], 21, 27));
+  CHECK(Same(p.events[3], 21, 0));
+}
+
+TEST_CASE("80 degrees north: midnight sun and polar night") {
+  const SunDay june = Day({2000, 6, 21}, 80, 0, 0);
+  CHECK(june.zoneHours[1] == kNoSunEvent);
+  CHECK(june.zoneHours[2] == kNoSunEvent);
+  CHECK(Same(june.times.events[1], -1, 0));
+  CHECK(june.outcomes[1] == SunEventOutcome::kSunStaysAbove);
+  PublishedSunTimes p = PublishSunTimes(june);
+  CHECK(p.kind == SunDayKind::kPolarDay);
+  CHECK(Same(p.events[0], 0, 0));
+  CHECK(Same(p.events[1], 0, 0));
+  CHECK(Same(p.events[2], 23, 59));
+  CHECK(Same(p.events[3], 23, 59));
+
+  const SunDay december = Day({2000, 12, 21}, 80, 0, 0);
+  CHECK(december.outcomes[1] == SunEventOutcome::kSunStaysBelow);
+  p = PublishSunTimes(december);
+  CHECK(p.kind == SunDayKind::kPolarNight);
+  for (const HourMinute& hm : p.events) CHECK(Same(hm, 0, 0));
+}
+
+TEST_CASE("polar day and night are told by the sun, not by the month") {
+  // Early September at 85 N: the sun still circles above the horizon.
+  PublishedSunTimes p = PublishSunTimes(Day({2000, 9, 5}, 85, 0, 0));
+  CHECK(p.kind == SunDayKind::kPolarDay);
+  CHECK(Same(p.events[2], 23, 59));
+  // End of March at 88 S: the sun has set for the winter, in a month a calendar rule
+  // would call southern summer.
+  p = PublishSunTimes(Day({2000, 3, 31}, -88, 0, 0));
+  CHECK(p.kind == SunDayKind::kPolarNight);
+  p = PublishSunTimes(Day({2000, 12, 21}, -80, 0, 0));
+  CHECK(p.kind == SunDayKind::kPolarDay);
+}
+
+TEST_CASE("zone shifts") {
+  const SunDay utc = Day({2000, 3, 20}, 0, 0, 0);
+  const SunDay plusOne = Day({2000, 3, 20}, 0, 0, -1);  // UTC+1 holds -1
+  for (int i = 0; i < 4; ++i) CHECK(plusOne.zoneHours[i] == doctest::Approx(utc.zoneHours[i] + 1.0));
+  CHECK(Same(plusOne.times.events[1], 7, 3));
+  // Longitude moves the events the other way: 15 degrees east is an hour earlier in UT.
+  const SunDay east = Day({2000, 3, 20}, 0, 15, 0);
+  CHECK(east.zoneHours[1] == doctest::Approx(utc.zoneHours[1] - 1.0).epsilon(1e-3));
+}
+
+TEST_CASE("events outside the zone's day are brought into it before splitting") {
+  // Zone +8 at longitude 0: sunrise at -1.93 h zone time.
+  const SunDay d = Day({2000, 3, 20}, 0, 0, 8);
+  CHECK(d.zoneHours[1] == doctest::Approx(-1.934).epsilon(1e-3));
+  // The raw split keeps the sign: hour -1 would read as "no event".
+  CHECK(Same(d.times.events[1], -1, -56));
+  const PublishedSunTimes p = PublishSunTimes(d);
+  CHECK(p.kind == SunDayKind::kNormal);
+  CHECK(Same(p.events[0], 21, 19));
+  CHECK(Same(p.events[1], 22, 3));
+  CHECK(Same(p.events[2], 10, 10));
+  CHECK(Same(p.events[3], 10, 55));
+  // Zone -12 pushes sunset past midnight.
+  const PublishedSunTimes late = PublishSunTimes(Day({2000, 3, 20}, 0, 0, -12));
+  CHECK(Same(late.events[2], 6, 10));
+  for (const HourMinute& hm : late.events) {
+    CHECK(hm.hour >= 0);
+    CHECK(hm.hour <= 23);
+    CHECK(hm.minute >= 0);
+    CHECK(hm.minute <= 59);
+  }
+}
+
+TEST_CASE("hour and minute split") {
+  CHECK(Same(SplitHours(-1.0), -1, 0));
+  CHECK(Same(SplitHours(-0.25), 0, -15));
+  CHECK(Same(SplitHours(24.5), 0, 30));
+  CHECK(Same(SplitHours(24.0), 24, 0));
+  CHECK(Same(SplitHours(6.066), 6, 3));
+}
