@@ -1,0 +1,101 @@
+#include <doctest/doctest.h>
+
+#include <string>
+
+#include "frame/errors/ErrText.h"
+
+namespace {
+
+ErrRecord SampleRecord() {
+  ErrRecord record(ErrPlace{"C:\\work\\legend\\XChartLegend.cpp", "SetLegendData", 1240});
+  record.line = 1265;
+  record.result = static_cast<std::int32_t>(0x80004005u);
+  return record;
+}
+
+ErrReportContext SampleContext(const char* systemText) {
+  ErrReportContext context;
+  context.className = "CXChartLegend";
+  context.date = "05.03.2024";
+  context.time = "14:07";
+  context.threadId = 36;
+  context.systemText = systemText;
+  return context;
+}
+
+}  // namespace
+
+TEST_CASE("source names keep only the file name and extension") {
+  std::string name, extension;
+  SplitSourceName("C:\\work\\legend\\XChartLegend.cpp", name, extension);
+  CHECK(name == "XChartLegend");
+  CHECK(extension == ".cpp");
+  SplitSourceName("/work/main/inspector/cP_SHPanel.tar.cpp", name, extension);
+  CHECK(name == "cP_SHPanel.tar");
+  CHECK(extension == ".cpp");
+  SplitSourceName("D:Makefile", name, extension);
+  CHECK(name == "Makefile");
+  CHECK(extension.empty());
+  SplitSourceName("dir.d\\noext", name, extension);
+  CHECK(name == "noext");
+  CHECK(extension.empty());
+  SplitSourceName(nullptr, name, extension);
+  CHECK(name.empty());
+}
+
+TEST_CASE("the line offset counts from the operation's first line") {
+  ErrRecord record = SampleRecord();
+  CHECK(LineOffset(record) == 25);
+  record.line = -1;
+  CHECK(LineOffset(record) == -1);
+  record.line = 1240;
+  CHECK(LineOffset(record) == 0);
+}
+
+TEST_CASE("system messages are cut at their first line break") {
+  CHECK(FirstLineOf("Unspecified error\r\n") == "Unspecified error");
+  CHECK(FirstLineOf("two\nlines") == "two");
+  CHECK(FirstLineOf("") == "");
+  CHECK(FirstLineOf(nullptr) == "");
+}
+
+TEST_CASE("the log line has every field in its place") {
+  ErrRecord record = SampleRecord();
+  CHECK(FormatErrLogLine(record, SampleContext("Unspecified error")) ==
+        "ERR: 05.03.2024 14:07 file:XChartLegend.cpp(1265) CXChartLegend::SetLegendData "
+        "line:25 code:20000000 text:'(null)' thread:36 hres:0x80004005(Unspecified error) \n");
+
+  record.line = -1;
+  record.code = 0x1234abcd;
+  record.text = "extra";
+  record.result = static_cast<std::int32_t>(0xE0040001u);
+  CHECK(FormatErrLogLine(record, SampleContext(nullptr)) ==
+        "ERR: 05.03.2024 14:07 file:XChartLegend.cpp(-1) CXChartLegend::SetLegendData "
+        "line:-1 code:3234ABCD text:'extra' thread:36 hres:0xE0040001((null)) \n");
+}
+
+TEST_CASE("the log line is not limited in length") {
+  ErrRecord record = SampleRecord();
+  const std::string longText(2000, 'x');
+  record.text = longText.c_str();
+  const std::string line = FormatErrLogLine(record, SampleContext(nullptr));
+  CHECK(line.find("text:'" + longText + "'") != std::string::npos);
+}
+
+TEST_CASE("the box text, with the record's text on a line of its own, at most 511 characters") {
+  ErrRecord record = SampleRecord();
+  CHECK(FormatErrBoxText(record, SampleContext("Unspecified error")) ==
+        "XChartLegend.cpp(1265) CXChartLegend::SetLegendData line:25 code:20000000 "
+        "hres:0x80004005(Unspecified error)");
+  record.text = "";
+  CHECK(FormatErrBoxText(record, SampleContext(nullptr)).find('\n') == std::string::npos);
+  record.text = "more";
+  CHECK(FormatErrBoxText(record, SampleContext(nullptr)) ==
+        "XChartLegend.cpp(1265) CXChartLegend::SetLegendData line:25 code:20000000 "
+        "hres:0x80004005((null))\nmore");
+  const std::string longText(600, 'y');
+  record.text = longText.c_str();
+  const std::string box = FormatErrBoxText(record, SampleContext(nullptr));
+  CHECK(box.size() == ERR_BOX_TEXT_MAX);
+  CHECK(box.back() == 'y');
+}
