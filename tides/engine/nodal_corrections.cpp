@@ -86,19 +86,20 @@ void ApplyNodalCorrections(double N, double p) {
   auto& table = TheTideEngine().constituents;
   auto used = [&](int n) { return table[static_cast<std::size_t>(n)].used != 0; };
 
+  const double sinN = std::sin(N), sin2N = std::sin(2.0 * N), sin3N = std::sin(3.0 * N);
+  const double cosN = std::cos(N), cos2N = std::cos(2.0 * N), cos3N = std::cos(3.0 * N);
   for (const NodalPolynomial& r : kPolynomials) {
     if (!r.always && !used(r.number)) continue;
     ConstituentTableEntry& c = table[static_cast<std::size_t>(r.number)];
-    c.u = NormalizeAngle((r.a1 * std::sin(N) + r.a2 * std::sin(2.0 * N) + r.a3 * std::sin(3.0 * N)) *
-                         kDegreesToRadians);
-    c.f = r.f0 + r.b1 * std::cos(N) + r.b2 * std::cos(2.0 * N) + r.b3 * std::cos(3.0 * N);
+    c.u = NormalizeAngle((r.a1 * sinN + r.a2 * sin2N + r.a3 * sin3N) * kDegreesToRadians);
+    c.f = r.f0 + r.b1 * cosN + r.b2 * cos2N + r.b3 * cos3N;
   }
 
   const double uM2 = table[kM2].u;
   const double fM2 = table[kM2].f;
 
   if (used(kMm)) {
-    const double c = 0.9137 - 0.03569 * std::cos(N);
+    const double c = 0.9137 - 0.03569 * cosN;
     table[kMm].u = 0.0;
     table[kMm].f = (c * c - 1.0 / 3.0) * 1.9916351324437362;  // divided by 0.5021
   }
@@ -118,7 +119,7 @@ void ApplyNodalCorrections(double N, double p) {
   }
   if (used(kM3)) {
     const double root = std::sqrt(fM2);
-    table[kM3].u = NormalizeAngle(-3.21 * std::sin(N) * kDegreesToRadians);
+    table[kM3].u = NormalizeAngle(-3.21 * sinN * kDegreesToRadians);
     table[kM3].f = root * root * root;
   }
 

@@ -26,12 +26,14 @@ double ComputeSunEvent(std::int32_t J, double phi, double lambda, int sign, doub
                        SunEventOutcome* outcome) {
   SunEventOutcome why = SunEventOutcome::kNoConvergence;
   double result = kNoSunEvent;
+  const double sinH0 = std::sin(h0 * kRad);
+  const double sinPhi = std::sin(phi * kRad);
+  const double cosPhi = std::cos(phi * kRad);
   double t = 12.0;
   for (int pass = 0; pass < kMaxPasses; ++pass) {
     double gha = 0.0, delta = 0.0;
     SunPosition(J, t, gha, delta);
-    const double c = (std::sin(h0 * kRad) - std::sin(phi * kRad) * std::sin(delta * kRad)) /
-                     (std::cos(phi * kRad) * std::cos(delta * kRad));
+    const double c = (sinH0 - sinPhi * std::sin(delta * kRad)) / (cosPhi * std::cos(delta * kRad));
     if (!(std::fabs(c) < 1.0)) {
       // c >= 1: even the sun's highest point is below h0; c <= -1: its lowest is above.
       if (c >= 1.0) why = SunEventOutcome::kSunStaysBelow;
