@@ -1,0 +1,186 @@
+#include "tools/tidefiles/folder_check.h"
+
+#include <cstdio>
+#include <map>
+
+#include "tides/engine/station_files.h"
+
+namespace br::tidefiles {
+namespace {
+
+using br::tides::ConstituentRecord;
+using br::tides::StationHeader;
+using br::tides::StationIndexRecord;
+
+constexpr int kMaxLatitudeMinutes = 90 * 60;
+constexpr int kMaxLongitudeMinutes = 180 * 60;
+constexpr int kMaxZone = 14;
+
+std::string Position(const StationIndexRecord& r) {
+  char text[64];
+  std::snprintf(text, sizeof text, "latitude %d', longitude %d'", r.latitude, r.longitude);
+  return text;
+}
+
+std::vector<StationIndexRecord> Records(const std::vector<std::uint8_t>& bytes) {
+  std::vector<StationIndexRecord> records;
+  for (std::size_t at = 0; at + StationIndexRecord::kSize <= bytes.size(); at += StationIndexRecord::kSize)
+    records.push_back(br::tides::DecodeStationIndexRecord(&bytes[at]));
+  return records;
+}
+
+bool SameRecord(const StationIndexRecord& a, const StationIndexRecord& b) {
+  return a.station == b.station && a.latitude == b.latitude && a.longitude == b.longitude && a.offset == b.offset;
+}
+
+class FolderChecker {
+ public:
+  explicit FolderChecker(const FolderImage& image)
+      : image_(image), stations_(Records(image.stationIndex)), sorted_(Records(image.coordinateIndex)) {}
+
+  std::vector<std::string> Run() {
+    CheckLengths();
+    CheckStationIndex();
+    CheckCoordinateIndex();
+    CheckCopiesAgree();
+    for (std::size_t i = 0; i < stations_.size(); ++i) CheckBlock(i);
+    return problems_;
+  }
+
+ private:
+  void Problem(const std::string& text) { problems_.push_back(text); }
+
+  void CheckLengths() {
+    const char* names[] = {br::tides::kStationIndexFileName, br::tides::kCoordinateIndexFileName};
+    const std::vector<std::uint8_t>* files[] = {&image_.stationIndex, &image_.coordinateIndex};
+    for (int f = 0; f < 2; ++f) {
+      const std::size_t size = files[f]->size();
+      if (size % StationIndexRecord::kSize != 0) {
+        Problem(std::string(names[f]) + ": length " + std::to_string(size) +
+                " bytes is not a whole number of 10-byte records (" + std::to_string(size % StationIndexRecord::kSize) +
+                " bytes left over)");
+      }
+    }
+    if (stations_.size() != sorted_.size()) {
+      Problem(std::string("td_crd.ntx: holds ") + std::to_string(sorted_.size()) + " records but td_num.ntx holds " +
+              std::to_string(stations_.size()) + "; both index files must hold the same stations");
+    }
+    if (stations_.size() > static_cast<std::size_t>(br::tides::kMaxStationCount)) {
+      Problem("td_num.ntx: " + std::to_string(stations_.size()) + " stations; a folder holds at most " +
+              std::to_string(br::tides::kMaxStationCount));
+    }
+  }
+
+  void CheckStationIndex() {
+    std::map<std::uint32_t, std::size_t> first;
+    for (std::size_t i = 0; i < stations_.size(); ++i) {
+      const StationIndexRecord& r = stations_[i];
+      const std::string where = "td_num.ntx: station " + std::to_string(i) + ": ";
+      if (r.latitude < -kMaxLatitudeMinutes || r.latitude > kMaxLatitudeMinutes)
+        Problem(where + "latitude " + std::to_string(r.latitude) + "' is outside -5400..5400 minutes");
+      if (r.longitude < -kMaxLongitudeMinutes || r.longitude > kMaxLongitudeMinutes)
+        Problem(where + "longitude " + std::to_string(r.longitude) + "' is outside -10800..10800 minutes");
+      const auto [it, added] = first.emplace(br::tides::StationKey(r), i);
+      if (!added)
+        Problem(where + "duplicate key: same position (" + Position(r) + ") as station " + std::to_string(it->second));
+    }
+  }
+
+  void CheckCoordinateIndex() {
+    for (std::size_t k = 1; k < sorted_.size(); ++k) {
+      const std::uint32_t before = br::tides::StationKey(sorted_[k - 1]);
+      const std::uint32_t key = br::tides::StationKey(sorted_[k]);
+      const std::string where = "td_crd.ntx: record " + std::to_string(k) + ": ";
+      if (key < before) {
+        Problem(where + "key " + std::to_string(key) + " follows " + std::to_string(before) +
+                ": not sorted by ascending StationKey");
+      } else if (key == before) {
+        Problem(where + "duplicate key: same position (" + Position(sorted_[k]) + ") as record " + std::to_string(k - 1));
+      }
+    }
+  }
+
+  void CheckCopiesAgree() {
+    std::map<std::uint32_t, std::size_t> sortedByKey;
+    for (std::size_t k = 0; k < sorted_.size(); ++k) sortedByKey.emplace(br::tides::StationKey(sorted_[k]), k);
+    std::map<std::uint32_t, std::size_t> stationByKey;
+    for (std::size_t i = 0; i < stations_.size(); ++i) {
+      const StationIndexRecord& r = stations_[i];
+      stationByKey.emplace(br::tides::StationKey(r), i);
+      const auto found = sortedByKey.find(br::tides::StationKey(r));
+      const std::string where = "td_crd.ntx: station " + std::to_string(i) + ": ";
+      if (found == sortedByKey.end()) {
+        Problem(where + "no record for its position (" + Position(r) + "); the search cannot find it");
+        continue;
+      }
+      const StationIndexRecord& copy = sorted_[found->second];
+      if (!SameRecord(r, copy)) {
+        Problem(where + "record " + std::to_string(found->second) + " differs from the td_num.ntx copy (offset " +
+                std::to_string(copy.offset) + " vs " + std::to_string(r.offset) + ", field " +
+                std::to_string(copy.station) + " vs " + std::to_string(r.station) + ")");
+      }
+    }
+    for (std::size_t k = 0; k < sorted_.size(); ++k) {
+      if (stationByKey.count(br::tides::StationKey(sorted_[k])) == 0)
+        Problem("td_crd.ntx: record " + std::to_string(k) + ": position (" + Position(sorted_[k]) +
+                ") belongs to no station of td_num.ntx");
+    }
+    sortedByKey_ = std::move(sortedByKey);
+  }
+
+  // The block as the engine reads it: at the offset of the station's td_crd.ntx record.
+  void CheckBlock(std::size_t i) {
+    const auto found = sortedByKey_.find(br::tides::StationKey(stations_[i]));
+    if (found == sortedByKey_.end()) return;  // reported above
+    const StationIndexRecord& r = sorted_[found->second];
+    const std::string where = "td_pnt.dat: station " + std::to_string(i) + ": ";
+    const std::vector<std::uint8_t>& data = image_.stationData;
+    const std::uint64_t offset = r.offset;
+    if (offset + StationHeader::kSize > data.size()) {
+      Problem(where + "block offset " + std::to_string(offset) + " leaves no room for the 46-byte header (file has " +
+              std::to_string(data.size()) + " bytes)");
+      return;
+    }
+    const StationHeader header = br::tides::DecodeStationHeader(&data[offset]);
+    if (header.latitude != r.latitude || header.longitude != r.longitude) {
+      Problem(where + "header position (latitude " + std::to_string(header.latitude) + "', longitude " +
+              std::to_string(header.longitude) + "') differs from its index record (" + Position(r) + ")");
+    }
+    if (header.zone < -kMaxZone || header.zone > kMaxZone)
+      Problem(where + "zone description " + std::to_string(header.zone) + " is outside -14..14 hours");
+    const int count = header.constituentCount;
+    if (count < 0 || count > br::tides::kConstituentCount) {
+      Problem(where + "constituent count " + std::to_string(count) + " is outside 0..69");
+      if (count < 0) return;
+    }
+    const std::uint64_t length = StationHeader::kSize + static_cast<std::uint64_t>(count) * ConstituentRecord::kSize;
+    if (offset + length > data.size()) {
+      Problem(where + "block of " + std::to_string(length) + " bytes at offset " + std::to_string(offset) +
+              " runs past the end of the file (" + std::to_string(data.size()) + " bytes)");
+      return;
+    }
+    for (int k = 0; k < count; ++k) {
+      const ConstituentRecord c =
+          br::tides::DecodeConstituentRecord(&data[offset + StationHeader::kSize + static_cast<std::uint64_t>(k) * ConstituentRecord::kSize]);
+      const std::string record = where + "constituent record " + std::to_string(k) + ": ";
+      if (c.number < 0 || c.number >= br::tides::kConstituentCount) {
+        Problem(record + "number " + std::to_string(c.number) + " is outside 0..68");
+      } else if (k == 0 && c.number != 0) {
+        Problem(record + "is constituent " + std::to_string(c.number) + "; the first record must be the mean level (0)");
+      }
+      if (c.phase > 3599) Problem(record + "phase " + std::to_string(c.phase) + " is outside 0..3599 tenths of a degree");
+    }
+  }
+
+  const FolderImage& image_;
+  std::vector<StationIndexRecord> stations_;
+  std::vector<StationIndexRecord> sorted_;
+  std::map<std::uint32_t, std::size_t> sortedByKey_;
+  std::vector<std::string> problems_;
+};
+
+}  // namespace
+
+std::vector<std::string> CheckFolderImage(const FolderImage& image) { return FolderChecker(image).Run(); }
+
+}  // namespace br::tidefiles
