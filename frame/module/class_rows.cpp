@@ -1,0 +1,24 @@
+// The creatable classes of BR_Info.dll, in table order: XObjectInspector, TidesDatabase,
+// TidesPort, TidesPortList, TidesWindow, XChartLegend, XContoursView, XPICREPView.
+// A class joins with one row here (and its library in frame/dll.cmake).
+#include "frame/module/class_rows.h"
+
+#include "tides/objects/tides_database.h"
+#include "tides/objects/tides_port.h"
+
+namespace br::module {
+namespace {
+
+ClassEntry gRows[] = {
+    PlainObjectRow<br::tides::TidesDatabase>(L"TidesDatabase"),
+    PlainObjectRow<br::tides::TidesPort>(L"TidesPort"),
+};
+
+}  // namespace
+
+ClassTable& TheClassTable() {
+  static ClassTable table(gRows, sizeof gRows / sizeof gRows[0]);
+  return table;
+}
+
+}  // namespace br::module

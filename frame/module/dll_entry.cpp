@@ -1,0 +1,59 @@
+// The four exported entry points and DllMain of BR_Info.dll.
+#include "frame/com/module.h"
+#include "frame/com/type_library.h"
+#include "frame/module/class_rows.h"
+#include "frame/module/registration.h"
+#include "tides/objects/tides_database.h"
+
+#include "BR_Info.h"
+
+using br::com::Module;
+using br::module::TheClassTable;
+
+extern "C" BOOL WINAPI DllMain(HINSTANCE instance, DWORD reason, LPVOID reserved) {
+  switch (reason) {
+    case DLL_PROCESS_ATTACH:
+      Module::Attach(instance);
+      TheClassTable();  // the table and its critical section exist before any entry point runs
+      DisableThreadLibraryCalls(instance);
+      break;
+    case DLL_PROCESS_DETACH:
+      TheClassTable().ReleaseClassObjects();
+      br::tides::TidesDatabase::CloseStationFiles();
+      // At process exit other DLLs may be gone already: let the cached type library go
+      // only when the library itself is being unloaded.
+      if (!reserved) br::com::TypeLibrary::Unload();
+      break;
+    default:
+      break;
+  }
+  return TRUE;
+}
+
+STDAPI DllCanUnloadNow() { return Module::LockCount() == 0 ? S_OK : S_FALSE; }
+
+STDAPI DllGetClassObject(REFCLSID clsid, REFIID riid, LPVOID* out) {
+  return TheClassTable().GetClassObject(clsid, riid, out);
+}
+
+STDAPI DllRegisterServer() {
+  try {
+    const std::wstring path = Module::FilePath();
+    HRESULT hr = TheClassTable().RegisterClasses(path, LIBID_BR_INFOLib);
+    if (SUCCEEDED(hr)) hr = br::module::RegisterTypeLibrary(path);
+    return hr;
+  } catch (...) {
+    return E_OUTOFMEMORY;
+  }
+}
+
+STDAPI DllUnregisterServer() {
+  try {
+    const std::wstring path = Module::FilePath();
+    HRESULT hr = TheClassTable().UnregisterClasses();
+    if (SUCCEEDED(hr)) hr = br::module::UnregisterTypeLibrary(path);
+    return hr;
+  } catch (...) {
+    return E_OUTOFMEMORY;
+  }
+}
