@@ -102,6 +102,10 @@ TEST_CASE("opening a folder") {
     CHECK(StationCount() == 3);
     REQUIRE(OpenTideFiles((plain + "/").c_str()) == 0);
     CHECK(StationCount() == 3);
+#ifdef _WIN32
+    REQUIRE(OpenTideFiles((plain + "\\").c_str()) == 0);
+    CHECK(StationCount() == 3);
+#endif
   }
   SUBCASE("station numbers follow td_num.ntx") {
     REQUIRE(OpenTideFiles(plain.c_str()) == 0);
