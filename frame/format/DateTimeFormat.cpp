@@ -2,6 +2,8 @@
 
 #include <oleauto.h>
 
+#include <cmath>
+
 namespace {
 
 // The platform date functions give the needed length when asked with no buffer.
@@ -21,7 +23,8 @@ std::string CallWithBuffer(Formatter format) {
 }
 
 bool ToSystemTime(double platformDate, SYSTEMTIME& when) {
-  return VariantTimeToSystemTime(platformDate, &when) != FALSE;
+  // Not every platform version refuses NaN itself.
+  return std::isfinite(platformDate) && VariantTimeToSystemTime(platformDate, &when) != FALSE;
 }
 
 }  // namespace
