@@ -82,7 +82,9 @@ DayPrediction PredictDay(const StationIndexRecord& key, StationHeader& header, c
   sun = ComputeSunDay(date, found.latitude / 60.0, found.longitude / 60.0, found.zone);
 
   const std::int32_t count = DaySampleCount(step);
-  SetUpDay(StartHours(toLocalMidnight(date)));
+  // Without a conversion the day starts at UT midnight.
+  const std::int64_t midnight = toLocalMidnight ? toLocalMidnight(date) : DaysFromCivil(date) * 86400;
+  SetUpDay(StartHours(midnight));
   if (count < 1 || samples == nullptr) return result;
   const std::size_t wanted = static_cast<std::size_t>(count);
   result.sampleCount = static_cast<std::int32_t>(wanted < capacity ? wanted : capacity);

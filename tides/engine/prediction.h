@@ -42,9 +42,9 @@ struct DayPrediction {
 
 // Loads the station whose StationKey equals key's, computes its sun events for date (in
 // the station's zone time) and the tide heights of the date from the local standard
-// midnight that toLocalMidnight gives, at step hours. Writes min(DaySampleCount(step),
-// capacity) samples. When the station is not found, returns stationFound false and writes
-// nothing: header, samples and sun are left as they were.
+// midnight that toLocalMidnight gives (UT midnight when it is empty), at step hours.
+// Writes min(DaySampleCount(step), capacity) samples. When the station is not found,
+// returns stationFound false and writes nothing: header, samples and sun stay as they were.
 DayPrediction PredictDay(const StationIndexRecord& key, StationHeader& header, const CalendarDate& date,
                          double step, float* samples, std::size_t capacity, SunDay& sun,
                          const LocalMidnightFunction& toLocalMidnight);

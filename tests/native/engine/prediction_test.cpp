@@ -285,6 +285,12 @@ TEST_CASE("the day starts at the computer's local standard midnight on any time 
     }
     // Without the hour angle the curve would be the UT day's: make sure it is not.
     CHECK(std::fabs(local.samples[0] - utc.samples[0]) > 10.0f);
+    // No conversion given: the UT day.
+    std::vector<float> plain(25);
+    StationHeader h;
+    SunDay sun;
+    PredictDay(key, h, date, 1.0, plain.data(), plain.size(), sun, LocalMidnightFunction{});
+    CHECK(plain == utc.samples);
   }
   SUBCASE("a UTC+5:30 day starts at 18:30 UT the day before") {
     const Day local = Predict(key, {2010, 8, 1}, 0.5, 5 * 3600 + 1800);
