@@ -1,0 +1,388 @@
+// The error reporter against the prefix's registry, a real log file and real
+// message boxes pressed from a second thread.
+#include <doctest/doctest.h>
+
+#include <cstring>
+#include <string>
+#include <vector>
+
+#include "BoxPresser.h"
+#include "TestSupport.h"
+#include "frame/errors/GuardedOperation.h"
+#include "frame/errors/cErrReporter.h"
+#include "frame/format/DateTimeFormat.h"
+#include "frame/settings/Settings.h"
+#include "frame/settings/cRegSettings.h"
+
+namespace {
+
+constexpr const char* OWNER = "CTestOwner";
+const ErrPlace LEGEND_PLACE{"C:\\src\\legend\\XChartLegend.cpp", "SetLegendData", 1240};
+
+// The reporter with a chosen mask instead of the process-wide registry value.
+class MaskedReporter : public cErrReporter {
+public:
+  explicit MaskedReporter(std::uint32_t mask) : m_testMask(mask) {}
+
+protected:
+  std::uint32_t CurrentMask() const override { return m_testMask; }
+
+private:
+  std::uint32_t m_testMask;
+};
+
+// The HKLM values the reporter reads, restored after each test.
+struct LogSettings {
+  SavedRegistryValue mask{HKEY_LOCAL_MACHINE, cRegSettings::BASE_PATH, SETTING_LOG_MASK};
+  SavedRegistryValue file{HKEY_LOCAL_MACHINE, cRegSettings::BASE_PATH, SETTING_LOG_FILE};
+  SavedRegistryValue keyPath{HKEY_LOCAL_MACHINE, cRegSettings::FullPath(SETTINGS_ENUM_KEY),
+                             SETTING_KEY_PATH};
+};
+
+std::string Now(const char* pattern, bool date) {
+  SYSTEMTIME now;
+  GetLocalTime(&now);
+  return date ? FormatDate(now, pattern) : FormatTime(now, pattern);
+}
+
+std::string SystemText(std::int32_t result) {
+  std::string text;
+  return cErrReporter::SystemMessage(result, text) ? text : "(null)";
+}
+
+// Runs this program again with "--child scenario"; presses any box it shows.
+struct ChildRun {
+  int exitCode = -1;
+  std::vector<SeenBox> boxes;
+};
+
+ChildRun RunChild(const char* scenario, std::vector<int> buttons = {},
+                  std::function<std::string()> onBox = nullptr) {
+  char self[MAX_PATH];
+  GetModuleFileNameA(nullptr, self, MAX_PATH);
+  std::string command = std::string("\"") + self + "\" --child " + scenario;
+  STARTUPINFOA startup{};
+  startup.cb = sizeof startup;
+  PROCESS_INFORMATION process{};
+  ChildRun run;
+  REQUIRE(CreateProcessA(nullptr, &command[0], nullptr, nullptr, FALSE, 0, nullptr, nullptr,
+                         &startup, &process));
+  BoxPresser presser(process.dwProcessId, std::move(buttons), std::move(onBox));
+  if (WaitForSingleObject(process.hProcess, 60000) != WAIT_OBJECT_0) {
+    TerminateProcess(process.hProcess, 99);
+    WaitForSingleObject(process.hProcess, 5000);
+  }
+  DWORD code = 0;
+  GetExitCodeProcess(process.hProcess, &code);
+  run.exitCode = static_cast<int>(code);
+  CloseHandle(process.hThread);
+  CloseHandle(process.hProcess);
+  run.boxes = presser.Finish();
+  return run;
+}
+
+// One failing guarded operation; exit code: attempts x 10 + 1 if it failed.
+int FailOnce(cErrReporter& reporter) {
+  int attempts = 0;
+  ErrRecord record;
+  RunGuarded(reporter, OWNER, LEGEND_PLACE, record, [&] {
+    ++attempts;
+    throw 1265;
+  });
+  return attempts * 10 + (record.failed() ? 1 : 0);
+}
+
+}  // namespace
+
+int RunChildScenario(const char* scenario) {
+  if (std::strcmp(scenario, "fail") == 0) {
+    cErrReporter reporter;
+    return FailOnce(reporter);
+  }
+  if (std::strcmp(scenario, "cache") == 0) {
+    // The mask is read at the first reporter; later changes wait for a new process.
+    cErrReporter reporter;
+    cRegSettings::Machine().WriteDword(nullptr, SETTING_LOG_MASK, 0);
+    return FailOnce(reporter);
+  }
+  return 100;
+}
+
+TEST_CASE("the log mask counts only a DWORD, and 0xFFFFFFFF as 0") {
+  const std::string scratch = cRegSettings::FullPath("BrTestMask");
+  {
+    SavedRegistryValue mask(HKEY_LOCAL_MACHINE, scratch, SETTING_LOG_MASK);
+    mask.SetDword(5);
+    CHECK(cErrReporter::ReadLogMask(HKEY_LOCAL_MACHINE, scratch.c_str()) == 5);
+    mask.SetDword(0xFFFFFFFFu);
+    CHECK(cErrReporter::ReadLogMask(HKEY_LOCAL_MACHINE, scratch.c_str()) == 0);
+    mask.SetDword(0xFFFFFFFEu);
+    CHECK(cErrReporter::ReadLogMask(HKEY_LOCAL_MACHINE, scratch.c_str()) == 0xFFFFFFFEu);
+    mask.SetString("5");
+    CHECK(cErrReporter::ReadLogMask(HKEY_LOCAL_MACHINE, scratch.c_str()) == 0);
+    mask.SetBinary({5, 0, 0, 0});
+    CHECK(cErrReporter::ReadLogMask(HKEY_LOCAL_MACHINE, scratch.c_str()) == 0);
+    mask.Delete();
+    CHECK(cErrReporter::ReadLogMask(HKEY_LOCAL_MACHINE, scratch.c_str()) == 0);
+  }
+  RegDeleteTreeA(HKEY_LOCAL_MACHINE, scratch.c_str());
+  CHECK(cErrReporter::ReadLogMask(HKEY_LOCAL_MACHINE, scratch.c_str()) == 0);
+}
+
+TEST_CASE("the log file path: as it stands with drive and folder, else completed from KeyPath") {
+  LogSettings settings;
+  settings.file.SetString("C:\\logs\\brcl.log");
+  settings.keyPath.SetString("D:\\Charts\\");
+  CHECK(cErrReporter::LogFilePath() == "C:\\logs\\brcl.log");
+
+  settings.file.SetString("error.log");
+  CHECK(cErrReporter::LogFilePath() == "D:\\Charts\\error.log");
+  settings.keyPath.SetString("D:\\Charts");  // a folder, closing backslash or not
+  CHECK(cErrReporter::LogFilePath() == "D:\\Charts\\error.log");
+  settings.file.SetString("E:error.log");
+  CHECK(cErrReporter::LogFilePath() == "E:\\Charts\\error.log");
+  settings.file.SetString("\\logs\\error.log");
+  CHECK(cErrReporter::LogFilePath() == "D:\\logs\\error.log");
+
+  settings.keyPath.SetString("");
+  CHECK(cErrReporter::LogFilePath().empty());
+  settings.keyPath.Delete();
+  CHECK(cErrReporter::LogFilePath().empty());
+
+  settings.keyPath.SetString("D:\\Charts\\");
+  settings.file.SetString("C:\\logs\\brcl.log", REG_EXPAND_SZ);
+  CHECK(cErrReporter::LogFilePath().empty());
+  settings.file.SetString("");
+  CHECK(cErrReporter::LogFilePath().empty());
+  settings.file.Delete();
+  CHECK(cErrReporter::LogFilePath().empty());
+  // Longer than the 520 bytes the value may take.
+  settings.file.SetString("C:\\" + std::string(530, 'a') + ".log");
+  CHECK(cErrReporter::LogFilePath().empty());
+  // Fits the value but not a path.
+  settings.file.SetString("C:\\" + std::string(300, 'a') + ".log");
+  CHECK(cErrReporter::LogFilePath().empty());
+}
+
+TEST_CASE("a failure appends exactly one line with every field and shows nothing") {
+  LogSettings settings;
+  ScratchFolder folder;
+  const std::string log = folder / "brcl.log";
+  settings.file.SetString(log);
+  WriteTextFile(log, "earlier line\r\n");
+
+  MaskedReporter reporter(cErrReporter::LOG_TO_FILE);
+  const std::string dateBefore = Now(DATE_PATTERN, true);
+  const std::string timeBefore = Now(TIME_PATTERN, false);
+  ErrRecord record;
+  RunGuarded(reporter, "CXChartLegend", LEGEND_PLACE, record, [] { throw 1265; });
+  const DWORD lastError = GetLastError();
+  const std::string dateAfter = Now(DATE_PATTERN, true);
+  const std::string timeAfter = Now(TIME_PATTERN, false);
+
+  const std::vector<std::string> lines = SplitLines(ReadWholeFile(log));
+  REQUIRE(lines.size() == 2);
+  CHECK(lines[0] == "earlier line\r\n");
+  const std::string rest = " file:XChartLegend.cpp(1265) CXChartLegend::SetLegendData line:25"
+                           " code:20000000 text:'(null)' thread:" +
+                           std::to_string(GetCurrentThreadId()) + " hres:0x80004005(" +
+                           SystemText(BR_RESULT_FAIL) + ") \r\n";
+  const std::string before = "ERR: " + dateBefore + " " + timeBefore + rest;
+  const std::string after = "ERR: " + dateAfter + " " + timeAfter + rest;
+  CHECK((lines[1] == before || lines[1] == after));
+  CHECK(record.failed());
+  CHECK(lastError == 0x20000000u);
+}
+
+TEST_CASE("a cErr without system text is logged with (-1), line:-1 and (null)") {
+  LogSettings settings;
+  ScratchFolder folder;
+  settings.file.SetString(folder / "brcl.log");
+  MaskedReporter reporter(cErrReporter::LOG_TO_FILE);
+  ErrRecord record;
+  for (int report = 0; report < 2; ++report) {
+    RunGuarded(reporter, OWNER, LEGEND_PLACE, record, [] { throw cErr(BR_ERR_FILE_OPEN); });
+  }
+  const std::vector<std::string> lines = SplitLines(ReadWholeFile(folder / "brcl.log"));
+  REQUIRE(lines.size() == 2);
+  for (const std::string& line : lines) {
+    CHECK(line.find(" file:XChartLegend.cpp(-1) CTestOwner::SetLegendData line:-1 ") !=
+          std::string::npos);
+    CHECK(line.find(" hres:0xE0040001((null)) \r\n") != std::string::npos);
+  }
+  CHECK(static_cast<std::uint32_t>(record.result) == 0xE0040001u);
+}
+
+TEST_CASE("a bare log file name goes into the KeyPath folder") {
+  LogSettings settings;
+  ScratchFolder folder;
+  settings.file.SetString("error.log");
+  settings.keyPath.SetString(folder.Path());
+  MaskedReporter reporter(cErrReporter::LOG_TO_FILE);
+  ErrRecord record;
+  RunGuarded(reporter, OWNER, LEGEND_PLACE, record, [] { throw 1; });
+  CHECK(SplitLines(ReadWholeFile(folder / "error.log")).size() == 1);
+}
+
+TEST_CASE("without the file switch, or without a usable file, nothing is written and nothing fails") {
+  LogSettings settings;
+  ScratchFolder folder;
+  settings.file.SetString(folder / "brcl.log");
+  ErrRecord record;
+  MaskedReporter silent(0);
+  RunGuarded(silent, OWNER, LEGEND_PLACE, record, [] { throw 1; });
+  CHECK_FALSE(FileExists(folder / "brcl.log"));
+  CHECK(record.failed());
+
+  settings.file.SetString(folder / "missing\\brcl.log");
+  MaskedReporter logging(cErrReporter::LOG_TO_FILE | 2 | 8);  // other bits do nothing
+  RunGuarded(logging, OWNER, LEGEND_PLACE, record, [] { throw 1; });
+  CHECK(record.failed());
+  CHECK(GetLastError() == 0x20000000u);
+}
+
+TEST_CASE("the thread's last error carries bit 29 and the record's code") {
+  MaskedReporter reporter(0);
+  ErrRecord record(LEGEND_PLACE);
+  record.code = 0x15;
+  SetLastError(ERROR_ACCESS_DENIED);
+  CHECK(reporter.ReportResult(OWNER, record, BR_RESULT_FAIL));
+  CHECK(GetLastError() == 0x20000015u);
+
+  SetLastError(0x20000099u);  // an earlier library error stays
+  reporter.Report(OWNER, record);
+  CHECK(GetLastError() == 0x20000099u);
+
+  reporter.BeginAttempt();
+  CHECK(GetLastError() == 0u);
+}
+
+TEST_CASE("the box: caption, buttons, text; Abort keeps the failure") {
+  LogSettings settings;
+  ScratchFolder folder;
+  settings.file.SetString(folder / "brcl.log");
+  MaskedReporter reporter(cErrReporter::LOG_TO_BOX);
+  BoxPresser presser(GetCurrentProcessId(), {IDABORT});
+  ErrRecord record;
+  RunGuarded(reporter, "CXChartLegend", LEGEND_PLACE, record, [] { throw 1265; });
+  const std::vector<SeenBox> boxes = presser.Finish();
+  REQUIRE(boxes.size() == 1);
+  CHECK(boxes[0].text == "XChartLegend.cpp(1265) CXChartLegend::SetLegendData line:25 "
+                         "code:20000000 hres:0x80004005(" +
+                             SystemText(BR_RESULT_FAIL) + ")");
+  CHECK(boxes[0].hasAbortRetryIgnore);
+  CHECK(boxes[0].errorIcon);
+  if (!boxes[0].topmost) {
+    MESSAGE("the platform does not raise MB_TOPMOST boxes above other windows; not checked");
+  }
+  CHECK(record.failed());
+  CHECK_FALSE(FileExists(folder / "brcl.log"));
+}
+
+TEST_CASE("Retry runs the operation again with the same arguments; Ignore forgets the failure") {
+  MaskedReporter reporter(cErrReporter::LOG_TO_BOX);
+  std::vector<std::string> seen;
+  const auto operation = [&](std::string name, int failures) {
+    ErrRecord record;
+    RunGuarded(reporter, OWNER, LEGEND_PLACE, record, [&, name] {
+      seen.push_back(name);
+      if (static_cast<int>(seen.size()) <= failures) {
+        throw cErr(BR_ERR_FILE_MISSING);
+      }
+    });
+    return record.result;
+  };
+
+  SUBCASE("retry, then abort") {
+    BoxPresser presser(GetCurrentProcessId(), {IDRETRY, IDABORT});
+    CHECK(static_cast<std::uint32_t>(operation("chart.bmp", 5)) == 0xE0040008u);
+    CHECK(presser.Finish().size() == 2);
+    CHECK(seen == std::vector<std::string>{"chart.bmp", "chart.bmp"});
+  }
+  SUBCASE("retry until it succeeds") {
+    BoxPresser presser(GetCurrentProcessId(), {IDRETRY, IDRETRY});
+    CHECK(operation("chart.bmp", 2) == 0);
+    CHECK(presser.Finish().size() == 2);
+    CHECK(seen.size() == 3);
+  }
+  SUBCASE("ignore") {
+    BoxPresser presser(GetCurrentProcessId(), {IDIGNORE});
+    const std::int32_t result = operation("reef.bmp", 5);
+    const DWORD lastError = GetLastError();
+    CHECK(result == 0);
+    CHECK(presser.Finish().size() == 1);
+    CHECK(seen == std::vector<std::string>{"reef.bmp"});
+    CHECK(lastError == 0x20000000u);
+  }
+}
+
+TEST_CASE("with both switches the line is written before the box shows") {
+  LogSettings settings;
+  ScratchFolder folder;
+  const std::string log = folder / "brcl.log";
+  settings.file.SetString(log);
+  MaskedReporter reporter(cErrReporter::LOG_TO_FILE | cErrReporter::LOG_TO_BOX);
+  BoxPresser presser(GetCurrentProcessId(), {IDABORT},
+                     [&] { return std::to_string(SplitLines(ReadWholeFile(log)).size()); });
+  ErrRecord record;
+  RunGuarded(reporter, OWNER, LEGEND_PLACE, record, [] { throw 3; });
+  const std::vector<SeenBox> boxes = presser.Finish();
+  REQUIRE(boxes.size() == 1);
+  CHECK(boxes[0].note == "1");
+  CHECK(SplitLines(ReadWholeFile(log)).size() == 1);
+}
+
+TEST_CASE("the box still shows when the log file cannot be opened") {
+  LogSettings settings;
+  settings.file.SetString("C:\\no such folder\\brcl.log");
+  MaskedReporter reporter(cErrReporter::LOG_TO_FILE | cErrReporter::LOG_TO_BOX);
+  BoxPresser presser(GetCurrentProcessId(), {IDIGNORE});
+  ErrRecord record;
+  RunGuarded(reporter, OWNER, LEGEND_PLACE, record, [] { throw 3; });
+  CHECK(presser.Finish().size() == 1);
+  CHECK_FALSE(record.failed());
+}
+
+TEST_CASE("a fresh process takes its switches from LogBRCL") {
+  LogSettings settings;
+  ScratchFolder folder;
+  const std::string log = folder / "brcl.log";
+  settings.file.SetString(log);
+
+  SUBCASE("1: one line, no box") {
+    settings.mask.SetDword(1);
+    const ChildRun run = RunChild("fail");
+    CHECK(run.exitCode == 11);
+    CHECK(run.boxes.empty());
+    CHECK(SplitLines(ReadWholeFile(log)).size() == 1);
+  }
+  SUBCASE("a string, 0xFFFFFFFF or nothing: no output") {
+    settings.mask.SetString("5");
+    CHECK(RunChild("fail").boxes.empty());
+    settings.mask.SetDword(0xFFFFFFFFu);
+    CHECK(RunChild("fail").boxes.empty());
+    settings.mask.Delete();
+    const ChildRun run = RunChild("fail");
+    CHECK(run.boxes.empty());
+    CHECK(run.exitCode == 11);
+    CHECK_FALSE(FileExists(log));
+  }
+  SUBCASE("5: the line, then the box; Retry and Abort") {
+    settings.mask.SetDword(5);
+    const ChildRun run = RunChild("fail", {IDRETRY, IDABORT}, [&] {
+      return std::to_string(SplitLines(ReadWholeFile(log)).size());
+    });
+    CHECK(run.exitCode == 21);
+    REQUIRE(run.boxes.size() == 2);
+    CHECK(run.boxes[0].note == "1");
+    CHECK(run.boxes[1].note == "2");
+    CHECK(run.boxes[0].text.rfind("XChartLegend.cpp(1265) CTestOwner::SetLegendData line:25", 0) ==
+          0);
+  }
+  SUBCASE("the mask is read once per process") {
+    settings.mask.SetDword(1);
+    CHECK(RunChild("cache").exitCode == 11);
+    CHECK(cRegSettings::Machine().ReadDword(nullptr, SETTING_LOG_MASK, 7) == 0);
+    CHECK(SplitLines(ReadWholeFile(log)).size() == 1);
+  }
+}

@@ -1,0 +1,285 @@
+// Registry settings and the data file search against the prefix's real
+// registry and file system.
+#include <doctest/doctest.h>
+
+#include <string>
+
+#include "TestSupport.h"
+#include "frame/settings/DataFileSearch.h"
+#include "frame/settings/Settings.h"
+#include "frame/settings/cRegSettings.h"
+
+namespace {
+
+// A scratch subkey below SOFTWARE\Brine, removed with everything under it.
+class ScratchSubkey {
+public:
+  explicit ScratchSubkey(HKEY root)
+      : m_root(root), m_name("BrTest" + std::to_string(GetCurrentProcessId())) {}
+  ~ScratchSubkey() { RegDeleteTreeA(m_root, cRegSettings::FullPath(m_name.c_str()).c_str()); }
+  const char* Name() const { return m_name.c_str(); }
+  std::string Sub(const char* child) const { return m_name + "\\" + child; }
+  std::string FullPath() const { return cRegSettings::FullPath(m_name.c_str()); }
+
+private:
+  HKEY m_root;
+  std::string m_name;
+};
+
+bool KeyExists(HKEY root, const std::string& path) {
+  HKEY key = nullptr;
+  if (RegOpenKeyExA(root, path.c_str(), 0, KEY_READ, &key) != ERROR_SUCCESS) {
+    return false;
+  }
+  RegCloseKey(key);
+  return true;
+}
+
+void MakeFile(const std::string& path, DWORD attributes = FILE_ATTRIBUTE_ARCHIVE) {
+  WriteTextFile(path, "picture");
+  REQUIRE(SetFileAttributesA(path.c_str(), attributes));
+}
+
+void MakeFolder(const std::string& path) { REQUIRE(CreateDirectoryA(path.c_str(), nullptr)); }
+
+// The first and second subfolder names as the platform lists them.
+std::pair<std::string, std::string> ListedOrder(const ScratchFolder& root) {
+  std::string names[2];
+  int count = 0;
+  WIN32_FIND_DATAA entry;
+  HANDLE search = FindFirstFileA((root / "*.*").c_str(), &entry);
+  REQUIRE(search != INVALID_HANDLE_VALUE);
+  do {
+    if ((entry.dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY) && entry.cFileName[0] != '.' &&
+        count < 2) {
+      names[count++] = entry.cFileName;
+    }
+  } while (FindNextFileA(search, &entry));
+  FindClose(search);
+  REQUIRE(count == 2);
+  return {names[0], names[1]};
+}
+
+}  // namespace
+
+TEST_CASE("dword settings: written keys are created, other types read as absent") {
+  for (HKEY root : {HKEY_LOCAL_MACHINE, HKEY_CURRENT_USER}) {
+    const cRegSettings settings(root);
+    const ScratchSubkey scratch(root);
+    const std::string deep = scratch.Sub("Deep\\Er");
+    CHECK(settings.ReadDword(deep.c_str(), "Count", 17) == 17);  // no key yet
+    REQUIRE(settings.WriteDword(deep.c_str(), "Count", 0xFFFFFFFEu));
+    CHECK(KeyExists(root, cRegSettings::FullPath(deep.c_str())));
+    CHECK(settings.ReadDword(deep.c_str(), "Count", 17) == 0xFFFFFFFEu);
+    CHECK(settings.ReadDword(deep.c_str(), "Missing", 3) == 3);
+
+    const std::string full = cRegSettings::FullPath(deep.c_str());
+    SavedRegistryValue value(root, full, "Typed");
+    value.SetString("5");
+    CHECK(settings.ReadDword(deep.c_str(), "Typed", 9) == 9);
+    value.SetBinary({5, 0, 0, 0});
+    CHECK(settings.ReadDword(deep.c_str(), "Typed", 9) == 9);
+    value.SetDword(5);
+    CHECK(settings.ReadDword(deep.c_str(), "Typed", 9) == 5);
+  }
+}
+
+TEST_CASE("string settings are read whole; other types and missing values give the default") {
+  const cRegSettings settings = cRegSettings::Machine();
+  const ScratchSubkey scratch(HKEY_LOCAL_MACHINE);
+  const std::string full = scratch.FullPath();
+  SavedRegistryValue value(HKEY_LOCAL_MACHINE, full, "Folder");
+  SavedRegistryValue unnamed(HKEY_LOCAL_MACHINE, full, "");
+
+  value.SetString("C:\\Charts\\");
+  CHECK(settings.ReadString(scratch.Name(), "Folder", "dflt") == "C:\\Charts\\");
+  const std::string longText(5000, 'q');
+  value.SetString(longText);
+  CHECK(settings.ReadString(scratch.Name(), "Folder", "dflt") == longText);
+  value.SetString("");
+  CHECK(settings.ReadString(scratch.Name(), "Folder", "dflt").empty());
+  value.SetString("%TEMP%", REG_EXPAND_SZ);
+  CHECK(settings.ReadString(scratch.Name(), "Folder", "dflt") == "dflt");
+  value.SetDword(1);
+  CHECK(settings.ReadString(scratch.Name(), "Folder", "dflt") == "dflt");
+  // Bytes that look like text are still not a string value.
+  value.SetBinary({'a', 'b', 0});
+  CHECK(settings.ReadString(scratch.Name(), "Folder", "dflt") == "dflt");
+  value.Delete();
+  CHECK(settings.ReadString(scratch.Name(), "Folder", "dflt") == "dflt");
+  CHECK(settings.ReadString("NoSuchKey\\AtAll", "Folder", "dflt") == "dflt");
+
+  unnamed.SetString("D:\\Vol\\");
+  CHECK(settings.ReadString(scratch.Name(), nullptr, "") == "D:\\Vol\\");
+}
+
+TEST_CASE("string values stored without a terminator are read whole") {
+  const ScratchSubkey scratch(HKEY_LOCAL_MACHINE);
+  HKEY key = nullptr;
+  REQUIRE(RegCreateKeyExA(HKEY_LOCAL_MACHINE, scratch.FullPath().c_str(), 0, nullptr, 0,
+                          KEY_SET_VALUE, nullptr, &key, nullptr) == ERROR_SUCCESS);
+  const char raw[] = {'a', 'b', 'c'};
+  RegSetValueExA(key, "Raw", 0, REG_SZ, reinterpret_cast<const BYTE*>(raw), sizeof raw);
+  RegCloseKey(key);
+  CHECK(cRegSettings::Machine().ReadString(scratch.Name(), "Raw", "dflt") == "abc");
+}
+
+TEST_CASE("the settings table: tree mode, folders and the picture window placement") {
+  const std::string enumKey = cRegSettings::FullPath(SETTINGS_ENUM_KEY);
+  SavedRegistryValue treeMode(HKEY_LOCAL_MACHINE, enumKey, SETTING_TREE_MODE);
+  SavedRegistryValue keyPath(HKEY_LOCAL_MACHINE, enumKey, SETTING_KEY_PATH);
+
+  treeMode.SetString("1");
+  CHECK(ReadTreeMode() == 0);
+  treeMode.SetDword(2);
+  CHECK(ReadTreeMode() == 2);
+  treeMode.Delete();
+  CHECK(ReadTreeMode() == 0);
+
+  keyPath.SetString("C:\\Brine\\Data\\");
+  CHECK(ReadKeyPath() == "C:\\Brine\\Data\\");
+  keyPath.Delete();
+  CHECK(ReadKeyPath().empty());
+
+  const std::string database = "BrTestDb" + std::to_string(GetCurrentProcessId());
+  const std::string volumeKey = enumKey + "\\" + database + "\\Volumes\\00";
+  {
+    SavedRegistryValue volume(HKEY_LOCAL_MACHINE, volumeKey, "");
+    volume.SetString("E:\\Vol00\\");
+    CHECK(ReadVolumeFolder(database) == "E:\\Vol00\\");
+  }
+  RegDeleteTreeA(HKEY_LOCAL_MACHINE, (enumKey + "\\" + database).c_str());
+  CHECK(ReadVolumeFolder(database).empty());
+
+  const std::string boxKey = cRegSettings::FullPath(SETTINGS_PICTURE_BOX_KEY);
+  SavedRegistryValue left(HKEY_CURRENT_USER, boxKey, "left");
+  SavedRegistryValue top(HKEY_CURRENT_USER, boxKey, "top");
+  SavedRegistryValue right(HKEY_CURRENT_USER, boxKey, "right");
+  SavedRegistryValue bottom(HKEY_CURRENT_USER, boxKey, "bottom");
+  REQUIRE(WritePictureBoxPlacement(RECT{-120, 40, 500, 380}));
+  const RECT placement = ReadPictureBoxPlacement();
+  CHECK(placement.left == -120);
+  CHECK(placement.top == 40);
+  CHECK(placement.right == 500);
+  CHECK(placement.bottom == 380);
+  right.SetString("7");
+  CHECK(ReadPictureBoxPlacement().right == 0);
+}
+
+TEST_CASE("folder search: the folder's own files before its subfolders, names in any case") {
+  ScratchFolder root;
+  MakeFolder(root / "aa");
+  MakeFile(root / "aa\\Chart.BMP");
+  MakeFile(root / "zz_chart.bmp");
+  MakeFile(root / "chart.bmp");
+  std::string path;
+  REQUIRE(FindFileInTree(root.Path(), "CHART.bmp", path) == S_OK);
+  CHECK(path == root / "chart.bmp");
+
+  // A closing backslash on the folder is not doubled.
+  REQUIRE(FindFileInTree(root.Path() + "\\", "zz_CHART.BMP", path) == S_OK);
+  CHECK(path == root / "zz_chart.bmp");
+
+  REQUIRE(DeleteFileA((root / "chart.bmp").c_str()));
+  REQUIRE(FindFileInTree(root.Path(), "chart.bmp", path) == S_OK);
+  CHECK(path == root / "aa\\Chart.BMP");
+}
+
+TEST_CASE("folder search goes depth-first in the platform's listing order") {
+  ScratchFolder root;
+  MakeFolder(root / "one");
+  MakeFolder(root / "two");
+  const auto [first, second] = ListedOrder(root);
+  MakeFolder(root / (first + "\\deeper"));
+  MakeFile(root / (first + "\\deeper\\mark.png"));
+  MakeFile(root / (second + "\\mark.png"));
+  std::string path;
+  REQUIRE(FindFileInTree(root.Path(), "mark.png", path) == S_OK);
+  CHECK(path == root / (first + "\\deeper\\mark.png"));
+}
+
+TEST_CASE("folder search needs the archive attribute, also in a subfolder") {
+  ScratchFolder root;
+  MakeFolder(root / "sub");
+  const std::string top = root / "pic.bmp";
+  const std::string nested = root / "sub\\pic.bmp";
+  MakeFile(top, FILE_ATTRIBUTE_NORMAL);
+  MakeFile(nested, FILE_ATTRIBUTE_NORMAL);
+  if ((GetFileAttributesA(top.c_str()) & FILE_ATTRIBUTE_ARCHIVE) != 0) {
+    // Wine reports the archive attribute on every plain file whatever was set;
+    // the attribute rule itself is covered by the native folder search suite.
+    MESSAGE("the platform keeps the archive attribute on every file; cleared-archive case skipped");
+    return;
+  }
+  std::string path;
+  CHECK(FindFileInTree(root.Path(), "pic.bmp", path) == E_FAIL);
+  REQUIRE(SetFileAttributesA(nested.c_str(), FILE_ATTRIBUTE_ARCHIVE));
+  REQUIRE(FindFileInTree(root.Path(), "pic.bmp", path) == S_OK);
+  CHECK(path == nested);
+  REQUIRE(SetFileAttributesA(top.c_str(), FILE_ATTRIBUTE_ARCHIVE));
+  REQUIRE(FindFileInTree(root.Path(), "pic.bmp", path) == S_OK);
+  CHECK(path == top);
+}
+
+TEST_CASE("folder search skips hidden files, dot folders and folders named like the file") {
+  ScratchFolder root;
+  MakeFolder(root / "sub");
+  const std::string top = root / "pic.bmp";
+  const std::string nested = root / "sub\\pic.bmp";
+  MakeFile(top, FILE_ATTRIBUTE_ARCHIVE | FILE_ATTRIBUTE_HIDDEN);
+  REQUIRE((GetFileAttributesA(top.c_str()) & FILE_ATTRIBUTE_HIDDEN) != 0);
+  MakeFile(nested);
+  std::string path;
+  REQUIRE(FindFileInTree(root.Path(), "pic.bmp", path) == S_OK);
+  CHECK(path == nested);
+  REQUIRE(SetFileAttributesA(top.c_str(), FILE_ATTRIBUTE_ARCHIVE));
+  REQUIRE(FindFileInTree(root.Path(), "pic.bmp", path) == S_OK);
+  CHECK(path == top);
+
+  ScratchFolder other;
+  MakeFolder(other / ".store");
+  MakeFile(other / ".store\\pic.bmp");
+  MakeFolder(other / "pic.bmp");
+  CHECK(FindFileInTree(other.Path(), "pic.bmp", path) == E_FAIL);
+}
+
+TEST_CASE("folder search of nothing, or of a missing folder, finds nothing") {
+  ScratchFolder root;
+  std::string path = "unchanged";
+  CHECK(FindFileInTree(root / "missing", "a.bmp", path) == E_FAIL);
+  CHECK(FindFileInTree("", "a.bmp", path) == E_FAIL);
+  CHECK(FindFileInTree(root.Path(), "", path) == E_FAIL);
+  CHECK(FindFileInTree(root.Path(), nullptr, path) == E_FAIL);
+  CHECK(FindFileInTree(root.Path() + "\\" + std::string(300, 'x'), "a.bmp", path) == E_FAIL);
+  CHECK(path == "unchanged");
+}
+
+TEST_CASE("volume and store files are searched below their registry folders") {
+  ScratchFolder volume;
+  MakeFolder(volume / "PICS");
+  MakeFile(volume / "PICS\\shoal.tif");
+  const std::string enumKey = cRegSettings::FullPath(SETTINGS_ENUM_KEY);
+  const std::string database = "BrTestDb" + std::to_string(GetCurrentProcessId());
+  std::string path;
+  {
+    SavedRegistryValue folder(HKEY_LOCAL_MACHINE, enumKey + "\\" + database + "\\Volumes\\00", "");
+    folder.SetString(volume.Path() + "\\");
+    REQUIRE(FindVolumeFile(database, "SHOAL.TIF", path) == S_OK);
+    CHECK(path == volume / "PICS\\shoal.tif");
+    // The last character goes whatever it is.
+    folder.SetString(volume.Path() + "*");
+    CHECK(FindVolumeFile(database, "shoal.tif", path) == S_OK);
+    CHECK(FindVolumeFile(database, "reef.tif", path) == E_FAIL);
+    folder.SetString("");
+    CHECK(FindVolumeFile(database, "shoal.tif", path) == REGDB_E_READREGDB);
+  }
+  RegDeleteTreeA(HKEY_LOCAL_MACHINE, (enumKey + "\\" + database).c_str());
+  CHECK(FindVolumeFile(database, "shoal.tif", path) == REGDB_E_READREGDB);
+
+  SavedRegistryValue store(HKEY_LOCAL_MACHINE, enumKey, SETTING_BASES_STORE);
+  store.SetString(volume.Path() + "\\");
+  REQUIRE(FindStoreFile("shoal.tif", path) == S_OK);
+  CHECK(path == volume / "PICS\\shoal.tif");
+  store.Delete();
+  CHECK(FindStoreFile("shoal.tif", path) == REGDB_E_READREGDB);
+}
