@@ -1,0 +1,11 @@
+#include "toolkit/base/Object.h"
+
+#include "toolkit/base/ClassRecords.h"
+
+namespace toolkit {
+
+const ClassRecord* Object::getClassRecord() const { return &records::Object; }
+
+Object::~Object() = default;
+
+}  // namespace toolkit

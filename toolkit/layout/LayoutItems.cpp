@@ -1,0 +1,7 @@
+#include "toolkit/layout/LayoutItems.h"
+
+namespace toolkit {
+
+LayoutItems::~LayoutItems() = default;
+
+}  // namespace toolkit

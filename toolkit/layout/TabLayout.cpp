@@ -1,0 +1,9 @@
+#include "toolkit/layout/TabLayout.h"
+
+#include "toolkit/base/ClassRecords.h"
+
+namespace toolkit {
+
+const ClassRecord* TabLayout::getClassRecord() const { return &records::TabLayout; }
+
+}  // namespace toolkit
