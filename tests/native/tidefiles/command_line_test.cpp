@@ -1,0 +1,204 @@
+// The tidefiles command line: help, bad arguments, build/check/dump on disk, predict.
+#include <doctest/doctest.h>
+
+#include <cmath>
+#include <filesystem>
+#include <fstream>
+
+#include <nlohmann/json.hpp>
+
+#include "tests/native/tidefiles/tidefiles_test_support.h"
+
+using namespace br::tidefiles::test;
+using Json = nlohmann::json;
+
+namespace {
+
+void WriteText(const std::filesystem::path& path, const std::string& text) {
+  std::ofstream out(path, std::ios::binary);
+  out << text;
+}
+
+// A mean-level-only station, an M2-only one and one at 10 30'S 5 15'W.
+const char kStations[] = R"([
+  {"name": "Level", "latitude": 50, "longitude": -4, "zone": 0, "mean_level": 1.234, "constituents": []},
+  {"name": "Semidiurnal", "latitude": 0, "longitude": 0, "zone": 0, "mean_level": 0,
+   "constituents": [{"name": "M2", "amplitude": 1, "phase": 0}]},
+  {"name": "South", "latitude": -10.5, "longitude": -5.25, "zone": -1, "mean_level": 2,
+   "constituents": [{"name": "M2", "amplitude": 0.5, "phase": 40}, {"name": "K1", "amplitude": 0.25, "phase": 200}]}])";
+
+Json PredictJson(const std::string& folder, std::vector<std::string> extra) {
+  std::vector<std::string> args = {"predict", folder, "--json"};
+  args.insert(args.end(), extra.begin(), extra.end());
+  const ToolRun run = RunTool(args);
+  REQUIRE_MESSAGE(run.status == 0, run.err);
+  return Json::parse(run.out);
+}
+
+}  // namespace
+
+TEST_CASE("help and bad command lines") {
+  const ToolRun help = RunTool({"--help"});
+  CHECK(help.status == 0);
+  CHECK(help.out.find("Greenwich phase lag") != std::string::npos);
+  CHECK(help.out.find("UTC+1 is -1") != std::string::npos);
+  struct Case {
+    std::vector<std::string> args;
+    const char* message;
+  };
+  const Case cases[] = {
+      {{}, "no command given"},
+      {{"frobnicate"}, "unknown command frobnicate"},
+      {{"build", "only-one"}, "build needs STATIONS.json and FOLDER"},
+      {{"build", "--fast", "a", "b"}, "unknown option --fast"},
+      {{"dump"}, "dump needs FOLDER"},
+      {{"check", "a", "b"}, "check needs FOLDER"},
+      {{"predict", "f", "--date", "2024-01-01"}, "either --station N or --at LAT LON"},
+      {{"predict", "f", "--station", "1", "--at", "1", "2", "--date", "2024-01-01"}, "either --station N or --at"},
+      {{"predict", "f", "--station", "1"}, "needs --date"},
+      {{"predict", "--station", "1", "--date", "2024-01-01"}, "predict needs FOLDER"},
+      {{"predict", "f", "--station", "-1", "--date", "2024-01-01"}, "--station needs"},
+      {{"predict", "f", "--station", "1.5", "--date", "2024-01-01"}, "--station needs"},
+      {{"predict", "f", "--station"}, "--station needs"},
+      {{"predict", "f", "--at", "91", "0", "--date", "2024-01-01"}, "--at needs"},
+      {{"predict", "f", "--at", "1"}, "--at needs"},
+      {{"predict", "f", "--station", "0", "--date", "2023-02-29"}, "--date needs"},
+      {{"predict", "f", "--station", "0", "--date", "2024-13-01"}, "--date needs"},
+      {{"predict", "f", "--station", "0", "--date", "24-01-01"}, "--date needs"},
+      {{"predict", "f", "--station", "0", "--date", "2024-01-0x"}, "--date needs"},
+      {{"predict", "f", "--station", "0", "--date", "2024-01-01", "--step", "0"}, "--step needs"},
+      {{"predict", "f", "--station", "0", "--date", "2024-01-01", "--step", "nan"}, "--step needs"},
+      {{"predict", "f", "--station", "0", "--date", "2024-01-01", "--step", "1h"}, "--step needs"},
+      {{"predict", "f", "--station", "0", "--date", "2024-01-01", "--utc-offset", "15"}, "--utc-offset needs"},
+      {{"predict", "f", "g", "--station", "0", "--date", "2024-01-01"}, "more than one FOLDER"},
+      {{"predict", "f", "--station", "0", "--date", "2024-01-01", "--csv"}, "unknown option --csv"},
+  };
+  for (const Case& c : cases) {
+    const ToolRun run = RunTool(c.args);
+    CHECK_MESSAGE(run.status == 2, c.message);
+    CHECK_MESSAGE(run.err.find(c.message) != std::string::npos, c.message, "\n", run.err);
+    CHECK(run.err.find("usage: tidefiles") != std::string::npos);
+  }
+}
+
+TEST_CASE("build, check and dump a folder on disk") {
+  TemporaryFolder tmp;
+  const auto json = tmp.Path() / "stations.json";
+  WriteText(json, kStations);
+  const std::string folder = (tmp.Path() / "folder").string();
+  const ToolRun build = RunTool({"build", json.string(), folder});
+  CHECK(build.status == 0);
+  CHECK(build.out == "wrote 3 stations to " + folder + ", 0 warnings\n");
+  CHECK(std::filesystem::file_size(tmp.Path() / "folder" / "td_num.ntx") == 30);
+  CHECK_FALSE(std::filesystem::exists(tmp.Path() / "folder" / "td_num.ntx.tmp"));
+
+  const ToolRun check = RunTool({"check", folder});
+  CHECK(check.status == 0);
+  CHECK(check.out == "ok: 3 stations\n");
+
+  const ToolRun dump = RunTool({"dump", folder});
+  CHECK(dump.status == 0);
+  const Json stations = Json::parse(dump.out);
+  REQUIRE(stations.size() == 3);
+  CHECK(stations[2]["name"] == "South");
+  CHECK(stations[2]["zone"] == -1);
+  CHECK(stations[2]["constituents"][1]["name"] == "K1");
+
+  // Standard input works as the JSON source, and errors leave the folder untouched.
+  const ToolRun fromStdin = RunTool({"build", "-", (tmp.Path() / "other").string()}, kStations);
+  CHECK(fromStdin.status == 0);
+  const ToolRun bad = RunTool({"build", "-", folder}, R"([{"name": "X"}])");
+  CHECK(bad.status == 1);
+  CHECK(bad.err.find("nothing written (4 errors)") != std::string::npos);
+  CHECK(RunTool({"check", folder}).out == "ok: 3 stations\n");
+}
+
+TEST_CASE("missing files and folders are reported, never crash") {
+  TemporaryFolder tmp;
+  const ToolRun noJson = RunTool({"build", (tmp.Path() / "absent.json").string(), tmp.Str()});
+  CHECK(noJson.status == 1);
+  CHECK(noJson.err.find("absent.json: cannot open") != std::string::npos);
+  const ToolRun noFolder = RunTool({"check", (tmp.Path() / "absent").string()});
+  CHECK(noFolder.status == 1);
+  CHECK(noFolder.out.find("absent: not a folder") != std::string::npos);
+  const ToolRun noData = RunTool({"check", tmp.Str()});
+  CHECK(noData.status == 1);
+  CHECK(noData.out.find("td_num.ntx: cannot read") != std::string::npos);
+  CHECK(RunTool({"dump", tmp.Str()}).status == 1);
+  const ToolRun noPredict = RunTool({"predict", tmp.Str(), "--station", "0", "--date", "2024-01-01"});
+  CHECK(noPredict.status == 1);
+  CHECK(noPredict.err.find("cannot open the station folder") != std::string::npos);
+  const ToolRun longPath = RunTool({"predict", std::string(241, 'x'), "--station", "0", "--date", "2024-01-01"});
+  CHECK(longPath.status == 1);
+  CHECK(longPath.err.find("longer than 240 characters") != std::string::npos);
+}
+
+TEST_CASE("predict prints a day in metres with its extremes and sun events") {
+  TemporaryFolder tmp;
+  const std::string folder = tmp.Str();
+  REQUIRE(RunTool({"build", "-", folder}, kStations).status == 0);
+
+  SUBCASE("a mean-level-only station is flat at its level") {
+    const Json day = PredictJson(folder, {"--station", "0", "--date", "2024-06-01"});
+    CHECK(day["name"] == "Level");
+    REQUIRE(day["heights"].size() == 25);
+    for (const Json& h : day["heights"]) CHECK(h.get<double>() == doctest::Approx(1.234).epsilon(1e-6));
+    CHECK(day["highest"]["index"] == 0);
+    CHECK(day["lowest"]["index"] == 0);
+  }
+  SUBCASE("the step sets the sample count") {
+    CHECK(PredictJson(folder, {"--station", "0", "--date", "2024-06-01", "--step", "0.25"})["heights"].size() == 97);
+    CHECK(PredictJson(folder, {"--station", "0", "--date", "2024-06-01", "--step", "30"})["heights"].size() == 2);
+    CHECK(PredictJson(folder, {"--station", "0", "--date", "2024-06-01", "--step", "48"})["heights"].size() == 1);
+  }
+  SUBCASE("the worked M2 day of 1996-01-01") {
+    const Json day = PredictJson(folder, {"--station", "1", "--date", "1996-01-01"});
+    const Json& h = day["heights"];
+    // M2 of 1 m at Greenwich, phase 0: V(M2) = 117.86 degrees at 00:00 UT, f about 1.0386.
+    CHECK(h[0].get<double>() == doctest::Approx(-0.4984).epsilon(2e-3));
+    CHECK(h[1].get<double>() == doctest::Approx(-0.8775).epsilon(2e-3));
+    CHECK(day["lowest"]["index"] == 2);
+    CHECK(day["highest"]["index"] == 21);
+    CHECK(day["highest"]["height"].get<double>() == doctest::Approx(1.0301).epsilon(2e-3));
+    // Latitude 0, longitude 0, zone 0 in early January: sunrise close to 06:00.
+    const int sunrise = day["sun"]["sunrise"]["hour"].get<int>() * 60 + day["sun"]["sunrise"]["minute"].get<int>();
+    CHECK(sunrise >= 5 * 60 + 50);
+    CHECK(sunrise <= 6 * 60 + 10);
+  }
+  SUBCASE("a station found by position, with its zone time sun events") {
+    const Json day = PredictJson(folder, {"--at", "-10.5", "-5.25", "--date", "2024-03-01", "--step", "6"});
+    CHECK(day["name"] == "South");
+    CHECK(day["latitude"].get<double>() == doctest::Approx(-10.5));
+    CHECK(day["zone"] == -1);
+    const int sunrise = day["sun"]["sunrise"]["hour"].get<int>() * 60 + day["sun"]["sunrise"]["minute"].get<int>();
+    CHECK(sunrise > 6 * 60);   // about 06:24 UT at 5 15'W, shown an hour later
+    CHECK(sunrise < 8 * 60);
+  }
+  SUBCASE("a UTC-5 computer's day is the UTC day from 05:00") {
+    const Json utc = PredictJson(folder, {"--station", "2", "--date", "2024-03-01"});
+    const Json west = PredictJson(folder, {"--station", "2", "--date", "2024-03-01", "--utc-offset", "-5"});
+    for (int k = 0; k + 5 < 25; ++k)
+      CHECK(west["heights"][k].get<double>() == doctest::Approx(utc["heights"][k + 5].get<double>()).epsilon(1e-3));
+  }
+  SUBCASE("the table form") {
+    const ToolRun run = RunTool({"predict", folder, "--station", "1", "--date", "1996-01-01"});
+    CHECK(run.status == 0);
+    CHECK(run.out.find("Semidiurnal") != std::string::npos);
+    CHECK(run.out.find("     2  02:00    -1.037") != std::string::npos);
+    CHECK(run.out.find("lowest:  index 2 (02:00) -1.037 m") != std::string::npos);
+    CHECK(run.out.find("sun (zone time): twilight begin") != std::string::npos);
+  }
+  SUBCASE("no such station") {
+    const ToolRun number = RunTool({"predict", folder, "--station", "3", "--date", "2024-01-01"});
+    CHECK(number.status == 1);
+    CHECK(number.err.find("no station number 3 (the folder has 3 stations") != std::string::npos);
+    const ToolRun position = RunTool({"predict", folder, "--at", "1", "1", "--date", "2024-01-01"});
+    CHECK(position.status == 1);
+    CHECK(position.err.find("no station at latitude 60', longitude 60'") != std::string::npos);
+  }
+  SUBCASE("a step too small for a day") {
+    const ToolRun run = RunTool({"predict", folder, "--station", "0", "--date", "2024-01-01", "--step", "0.00001"});
+    CHECK(run.status == 1);
+    CHECK(run.err.find("at most 1000000 samples") != std::string::npos);
+  }
+}
