@@ -209,22 +209,7 @@ void Container::repaintAll() {
 }
 
 HRESULT Container::setPalette(const VARIANT& palette) {
-  if (!(palette.vt & VT_ARRAY)) return E_INVALIDARG;
-  SAFEARRAY* array = nullptr;
-  if (palette.vt & VT_BYREF) {
-    array = palette.pparray ? *palette.pparray : nullptr;
-  } else {
-    array = palette.parray;
-  }
-  if (!array || SafeArrayGetDim(array) != 1 || SafeArrayGetElemsize(array) != 4 ||
-      array->rgsabound[0].cElements != Palette::kSize || array->rgsabound[0].lLbound != 0)
-    return E_INVALIDARG;
-  void* data = nullptr;
-  if (FAILED(SafeArrayAccessData(array, &data)) || !data) return E_INVALIDARG;
-  COLORREF table[Palette::kSize];
-  std::memcpy(table, data, sizeof(table));
-  SafeArrayUnaccessData(array);
-  Palette::replace(table, Palette::kSize);
+  if (!Palette::replace(palette)) return E_INVALIDARG;
   repaintAll();
   return S_OK;
 }

@@ -1,6 +1,9 @@
 #include "toolkit/core/Palette.h"
 
+#include <oleauto.h>
+
 #include <algorithm>
+#include <cstring>
 
 namespace toolkit {
 
@@ -29,6 +32,25 @@ bool Palette::replace(const COLORREF* table, int count) {
   if (!table || count != kSize) return false;
   std::copy(table, table + kSize, g_colours);
   return true;
+}
+
+bool Palette::replace(const VARIANT& palette) {
+  if (!(palette.vt & VT_ARRAY)) return false;
+  SAFEARRAY* array = nullptr;
+  if (palette.vt & VT_BYREF) {
+    array = palette.pparray ? *palette.pparray : nullptr;
+  } else {
+    array = palette.parray;
+  }
+  if (!array || SafeArrayGetDim(array) != 1 || SafeArrayGetElemsize(array) != 4 ||
+      array->rgsabound[0].cElements != kSize || array->rgsabound[0].lLbound != 0)
+    return false;
+  void* data = nullptr;
+  if (FAILED(SafeArrayAccessData(array, &data)) || !data) return false;
+  COLORREF table[kSize];
+  std::memcpy(table, data, sizeof(table));
+  SafeArrayUnaccessData(array);
+  return replace(table, kSize);
 }
 
 void Palette::reset() { std::copy(kInitial, kInitial + kSize, g_colours); }
