@@ -58,6 +58,10 @@ const char kHelpText[] =
     "amplitude in metres; phase: Greenwich phase lag in degrees (referred to UT).\n"
     "Exit status: 0 ok, 1 problems found, 2 bad command line.\n";
 
+std::string Count(std::size_t n, const char* noun) {
+  return std::to_string(n) + " " + noun + (n == 1 ? "" : "s");
+}
+
 int Usage(std::ostream& err, const std::string& message) {
   err << "tidefiles: " << message << '\n' << kUsageText;
   return kUsage;
@@ -140,7 +144,7 @@ int Build(const std::vector<std::string>& args, std::istream& in, std::ostream& 
   if (!diagnostics.HasErrors()) image = BuildFolderImage(stations, diagnostics);
   diagnostics.Print(err, verbose);
   if (!image) {
-    err << "tidefiles: build: nothing written (" << diagnostics.Count(Severity::Error) << " errors)\n";
+    err << "tidefiles: build: nothing written (" << Count(diagnostics.Count(Severity::Error), "error") << ")\n";
     return kProblems;
   }
   if (!WriteFolderImage(paths[1], *image, error)) {
@@ -148,9 +152,9 @@ int Build(const std::vector<std::string>& args, std::istream& in, std::ostream& 
     return kProblems;
   }
   const std::size_t written = image->stationIndex.size() / 10;
-  out << "wrote " << written << " stations to " << paths[1];
+  out << "wrote " << Count(written, "station") << " to " << paths[1];
   if (written != stations.size()) out << " (" << stations.size() - written << " dropped)";
-  out << ", " << diagnostics.Count(Severity::Warning) << " warnings\n";
+  out << ", " << Count(diagnostics.Count(Severity::Warning), "warning") << '\n';
   return kOk;
 }
 
@@ -179,10 +183,10 @@ int Check(const std::vector<std::string>& args, std::ostream& out, std::ostream&
   const std::vector<std::string> problems = CheckFolderImage(image);
   for (const std::string& p : problems) out << p << '\n';
   if (!problems.empty()) {
-    err << "tidefiles: check: " << problems.size() << " problems in " << args[0] << '\n';
+    err << "tidefiles: check: " << Count(problems.size(), "problem") << " in " << args[0] << '\n';
     return kProblems;
   }
-  out << "ok: " << image.stationIndex.size() / 10 << " stations\n";
+  out << "ok: " << Count(image.stationIndex.size() / 10, "station") << '\n';
   return kOk;
 }
 
