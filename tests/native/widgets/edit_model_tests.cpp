@@ -1,0 +1,140 @@
+// Behaviour shared by the edit types: configuration, caret, selection, clipboard.
+#include <doctest/doctest.h>
+
+#include "FakeClipboard.h"
+#include "toolkit/widgets/edit/EditModel.h"
+
+using namespace toolkit;
+
+TEST_CASE("setEditType refuses the types the edit does not have") {
+  EditModel edit;
+  edit.setText("keep");
+  for (int t : {0, 4, 5, 9, -1}) {
+    CAPTURE(t);
+    CHECK_FALSE(edit.setEditType(t, "99"));
+    CHECK(edit.type() == kEditText);
+    CHECK(edit.text() == "keep");
+  }
+}
+
+TEST_CASE("setText switches to text, keeps a mask of the same length, cuts to the limit") {
+  EditModel edit(4);
+  REQUIRE(edit.setEditType(kEditMonth, ""));
+  CHECK(edit.noPaste());
+  edit.setText("abcdef");
+  CHECK(edit.type() == kEditText);
+  CHECK_FALSE(edit.noPaste());
+  CHECK(edit.text() == "abcd");
+
+  REQUIRE(edit.setEditType(kEditText, "99-99"));
+  CHECK(edit.text() == "00-00");  // a text of another length gives way to the mask's
+  edit.setText("12-34");
+  CHECK(edit.mask() == "99-99");
+  CHECK(edit.isMasked());
+  edit.setText("123456");
+  CHECK(edit.mask().empty());
+  CHECK(edit.text() == "1234");
+}
+
+TEST_CASE("setMaxLength and setSelectionLength") {
+  EditModel edit;
+  edit.setText("abcdef");
+  CHECK_FALSE(edit.setMaxLength(-1));
+  CHECK(edit.setMaxLength(3));
+  CHECK(edit.text() == "abc");
+  edit.setCaret(1, 0);
+  CHECK(edit.setSelectionLength(10));
+  CHECK(edit.selectionLength() == 2);
+  CHECK(edit.setSelectionLength(-10));
+  CHECK(edit.selectionLength() == -1);
+}
+
+TEST_CASE("caret keys with and without Shift") {
+  FakeClipboard clip;
+  EditModel edit;
+  edit.setText("hello");
+  edit.setCaret(2, 0);
+  CHECK(edit.pressKey(EditKey::Right, true, false, clip));
+  CHECK(edit.pressKey(EditKey::Right, true, false, clip));
+  CHECK(edit.caret() == 4);
+  CHECK(edit.selectionLength() == -2);  // extends to the left of the caret
+  CHECK(edit.selectionStart() == 2);
+  CHECK(edit.pressKey(EditKey::Home, true, false, clip));
+  CHECK(edit.caret() == 0);
+  CHECK(edit.selectionLength() == 2);
+  CHECK(edit.pressKey(EditKey::End, true, false, clip));
+  CHECK(edit.caret() == 5);
+  CHECK(edit.selectionLength() == -3);
+  CHECK(edit.pressKey(EditKey::Left, false, false, clip));
+  CHECK(edit.caret() == 4);
+  CHECK(edit.selectionLength() == 0);
+  CHECK(edit.pressKey(EditKey::Right, false, false, clip));
+  CHECK(edit.pressKey(EditKey::Right, false, false, clip));
+  CHECK(edit.caret() == 5);
+  CHECK_FALSE(edit.pressKey(EditKey::Other, false, false, clip));
+  CHECK_FALSE(edit.pressKey(EditKey::LetterA, false, false, clip));  // without Ctrl: typing
+}
+
+TEST_CASE("clipboard: copy, cut and paste as plain text") {
+  FakeClipboard clip;
+  EditModel edit;
+  edit.setText("one two");
+  CHECK(edit.pressKey(EditKey::LetterA, false, true, clip));
+  CHECK(edit.selectionStart() == 0);
+  CHECK(edit.selectionEnd() == 7);
+  CHECK(edit.pressKey(EditKey::LetterC, false, true, clip));
+  CHECK(clip.held == "one two");
+  edit.setCaret(4, 3);
+  CHECK(edit.pressKey(EditKey::Delete, true, false, clip));  // Shift+Delete cuts
+  CHECK(clip.held == "two");
+  CHECK(edit.text() == "one ");
+  CHECK(edit.pressKey(EditKey::Insert, true, false, clip));  // Shift+Insert pastes
+  CHECK(edit.text() == "one two");
+  edit.setCaret(0, 3);
+  CHECK(edit.pressKey(EditKey::Insert, false, true, clip));  // Ctrl+Insert copies
+  CHECK(clip.held == "one");
+  SUBCASE("without a selection copy takes the whole text, cut nothing") {
+    edit.setCaret(2, 0);
+    CHECK(edit.pressKey(EditKey::LetterC, false, true, clip));
+    CHECK(clip.held == "one two");
+    clip.held = "x";
+    CHECK(edit.pressKey(EditKey::LetterX, false, true, clip));
+    CHECK(clip.held == "x");
+    CHECK(edit.text() == "one two");
+  }
+  SUBCASE("paste keeps only what the type accepts and stops at the limit") {
+    REQUIRE(edit.setEditType(kEditDecimal, ""));
+    REQUIRE(edit.setMaxLength(6));
+    edit.setCaret(0, 3);
+    clip.held = "7a.5.9\t1";
+    CHECK(edit.pressKey(EditKey::LetterV, false, true, clip));
+    CHECK(edit.text() == "7.591");  // letters, a second '.' and the tab refused
+    clip.held = "12345";
+    CHECK(edit.pressKey(EditKey::LetterV, false, true, clip));
+    CHECK(edit.text().size() == 6);
+  }
+}
+
+TEST_CASE("clicks and drags place the caret and select") {
+  EditModel edit;
+  edit.setText("abcdef");
+  edit.placeCaret(2, false);
+  edit.placeCaret(5, true);
+  CHECK(edit.caret() == 5);
+  CHECK(edit.selectionStart() == 2);
+  CHECK(edit.selectionEnd() == 5);
+  edit.placeCaret(99, false);
+  CHECK(edit.caret() == 6);
+  CHECK(edit.selectionLength() == 0);
+
+  SUBCASE("restricted fields snap to the nearest place and never drag-select") {
+    REQUIRE(edit.setEditType(kEditLatitude, ""));
+    REQUIRE(edit.setValue(1.0));
+    edit.placeCaret(2, false);  // the degree sign: the next place is as near as the one before
+    CHECK(edit.caret() == 3);
+    edit.placeCaret(9, false);
+    CHECK(edit.caret() == 10);
+    edit.placeCaret(0, true);
+    CHECK(edit.selectionLength() == 0);
+  }
+}
