@@ -57,7 +57,6 @@ class StationReader {
         const std::optional<long> zone = WholeNumber(value, -kMaxZone, kMaxZone);
         if (zone) {
           entry_.zone = static_cast<int>(*zone);
-          haveZone_ = true;
         } else {
           Error("\"zone\" must be a whole number of hours from -14 to 14");
         }
@@ -77,7 +76,7 @@ class StationReader {
     }
     if (!object.contains("latitude")) Error("has no \"latitude\"");
     if (!object.contains("longitude")) Error("has no \"longitude\"");
-    if (!haveZone_ && !object.contains("zone")) Error("has no \"zone\" (whole hours, UTC+1 is -1)");
+    if (!object.contains("zone")) Error("has no \"zone\" (whole hours, UTC+1 is -1)");
     const auto constituents = object.find("constituents");
     if (constituents == object.end()) {
       Error("has no \"constituents\" array");
@@ -184,14 +183,14 @@ class StationReader {
     c.amplitude = *a;
     c.phase = *g;
     const bool viaDoodson = !byNumber && byName->via == ConstituentMatch::Via::DoodsonNumbers;
-    if (c.row == 0 && object_has_mean_level()) {
+    if (c.row == 0 && HasMeanLevel()) {
       Error(c.label + ": the mean level is given twice (\"mean_level\" and constituent 0)");
       return;
     }
     Merge(std::move(c), viaDoodson);
   }
 
-  bool object_has_mean_level() const { return entry_.meanLevel.has_value(); }
+  bool HasMeanLevel() const { return entry_.meanLevel.has_value(); }
 
   // Keeps a row once: a repeat of the same constituent is dropped, a different constituent
   // of the same Doodson numbers (2MK3 beside MO3) is added to it as a wave of equal speed.
@@ -233,7 +232,6 @@ class StationReader {
   StationEntry entry_;
   std::vector<bool> viaDoodson_;
   std::vector<std::string> dropped_;
-  bool haveZone_ = false;
   bool failed_ = false;
 };
 

@@ -24,8 +24,8 @@ namespace br::tidefiles {
 // numbers (their sum is the same wave), and the later one is dropped when it repeats one.
 std::vector<StationEntry> ReadStationsJson(std::string_view text, Diagnostics& diagnostics);
 
-// The JSON text of stations (as dump prints it): rows with a usual name by name, the others
-// by number; the mean level as "mean_level" when it is a plain level (phase 0 or 180).
+// The JSON text of stations (as dump prints it): one station per block, one constituent per
+// line; rows with a usual name by name, the others by number.
 std::string WriteStationsJson(const std::vector<StationEntry>& stations);
 
 }  // namespace br::tidefiles
