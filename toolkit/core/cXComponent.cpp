@@ -7,6 +7,7 @@
 #include "toolkit/core/Palette.h"
 #include "toolkit/core/ToolkitError.h"
 #include "toolkit/core/ToolkitWindows.h"
+#include "toolkit/widgets/Tooltip.h"
 
 namespace toolkit {
 
@@ -110,6 +111,9 @@ bool cXComponent::createWindow(DWORD exStyle, const char* className, const char*
     ToolkitWindows::subclass(hwnd, this);
   }
   peer_->setHwnd(hwnd);
+  // Every component window gets its hover popup with it.
+  if (tooltip_ && IsWindow(tooltip_)) DestroyWindow(tooltip_);
+  tooltip_ = Tooltip::createFor(hwnd);
   bounds_ = RECT{x, y, x + width, y + height};
   if (!text_.empty() && !(title && *title)) SetWindowTextA(hwnd, text_.c_str());
   return true;
