@@ -1,0 +1,14 @@
+// brtide --help.
+#pragma once
+
+#include <ostream>
+#include <vector>
+
+#include "host/brtide/argument_parser.h"
+
+namespace br::brtide {
+
+// The general help (command == nullptr) or one command's options.
+void WriteUsage(const std::vector<CommandSpec>& commands, const CommandSpec* command, std::ostream& out);
+
+}  // namespace br::brtide
