@@ -1,0 +1,92 @@
+#include "toolkit/widgets/Label.h"
+
+#include "toolkit/base/ClassRecords.h"
+#include "toolkit/widgets/support/MeasuringDC.h"
+#include "toolkit/widgets/support/TextExtent.h"
+
+namespace toolkit {
+
+Label::Label(const char* text, int alignment) : alignment_(alignment) {
+  if (text) text_ = text;
+  userValue1_ = 7;
+  userValue2_ = 0;
+}
+
+const ClassRecord* Label::getClassRecord() const { return &records::Label; }
+
+void Label::setText(std::string_view text) {
+  if (text == std::string_view(text_)) return;
+  cXComponent::setText(text);
+  invalidate();
+}
+
+void Label::setAlignment(int alignment) {
+  if (alignment == alignment_) return;
+  alignment_ = alignment;
+  invalidate();
+}
+
+void Label::setEnabled(bool enabled) {
+  const bool changed = enabled != getEnabledFlag();
+  cXComponent::setEnabled(enabled);
+  if (changed) invalidate();
+}
+
+const std::string& Label::measuredText() const {
+  static const std::string placeholder = kEmptyMeasure;
+  return text_.empty() ? placeholder : text_;
+}
+
+void Label::paint(HDC dc) {
+  RECT client = getClientRect();
+  const COLORREF oldBack = SetBkColor(dc, colorOf(COLOR_BTNFACE));
+  ExtTextOutA(dc, 0, 0, ETO_OPAQUE, &client, nullptr, 0, nullptr);
+  SetBkColor(dc, oldBack);
+  if (text_.empty()) return;
+  HFONT font = getFont();
+  HGDIOBJ oldFont = SelectObject(dc, font ? static_cast<HGDIOBJ>(font) : GetStockObject(DEFAULT_GUI_FONT));
+  const int oldMode = SetBkMode(dc, TRANSPARENT);
+  const COLORREF oldColour = SetTextColor(dc, colorOf(getEnabledFlag() ? COLOR_WINDOWTEXT : COLOR_GRAYTEXT));
+  RECT box = client;
+  box.left += 2;
+  box.right -= 2;
+  const int length = static_cast<int>(text_.size());
+  const UINT align = static_cast<UINT>(alignment_) & (DT_CENTER | DT_RIGHT);
+  RECT needed = box;
+  DrawTextA(dc, text_.c_str(), length, &needed, align | DT_WORDBREAK | DT_CALCRECT | DT_NOPREFIX);
+  RECT oneLine{0, 0, 0, 0};
+  DrawTextA(dc, "A", 1, &oneLine, DT_CALCRECT | DT_SINGLELINE);
+  const int textHeight = needed.bottom - needed.top;
+  if (textHeight <= oneLine.bottom - oneLine.top) {
+    DrawTextA(dc, text_.c_str(), length, &box, align | DT_VCENTER | DT_SINGLELINE | DT_NOPREFIX);
+  } else {
+    // Several lines: centred as a block, since DT_VCENTER serves single lines only.
+    if (textHeight < box.bottom - box.top) box.top += (box.bottom - box.top - textHeight) / 2;
+    DrawTextA(dc, text_.c_str(), length, &box, align | DT_WORDBREAK | DT_NOPREFIX);
+  }
+  SetTextColor(dc, oldColour);
+  SetBkMode(dc, oldMode);
+  SelectObject(dc, oldFont);
+}
+
+SIZE Label::getPreferredSize() {
+  SIZE size{};
+  if (!TextExtent::measure(getFont(), measuredText(), insets_, size)) return kFallbackSize;
+  return size;
+}
+
+SIZE Label::getPreferredSizeIn(const RECT& area) {
+  MeasuringDC dc(getFont());
+  if (!dc.valid()) return kFallbackSize;
+  SIZE size = TextExtent::fromMetrics(dc, measuredText(), insets_);
+  const int width = area.right - area.left, height = area.bottom - area.top;
+  if (width <= 0 || height <= 0 || width >= size.cx) return size;
+  const TEXTMETRICA& tm = dc.metrics();
+  do {
+    size.cx /= 2;
+    size.cy += 2 * tm.tmDescent;
+  } while (size.cx > width && size.cx >= 3 * tm.tmAveCharWidth);
+  return size;
+}
+
+}  // namespace toolkit
