@@ -239,8 +239,9 @@ function writeReadme(out, chosen, dropped, droppedNames, options) {
   }
   p("The package's NOTICE adds: station location fields derived from GeoNames data (CC BY 4.0),");
   p("OpenStreetMap extracts (ODbL 1.0, © OpenStreetMap contributors) and the Marine Regions");
-  p("Maritime Boundaries Geodatabase (CC BY 4.0, Flanders Marine Institute). Of these, only");
-  p("station names reach the files.");
+  p("Maritime Boundaries Geodatabase (CC BY 4.0, Flanders Marine Institute). None of those derived");
+  p("location fields (locality, region, country) is in these files: they hold the package's station");
+  p("names, positions, datums and harmonic constants only.");
   p();
   p("Tide predictions made from these constants are not for navigation.");
   fs.writeFileSync(path.join(out, "README.md"), lines.join("\n") + "\n");
