@@ -91,7 +91,8 @@ std::optional<FolderImage> BuildFolderImage(const std::vector<StationEntry>& sta
     } else {
       const double meanLevel = s.meanLevel.value_or(0.0);
       level.amplitude = AmplitudeField(std::fabs(meanLevel), clipped);
-      level.phase = meanLevel < 0.0 ? 1800 : 0;
+      // A level that rounds to nothing is stored as +0, never as 0 turned half round.
+      level.phase = meanLevel < 0.0 && level.amplitude > 0 ? 1800 : 0;
     }
     if (clipped) diagnostics.Warning(where + ": mean level does not fit in 65.535 m; clipped");
     records.push_back(level);

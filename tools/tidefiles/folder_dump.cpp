@@ -54,7 +54,9 @@ std::vector<StationEntry> DumpFolderImage(const FolderImage& image, Diagnostics&
         diagnostics.Error(where + ": constituent number " + std::to_string(c.number) + " is outside 0..68; left out");
         continue;
       }
-      if (k == 0 && c.number == 0 && (c.phase == 0 || c.phase == 1800)) {
+      // A plain level: phase 0, or half a turn round a non-zero amplitude (a level below
+      // chart datum). Anything else stays a constituent 0 record so it builds back the same.
+      if (k == 0 && c.number == 0 && (c.phase == 0 || (c.phase == 1800 && c.amplitude > 0))) {
         entry.meanLevel = (c.phase == 0 ? 1.0 : -1.0) * c.amplitude / 1000.0;
         continue;
       }

@@ -2,6 +2,7 @@
 #include <doctest/doctest.h>
 
 #include <algorithm>
+#include <cmath>
 #include <string>
 
 #include "tests/native/tidefiles/tidefiles_test_support.h"
@@ -176,12 +177,15 @@ TEST_CASE("build then dump gives the same JSON, and building that gives the same
     {"name": "South", "latitude": -33.86, "longitude": 151.21, "zone": -10, "mean_level": -0.05,
      "constituents": [{"name": "K1", "amplitude": 0.3, "phase": 359.99}]},
     {"name": "Odd level", "latitude": 3, "longitude": -3, "zone": 5,
-     "constituents": [{"name": "Z0", "amplitude": 0.5, "phase": 90}]}])";
+     "constituents": [{"name": "Z0", "amplitude": 0.5, "phase": 90}]},
+    {"name": "Tiny level", "latitude": 4, "longitude": -4, "zone": 0, "mean_level": -0.0004, "constituents": []},
+    {"name": "Zero turned", "latitude": 5, "longitude": -5, "zone": 0,
+     "constituents": [{"name": "Z0", "amplitude": 0, "phase": 180}]}])";
   const FolderImage first = BuildFromJson(json);
   Diagnostics dumpDiagnostics;
   const std::vector<StationEntry> dumped = DumpFolderImage(first, dumpDiagnostics);
   CHECK(dumpDiagnostics.All().empty());
-  REQUIRE(dumped.size() == 3);
+  REQUIRE(dumped.size() == 5);
   CHECK(dumped[0].name == "Ålesund");
   CHECK(dumped[0].tag == 513);
   CHECK(dumped[0].meanLevel == 1.2);
@@ -189,6 +193,9 @@ TEST_CASE("build then dump gives the same JSON, and building that gives the same
   CHECK_FALSE(dumped[2].meanLevel.has_value());  // a level with phase 90 stays a constituent
   REQUIRE(dumped[2].constituents.size() == 1);
   CHECK(dumped[2].constituents[0].row == 0);
+  CHECK(dumped[3].meanLevel == 0.0);  // -0.4 mm rounds to a level of +0, not -0
+  CHECK_FALSE(std::signbit(*dumped[3].meanLevel));
+  CHECK_FALSE(dumped[4].meanLevel.has_value());  // zero amplitude half a turn round: kept as given
   const std::string text = WriteStationsJson(dumped);
   CHECK(text.find("\"name\": \"MO3\"") != std::string::npos);  // 2MK3 stored in the MO3 row
   CHECK(text.find("\"number\": 28") != std::string::npos);     // MA2's row has no usual name
