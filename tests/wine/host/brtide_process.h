@@ -1,0 +1,24 @@
+// Runs the built brtide.exe as a child process and collects what it printed.
+#pragma once
+
+#include <string>
+#include <vector>
+
+namespace br::test {
+
+struct ProcessResult {
+  unsigned long exitCode = 0;
+  std::string out;  // standard output, bytes as written (UTF-8)
+  std::string err;  // standard error
+};
+
+// The brtide.exe of the build that holds the BR_Info.dll above the test program.
+std::wstring BuiltBrtidePath();
+
+// brtide with arguments (UTF-8; each is quoted for the command line).
+ProcessResult RunBrtide(const std::vector<std::string>& args);
+
+// Lines of text without their line ends.
+std::vector<std::string> TextLines(const std::string& text);
+
+}  // namespace br::test
