@@ -12,7 +12,8 @@ namespace toolkit {
 class TabContainer : public Container {
 public:
   static constexpr DWORD kOwnStyle = WS_CHILD | WS_VISIBLE;
-  static constexpr DWORD kStripStyle = 0x52020000;  // WS_CHILD|WS_VISIBLE|WS_CLIPSIBLINGS|WS_GROUP
+  // WS_CHILD|WS_VISIBLE|WS_CLIPCHILDREN|WS_GROUP; the tab control adds WS_CLIPSIBLINGS itself.
+  static constexpr DWORD kStripStyle = 0x52020000;
 
   TabContainer();
 

@@ -1,0 +1,81 @@
+#pragma once
+// Helpers for the widget suites: a visible host window, a message pump, a panel
+// that records what bubbles up to it, key and mouse messages, and pixels drawn
+// into a memory bitmap.
+
+#include <windows.h>
+
+#include <cstdint>
+#include <string>
+#include <vector>
+
+#include "toolkit/core/Container.h"
+#include "toolkit/core/cXComponent.h"
+
+namespace wtest {
+
+// A plain popup window at (100, 100) on the screen.
+class HostWindow {
+public:
+  explicit HostWindow(int width = 400, int height = 300);
+  ~HostWindow();
+  HWND hwnd() const { return hwnd_; }
+
+private:
+  HWND hwnd_ = nullptr;
+};
+
+void pump(int ms);
+
+struct Seen {
+  int id;
+  toolkit::cXComponent* source;
+  std::intptr_t params[7];
+};
+
+// A container that records every event reaching its dispatchEvent, and answers
+// them with `answer`.
+class RecordingPanel : public toolkit::Container {
+public:
+  RecordingPanel();
+  std::vector<Seen> seen;
+  int answer = 0;
+  int dispatchEvent(toolkit::ToolkitEvent& event) override;
+  int count(int id) const;
+  const Seen* last(int id) const;
+};
+
+// The panel made a window inside `host`, filling it.
+void mount(RecordingPanel& panel, HostWindow& host);
+
+// Shift and Ctrl as GetKeyState sees them on this thread.
+void setModifiers(bool shift, bool ctrl);
+
+// WM_KEYDOWN (and WM_CHAR for `ch` when given) sent to `hwnd`.
+void key(HWND hwnd, int virtualKey);
+void typeChar(HWND hwnd, char ch);
+void typeText(HWND hwnd, const char* text);
+void press(HWND hwnd, UINT message, int x, int y, WPARAM keys);
+
+// A 32-bit top-down DIB with a memory DC, filled with `fill` at first.
+class Canvas {
+public:
+  Canvas(int width, int height, COLORREF fill);
+  ~Canvas();
+  HDC dc() const { return dc_; }
+  COLORREF at(int x, int y) const;
+  int count(COLORREF colour) const;
+  int countIn(COLORREF colour, const RECT& area) const;
+
+private:
+  COLORREF raw(int x, int y) const;
+  HDC dc_ = nullptr;
+  HBITMAP bitmap_ = nullptr;
+  HGDIOBJ old_ = nullptr;
+  std::uint32_t* bits_ = nullptr;
+  int width_, height_;
+};
+
+std::string windowClass(HWND hwnd);
+
+}  // namespace wtest

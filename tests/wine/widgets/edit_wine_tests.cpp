@@ -1,0 +1,267 @@
+// cXEdit2 driven with real key, character and mouse messages.
+#include <doctest/doctest.h>
+
+#include "WidgetTestSupport.h"
+#include "toolkit/widgets/cXEdit2.h"
+
+using namespace toolkit;
+using namespace wtest;
+
+namespace {
+
+// A host, a recording panel and an edit 160 x 24 inside it.
+struct EditBench {
+  HostWindow host;
+  RecordingPanel panel;
+  cXEdit2 edit;
+  HWND h = nullptr;
+
+  explicit EditBench(int maxLength = 0, int width = 160) : edit(maxLength) {
+    mount(panel, host);
+    panel.add(&edit);
+    edit.setBounds(10, 10, width, 24, true, true);
+    h = edit.getHandle();
+    setModifiers(false, false);
+  }
+  ~EditBench() { setModifiers(false, false); }
+
+  int bubbled(int id) const { return panel.count(id); }
+};
+
+int charX(HWND h, const std::string& text, int index) {
+  HDC dc = GetDC(h);
+  HGDIOBJ old = SelectObject(dc, GetStockObject(DEFAULT_GUI_FONT));
+  SIZE extent{0, 0};
+  if (index > 0) GetTextExtentPoint32A(dc, text.c_str(), index, &extent);
+  SelectObject(dc, old);
+  ReleaseDC(h, dc);
+  return cXEdit2::kMargin + extent.cx;
+}
+
+}  // namespace
+
+TEST_CASE("latitude edit: -12.5 shows 12\xB0" "30.000'S and n at the hemisphere makes it N") {
+  EditBench b;
+  REQUIRE(b.edit.setEditType(kEditLatitude));
+  REQUIRE(b.edit.setValue(-12.5));
+  CHECK(b.edit.getText() == "12\xB0" "30.000'S");
+  key(b.h, VK_END);
+  CHECK(b.edit.getCaret() == 10);
+  typeChar(b.h, 'n');
+  CHECK(b.edit.getText() == "12\xB0" "30.000'N");
+  CHECK(b.edit.getValue() == doctest::Approx(12.5));
+  CHECK(b.bubbled(kEventChar) == 0);  // taken
+  typeChar(b.h, 'x');
+  CHECK(b.bubbled(kEventChar) == 1);  // refused: goes on to the parent
+  CHECK(b.bubbled(kEventKeyDown) == 0);
+
+  // Digits, with the caret skipping the degree sign; Backspace resets a digit.
+  key(b.h, VK_HOME);
+  typeText(b.h, "0456");
+  CHECK(b.edit.getText() == "04\xB0" "56.000'N");
+  key(b.h, VK_LEFT);
+  key(b.h, VK_BACK);
+  CHECK(b.edit.getText() == "04\xB0" "50.000'N");
+  key(b.h, VK_DELETE);
+  CHECK(b.edit.getText() == "04\xB0" "50.000'N");  // the caret did not move: still the same digit, now 0
+  CHECK(b.edit.getCaret() == 4);
+}
+
+TEST_CASE("longitude edit: three degree digits and the E/W letter") {
+  EditBench b;
+  REQUIRE(b.edit.setEditType(kEditLongitude));
+  REQUIRE(b.edit.setValue(-4.0875));
+  CHECK(b.edit.getText() == "004\xB0" "05.250'W");
+  typeText(b.h, "17");
+  key(b.h, VK_END);
+  typeChar(b.h, 'N');  // not a longitude letter
+  typeChar(b.h, 'e');
+  CHECK(b.edit.getText() == "174\xB0" "05.250'E");
+  key(b.h, VK_HOME);
+  key(b.h, VK_DELETE);
+  CHECK(b.edit.getText() == "074\xB0" "05.250'E");
+  CHECK(b.edit.getValue() == doctest::Approx(74.0875));
+}
+
+TEST_CASE("decimal edit: a second '.' is refused") {
+  EditBench b;
+  REQUIRE(b.edit.setEditType(kEditDecimal));
+  CHECK(b.edit.getText() == "0.0");
+  typeText(b.h, "2");
+  CHECK(b.edit.getText() == "2.0");
+  key(b.h, VK_END);
+  typeChar(b.h, '.');
+  CHECK(b.edit.getText() == "2.0");
+  CHECK(b.bubbled(kEventChar) == 1);
+  typeText(b.h, "55");
+  CHECK(b.edit.getText() == "2.055");
+  key(b.h, VK_BACK);
+  CHECK(b.edit.getText() == "2.05");
+  key(b.h, VK_HOME);
+  key(b.h, VK_DELETE);
+  CHECK(b.edit.getText() == ".05");
+  REQUIRE(b.edit.setValue(3.14159));
+  CHECK(b.edit.getText() == "3.1416");
+}
+
+TEST_CASE("integer edit: digits, Backspace, Delete") {
+  EditBench b(6);
+  REQUIRE(b.edit.setEditType(kEditInteger));
+  CHECK(b.edit.getText() == "0");
+  typeText(b.h, "1234567");
+  CHECK(b.edit.getText() == "123456");  // the limit
+  typeChar(b.h, '-');
+  CHECK(b.edit.getNumber() == 123456);
+  key(b.h, VK_BACK);
+  key(b.h, VK_HOME);
+  key(b.h, VK_DELETE);
+  CHECK(b.edit.getText() == "2345");
+  CHECK(b.edit.setNumber(-77));
+  CHECK(b.edit.getNumber() == -77);
+}
+
+TEST_CASE("free text edit: insert, overwrite, selection, cut and paste keys") {
+  EditBench b;
+  b.edit.setText("hello");
+  key(b.h, VK_END);
+  typeText(b.h, " you");
+  CHECK(b.edit.getText() == "hello you");
+  typeChar(b.h, '\t');  // control characters are not text
+  CHECK(b.bubbled(kEventChar) == 1);
+  key(b.h, VK_INSERT);
+  CHECK(b.edit.getOverwrite());
+  key(b.h, VK_HOME);
+  typeText(b.h, "J");
+  CHECK(b.edit.getText() == "Jello you");
+  key(b.h, VK_INSERT);
+
+  setModifiers(true, false);
+  key(b.h, VK_END);  // Shift+End: select to the end
+  setModifiers(false, false);
+  CHECK(b.edit.getCaret() == 9);
+  CHECK(b.edit.getSelectionLength() == -8);
+  typeChar(b.h, '!');
+  CHECK(b.edit.getText() == "J!");
+
+  setModifiers(false, true);
+  key(b.h, 'A');
+  typeChar(b.h, 0x01);  // the character Ctrl+A makes is consumed as well
+  CHECK(b.bubbled(kEventChar) == 1);
+  CHECK(b.edit.getSelectionLength() == -2);
+  setModifiers(false, false);
+  key(b.h, VK_BACK);
+  CHECK(b.edit.getText().empty());
+  CHECK(b.bubbled(kEventKeyDown) == 0);
+
+  key(b.h, VK_RETURN);
+  key(b.h, VK_UP);
+  CHECK(b.bubbled(kEventKeyDown) == 2);  // keys that are not the edit's go on
+}
+
+TEST_CASE("masked text edit: digits over the mask, reset by Backspace and Delete") {
+  EditBench b;
+  REQUIRE(b.edit.setEditType(kEditText, "-99:99"));
+  CHECK(b.edit.getText() == " 00:00");
+  typeText(b.h, "-1234");
+  CHECK(b.edit.getText() == "-12:34");
+  key(b.h, VK_BACK);
+  CHECK(b.edit.getText() == "-12:30");
+  key(b.h, VK_HOME);
+  key(b.h, VK_DELETE);
+  CHECK(b.edit.getText() == " 12:30");
+  key(b.h, VK_INSERT);
+  CHECK(b.edit.getOverwrite());  // masked text stays in overwrite
+}
+
+TEST_CASE("month edit: starts today, digits over digits, no paste") {
+  EditBench b;
+  REQUIRE(b.edit.setEditType(kEditMonth));
+  SYSTEMTIME now{};
+  GetLocalTime(&now);
+  char expected[32] = {};
+  GetDateFormatA(LOCALE_SYSTEM_DEFAULT, 0, &now, "MM-yyyy", expected, static_cast<int>(sizeof(expected)));
+  CHECK(b.edit.getText() == expected);
+  CHECK(b.edit.getNoPaste());
+
+  REQUIRE(b.edit.setValue(45427.0));  // 2024-05-15
+  CHECK(b.edit.getText() == "05-2024");
+  typeText(b.h, "111999");
+  CHECK(b.edit.getText() == "11-1999");
+  key(b.h, VK_BACK);
+  key(b.h, VK_DELETE);
+  CHECK(b.edit.getText() == "11-1999");
+  CHECK(b.edit.getValue() == doctest::Approx(36479.0));  // 1999-11-15
+
+  REQUIRE(b.edit.setEditType(kEditMonth, "dd.MM.yyyy"));
+  REQUIRE(b.edit.setValue(45427.0));
+  CHECK(b.edit.getText() == "15.05.2024");
+  CHECK_FALSE(b.edit.setEditType(5));
+  CHECK(b.edit.getEditType() == kEditMonth);
+}
+
+TEST_CASE("keys are the edit's only while its window is visible") {
+  EditBench b;
+  b.edit.setText("abc");
+  b.edit.show(false);
+  key(b.h, VK_BACK);
+  typeChar(b.h, 'x');
+  CHECK(b.edit.getText() == "abc");
+  CHECK(b.bubbled(kEventKeyDown) == 1);
+  CHECK(b.bubbled(kEventChar) == 1);
+}
+
+TEST_CASE("a click places the caret; a drag selects in free text only") {
+  EditBench b;
+  const std::string text = "abcdefgh";
+  b.edit.setText(text);
+  const int x3 = charX(b.h, text, 3), x6 = charX(b.h, text, 6);
+  press(b.h, WM_LBUTTONDOWN, x3, 10, MK_LBUTTON);
+  CHECK(b.edit.getCaret() == 3);
+  CHECK(GetCapture() == b.h);
+  press(b.h, WM_MOUSEMOVE, x6 + 1, 10, MK_LBUTTON);
+  CHECK(b.edit.getCaret() == 6);
+  CHECK(b.edit.getSelectionLength() == -3);
+  press(b.h, WM_LBUTTONUP, x6 + 1, 10, 0);
+  CHECK(GetCapture() == nullptr);
+  press(b.h, WM_LBUTTONDOWN, 150, 10, MK_LBUTTON);  // beyond the text
+  press(b.h, WM_LBUTTONUP, 150, 10, 0);
+  CHECK(b.edit.getCaret() == 8);
+  CHECK(b.edit.getSelectionLength() == 0);
+
+  REQUIRE(b.edit.setEditType(kEditLatitude));
+  REQUIRE(b.edit.setValue(1.0));
+  const std::string coord = b.edit.getText();
+  press(b.h, WM_LBUTTONDOWN, charX(b.h, coord, 2) + 1, 10, MK_LBUTTON);  // on the degree sign
+  CHECK((b.edit.getCaret() == 1 || b.edit.getCaret() == 3));
+  CHECK(GetCapture() != b.h);  // no drag selection in coordinates
+  press(b.h, WM_MOUSEMOVE, charX(b.h, coord, 8), 10, MK_LBUTTON);
+  CHECK(b.edit.getSelectionLength() == 0);
+}
+
+TEST_CASE("painting: one off-screen copy covers the client area; selection colours") {
+  EditBench b;
+  b.edit.setColor(COLOR_WINDOW, RGB(5, 6, 7));
+  b.edit.setColor(COLOR_HIGHLIGHT, RGB(0, 0, 160));
+  b.edit.setColor(COLOR_WINDOWTEXT, RGB(170, 0, 0));
+  b.edit.setText("WWWWWW");
+  b.edit.setCaret(0, 3);
+  Canvas canvas(160, 24, RGB(255, 0, 255));
+  b.edit.paint(canvas.dc());
+  CHECK(canvas.count(RGB(255, 0, 255)) == 0);
+  CHECK(canvas.at(159, 0) == RGB(5, 6, 7));
+  const int x3 = charX(b.h, "WWWWWW", 3), x6 = charX(b.h, "WWWWWW", 6);
+  CHECK(canvas.countIn(RGB(0, 0, 160), RECT{cXEdit2::kMargin, 0, x3, 24}) > 0);
+  CHECK(canvas.countIn(RGB(0, 0, 160), RECT{x3, 0, 160, 24}) == 0);
+  CHECK(canvas.countIn(RGB(170, 0, 0), RECT{x3, 0, x6, 24}) > 0);
+  CHECK(canvas.countIn(RGB(170, 0, 0), RECT{0, 0, x3, 24}) == 0);
+}
+
+TEST_CASE("a long text scrolls to keep the caret in view") {
+  EditBench b(0, 40);
+  b.edit.setText("a long line of text that is much wider than forty pixels");
+  CHECK(b.edit.getScrollOffset() == 0);
+  key(b.h, VK_END);
+  CHECK(b.edit.getScrollOffset() > 0);
+  key(b.h, VK_HOME);
+  CHECK(b.edit.getScrollOffset() == 0);
+}
