@@ -94,6 +94,9 @@ int Container::insertRow(int before, const char* position, cXComponent* componen
   component->setParent(this);
   HWND parentWindow = windowForChildren();
   if (parentWindow && !component->isValid()) component->create(parentWindow);
+  // A child without a font of its own takes the container's.
+  HFONT font = getFont();
+  if (font && !component->getFont()) component->lendFont(font);
   return row;
 }
 

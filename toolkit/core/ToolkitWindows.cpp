@@ -30,6 +30,12 @@ std::set<int>& registeredKinds() {
 
 thread_local cXComponent* t_creating = nullptr;
 
+WNDPROC g_defaultProcedure = &DefWindowProcA;
+
+LRESULT defaultProc(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam) {
+  return g_defaultProcedure(hwnd, message, wParam, lParam);
+}
+
 Entry* find(HWND hwnd) {
   auto it = table().find(hwnd);
   return it == table().end() ? nullptr : &it->second;
@@ -118,6 +124,12 @@ WNDPROC ToolkitWindows::previousProcOf(HWND hwnd) {
 
 size_t ToolkitWindows::windowCount() { return table().size(); }
 
+WNDPROC ToolkitWindows::setDefaultProcedure(WNDPROC procedure) {
+  WNDPROC previous = g_defaultProcedure;
+  g_defaultProcedure = procedure ? procedure : &DefWindowProcA;
+  return previous;
+}
+
 ToolkitWindows::Creating::Creating(cXComponent* component) : previous_(t_creating) {
   t_creating = component;
 }
@@ -129,7 +141,7 @@ LRESULT CALLBACK ToolkitWindows::windowProc(HWND hwnd, UINT message, WPARAM wPar
   if (!entry) {
     // A window of the toolkit's class being made right now: enter it at its
     // first message so that WM_CREATE becomes an event too.
-    if (!t_creating) return DefWindowProcA(hwnd, message, wParam, lParam);
+    if (!t_creating) return defaultProc(hwnd, message, wParam, lParam);
     cXComponent* component = t_creating;
     t_creating = nullptr;
     enter(hwnd, component, nullptr);
@@ -144,18 +156,18 @@ LRESULT CALLBACK ToolkitWindows::windowProc(HWND hwnd, UINT message, WPARAM wPar
     if (ComponentPeer* peer = gone.component->peer()) peer->windowGone(hwnd);
     // A native control frees its own data on WM_NCDESTROY, so it must see it.
     if (gone.previous) return CallWindowProcA(gone.previous, hwnd, message, wParam, lParam);
-    return DefWindowProcA(hwnd, message, wParam, lParam);
+    return defaultProc(hwnd, message, wParam, lParam);
   }
 
   ComponentPeer* peer = entry->component->peer();
-  if (!peer) return DefWindowProcA(hwnd, message, wParam, lParam);
+  if (!peer) return defaultProc(hwnd, message, wParam, lParam);
   LRESULT result = 0;
   const bool consumed = peer->handleMessage(hwnd, message, wParam, lParam, result);
   if (message == WM_GETFONT && consumed) return result;
 
   // Handlers may have destroyed the window, or the component with it.
   entry = find(hwnd);
-  if (!entry) return IsWindow(hwnd) ? DefWindowProcA(hwnd, message, wParam, lParam) : 0;
+  if (!entry) return IsWindow(hwnd) ? defaultProc(hwnd, message, wParam, lParam) : 0;
   const WNDPROC previous = entry->previous;
 
   if (consumed) {
@@ -177,11 +189,11 @@ LRESULT CALLBACK ToolkitWindows::windowProc(HWND hwnd, UINT message, WPARAM wPar
       default:
         break;
     }
-    return DefWindowProcA(hwnd, message, wParam, lParam);
+    return defaultProc(hwnd, message, wParam, lParam);
   }
   if (previous && previous != &ToolkitWindows::windowProc)
     return CallWindowProcA(previous, hwnd, message, wParam, lParam);
-  return DefWindowProcA(hwnd, message, wParam, lParam);
+  return defaultProc(hwnd, message, wParam, lParam);
 }
 
 }  // namespace toolkit

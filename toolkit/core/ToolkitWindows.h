@@ -33,6 +33,11 @@ public:
   static WNDPROC previousProcOf(HWND hwnd);
   static size_t windowCount();
 
+  // The default processing for messages that no native procedure takes
+  // (DefWindowProcA unless replaced, e.g. to watch what reaches it). Answers the
+  // previous one; null restores DefWindowProcA.
+  static WNDPROC setDefaultProcedure(WNDPROC procedure);
+
   // The component whose window CreateWindowEx is making on this thread, so that
   // the window's first messages (WM_NCCREATE, WM_CREATE) already reach it.
   class Creating {

@@ -1,0 +1,150 @@
+#include "ToolkitTestSupport.h"
+
+#include <cstdio>
+
+#include "toolkit/base/ClassRecords.h"
+#include "toolkit/layout/BorderLayout.h"
+
+namespace tktest {
+
+using namespace toolkit;
+
+namespace {
+
+LRESULT CALLBACK hostProc(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam) {
+  return DefWindowProcA(hwnd, message, wParam, lParam);
+}
+
+LRESULT CALLBACK nativeProc(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam) {
+  nativeCalls().push_back(NativeCall{hwnd, message, wParam});
+  return DefWindowProcA(hwnd, message, wParam, lParam);
+}
+
+void registerOnce(const char* name, WNDPROC proc) {
+  WNDCLASSEXA info{};
+  info.cbSize = sizeof(info);
+  if (GetClassInfoExA(GetModuleHandleA(nullptr), name, &info)) return;
+  WNDCLASSEXA wc{};
+  wc.cbSize = sizeof(wc);
+  wc.lpfnWndProc = proc;
+  wc.hInstance = GetModuleHandleA(nullptr);
+  wc.hCursor = LoadCursor(nullptr, IDC_ARROW);
+  wc.lpszClassName = name;
+  RegisterClassExA(&wc);
+}
+
+Seen record(const ToolkitEvent& e) {
+  Seen s{e.id, e.source, e.hwnd, {}, e.keyState};
+  for (int i = 0; i < 7; ++i) s.params[i] = e.params[i];
+  return s;
+}
+
+}  // namespace
+
+HostWindow::HostWindow(int width, int height) {
+  registerOnce("ToolkitTestHost", hostProc);
+  hwnd_ = CreateWindowExA(0, "ToolkitTestHost", "host", WS_POPUP | WS_VISIBLE | WS_CLIPCHILDREN, 100, 100,
+                          width, height, nullptr, nullptr, GetModuleHandleA(nullptr), nullptr);
+}
+
+HostWindow::~HostWindow() {
+  if (hwnd_ && IsWindow(hwnd_)) DestroyWindow(hwnd_);
+}
+
+void pump(int ms) {
+  const DWORD end = GetTickCount() + static_cast<DWORD>(ms);
+  do {
+    MSG msg;
+    while (PeekMessageA(&msg, nullptr, 0, 0, PM_REMOVE)) {
+      TranslateMessage(&msg);
+      DispatchMessageA(&msg);
+    }
+    Sleep(1);
+  } while (static_cast<int>(end - GetTickCount()) > 0);
+}
+
+RECT placed(HWND hwnd) {
+  RECT r{};
+  if (!hwnd) return r;
+  GetWindowRect(hwnd, &r);
+  MapWindowPoints(nullptr, GetParent(hwnd), reinterpret_cast<POINT*>(&r), 2);
+  return r;
+}
+
+RECT placed(const cXComponent& component) { return placed(component.getHandle()); }
+
+RECT xywh(int x, int y, int w, int h) { return RECT{x, y, x + w, y + h}; }
+
+std::string str(const RECT& r) {
+  char buffer[96];
+  std::snprintf(buffer, sizeof(buffer), "(%ld,%ld %ldx%ld)", static_cast<long>(r.left),
+                static_cast<long>(r.top), static_cast<long>(r.right - r.left),
+                static_cast<long>(r.bottom - r.top));
+  return buffer;
+}
+
+Probe::~Probe() {
+  if (deletions) ++*deletions;
+}
+
+int Probe::dispatchEvent(ToolkitEvent& event) {
+  seen.push_back(record(event));
+  return cXComponent::dispatchEvent(event);
+}
+
+int Probe::react(ToolkitEvent& event) {
+  if (markHandled) event.handled = true;
+  return answer;
+}
+
+int Probe::onKeyDown(ToolkitEvent& event, int) {
+  if (deleteSelfOnKey) {
+    // Something still queued behind this event must be dropped, not dispatched.
+    peer()->queue(std::make_unique<ToolkitEvent>(this, 61, event.hwnd));
+    delete this;
+    return 1;
+  }
+  return react(event);
+}
+
+std::vector<int> Probe::ids() const {
+  std::vector<int> out;
+  for (const Seen& s : seen) out.push_back(s.id);
+  return out;
+}
+
+const Seen* Probe::last(int id) const {
+  for (auto it = seen.rbegin(); it != seen.rend(); ++it) {
+    if (it->id == id) return &*it;
+  }
+  return nullptr;
+}
+
+ProbePanel::ProbePanel(std::unique_ptr<Layout> layout) {
+  setLayout(layout ? std::move(layout) : std::make_unique<BorderLayout>());
+}
+
+int ProbePanel::dispatchEvent(ToolkitEvent& event) {
+  seen.push_back(record(event));
+  return Container::dispatchEvent(event);
+}
+
+const ClassRecord* FakeChoice::getClassRecord() const { return &records::Choice; }
+
+const char* nativeClassName() {
+  registerOnce("ToolkitTestNative", nativeProc);
+  return "ToolkitTestNative";
+}
+
+std::vector<NativeCall>& nativeCalls() {
+  static std::vector<NativeCall> calls;
+  return calls;
+}
+
+int nativeCount(UINT message) {
+  int n = 0;
+  for (const NativeCall& c : nativeCalls()) n += c.message == message;
+  return n;
+}
+
+}  // namespace tktest

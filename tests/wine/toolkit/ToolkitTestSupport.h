@@ -1,0 +1,105 @@
+#pragma once
+// Helpers for the toolkit suites: a visible top-level host window, a message
+// pump, components that record what reaches them, and window rectangles read
+// back in parent coordinates.
+
+#include <windows.h>
+
+#include <string>
+#include <vector>
+
+#include "toolkit/core/Container.h"
+#include "toolkit/core/cXComponent.h"
+
+namespace tktest {
+
+// A plain popup window at (100, 100) on the screen, the parent of the trees under test.
+class HostWindow {
+public:
+  explicit HostWindow(int width = 400, int height = 300);
+  ~HostWindow();
+  HWND hwnd() const { return hwnd_; }
+
+private:
+  HWND hwnd_ = nullptr;
+};
+
+// Handles pending messages for about `ms` milliseconds.
+void pump(int ms);
+
+// The window's rectangle in its parent's client coordinates.
+RECT placed(HWND hwnd);
+RECT placed(const toolkit::cXComponent& component);
+RECT xywh(int x, int y, int w, int h);
+std::string str(const RECT& r);
+
+struct Seen {
+  int id;
+  toolkit::cXComponent* source;
+  HWND hwnd;
+  std::intptr_t params[7];
+  int keyState;
+};
+
+// A component that records every event dispatched to it and answers chosen
+// handlers with chosen values.
+class Probe : public toolkit::cXComponent {
+public:
+  SIZE pref{10, 10};
+  std::vector<Seen> seen;
+  int answer = 0;             // what the handlers below answer
+  bool markHandled = false;   // whether they mark the event handled
+  int destroyedCount = 0;
+  int* deletions = nullptr;   // counts destructor runs when set
+  bool deleteSelfOnKey = false;
+
+  ~Probe() override;
+  int dispatchEvent(toolkit::ToolkitEvent& event) override;
+  SIZE getPreferredSize() override { return pref; }
+  SIZE getPreferredSizeIn(const RECT&) override { return pref; }
+  int onKeyDown(toolkit::ToolkitEvent& event, int key) override;
+  int onChar(toolkit::ToolkitEvent& event, int ch) override { return react(event); }
+  int onMouseDown(toolkit::ToolkitEvent& event, int, int) override { return react(event); }
+  int onAction(toolkit::ToolkitEvent& event) override { return react(event); }
+  int onNotify(toolkit::ToolkitEvent& event) override { return react(event); }
+
+  std::vector<int> ids() const;
+  const Seen* last(int id) const;
+
+private:
+  int react(toolkit::ToolkitEvent& event);
+};
+
+// A container that records what bubbles up to it.
+class ProbePanel : public toolkit::Container {
+public:
+  explicit ProbePanel(std::unique_ptr<toolkit::Layout> layout = nullptr);
+  std::vector<Seen> seen;
+  int answer = 0;
+  int dispatchEvent(toolkit::ToolkitEvent& event) override;
+  int onAction(toolkit::ToolkitEvent&) override { return answer; }
+  int onKeyDown(toolkit::ToolkitEvent&, int) override { return answer; }
+};
+
+// Stands in for the drop-down list widget: a Choice by its record, whose own
+// height (that of the opened list) is `listHeight`.
+class FakeChoice : public toolkit::cXComponent {
+public:
+  int listHeight = 150;
+  const toolkit::ClassRecord* getClassRecord() const override;
+  SIZE getPreferredSize() override { return SIZE{60, 22}; }
+  SIZE getPreferredSizeIn(const RECT&) override { return SIZE{60, listHeight}; }
+};
+
+// A window class whose procedure records the messages it receives: stands for a
+// native control's own procedure.
+const char* nativeClassName();
+struct NativeCall {
+  HWND hwnd;
+  UINT message;
+  WPARAM wParam;
+};
+std::vector<NativeCall>& nativeCalls();
+int nativeCount(UINT message);
+
+}  // namespace tktest

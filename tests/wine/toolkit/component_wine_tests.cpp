@@ -1,0 +1,289 @@
+// cXComponent under Wine: without and with a window, the window class, bounds
+// setters, text, colours, fonts and the shared palette.
+#include <doctest/doctest.h>
+
+#include "ToolkitTestSupport.h"
+#include "frame/errors/cErr.h"
+#include "toolkit/base/ClassRecords.h"
+#include "toolkit/core/Palette.h"
+#include "toolkit/core/ToolkitError.h"
+#include "toolkit/core/ToolkitWindows.h"
+
+using namespace toolkit;
+using namespace tktest;
+
+TEST_CASE("a component without a window answers the empty values and keeps only its text") {
+  cXComponent c;
+  CHECK(c.getClassRecord() == &records::cXComponent);
+  CHECK_FALSE(c.isValid());
+  CHECK(c.getHandle() == nullptr);
+  CHECK_FALSE(c.isVisible());
+  CHECK_FALSE(c.isEnabled());
+  POINT at = c.getLocation();
+  CHECK(at.x == -1);
+  CHECK(at.y == -1);
+  SIZE size = c.getSize();
+  CHECK(size.cx == 0);
+  CHECK(size.cy == 0);
+  RECT r = c.getWindowRect();
+  CHECK(r.right - r.left == 0);
+
+  c.setBounds(5, 6, 70, 80, true, true);
+  c.moveTo(1, 2, 3, 4, true);
+  c.setSize(50, 50, true);
+  c.setLocation(9, 9);
+  CHECK(c.bounds().right == 0);
+  CHECK(c.bounds().bottom == 0);
+
+  c.setText("Depth");
+  CHECK(c.storedText() == "Depth");
+  CHECK(c.getText() == "Depth");
+  CHECK(c.getStyle() == 0);
+  CHECK_FALSE(c.modifyStyle(0, WS_BORDER, 0));
+  CHECK_FALSE(c.postEvent(std::make_unique<ToolkitEvent>(&c, kEventAction, nullptr)));
+  CHECK(c.fireAction() == 0);  // no parent
+  SIZE pref = c.getPreferredSize();
+  CHECK(pref.cx == 10);
+  CHECK(pref.cy == 10);
+  c.invalidate();
+  c.repaintAll();
+  c.destroyWindow();
+}
+
+TEST_CASE("create under something that is not a window throws the toolkit error") {
+  cXComponent c;
+  bool thrown = false;
+  try {
+    c.create(reinterpret_cast<HWND>(static_cast<INT_PTR>(0x7654)));
+  } catch (const cErr& e) {
+    thrown = true;
+    CHECK(e.code() == kErrorBadParentWindow);
+  }
+  CHECK(thrown);
+  CHECK_THROWS_AS(c.create(nullptr), cErr);
+  CHECK_FALSE(c.isValid());
+}
+
+TEST_CASE("create makes a child window of the toolkit class with the component style") {
+  HostWindow host;
+  cXComponent c;
+  c.setText("Tide");
+  REQUIRE(c.create(host.hwnd()));
+  HWND h = c.getHandle();
+  REQUIRE(h != nullptr);
+  char name[64] = {};
+  GetClassNameA(h, name, sizeof(name));
+  CHECK(std::string(name) == "Brine_AWTATL1");
+  CHECK(GetParent(h) == host.hwnd());
+  CHECK(static_cast<DWORD>(c.getStyle()) == cXComponent::kDefaultStyle);
+  CHECK(c.getText() == "Tide");  // a text set before the window exists is applied
+
+  WNDCLASSEXA info{};
+  info.cbSize = sizeof(info);
+  REQUIRE(GetClassInfoExA(ToolkitWindows::moduleInstance(), "Brine_AWTATL1", &info));
+  const bool toolkitProc = info.lpfnWndProc == &ToolkitWindows::windowProc;
+  CHECK(toolkitProc);
+  CHECK((info.style & (CS_HREDRAW | CS_VREDRAW | CS_DBLCLKS)) == (CS_HREDRAW | CS_VREDRAW | CS_DBLCLKS));
+  CHECK(ToolkitWindows::componentOf(h) == &c);
+
+  // A second create leaves the window as it is.
+  CHECK(c.create(host.hwnd()));
+  CHECK(c.getHandle() == h);
+
+  c.setText("Height");
+  char text[32] = {};
+  GetWindowTextA(h, text, sizeof(text));
+  CHECK(std::string(text) == "Height");
+  c.setTextNumber(-42);
+  CHECK(c.getText() == "-42");
+
+  c.destroyWindow();
+  CHECK_FALSE(c.isValid());
+  CHECK(ToolkitWindows::componentOf(h) == nullptr);
+  CHECK(c.peer()->hwnd() == nullptr);
+}
+
+TEST_CASE("bounds setters move the window and keep the bounds field") {
+  HostWindow host;
+  cXComponent c;
+  REQUIRE(c.create(host.hwnd()));
+
+  c.setBounds(10, 20, 100, 50, false, true);
+  CHECK(str(placed(c)) == str(xywh(10, 20, 100, 50)));
+  CHECK(str(c.bounds()) == str(xywh(10, 20, 100, 50)));
+  POINT at = c.getLocation();  // screen coordinates: the host is at (100, 100)
+  CHECK(at.x == 110);
+  CHECK(at.y == 120);
+  CHECK(c.contains(150, 130));
+  CHECK_FALSE(c.contains(50, 50));
+
+  c.moveTo(5, 6, 30, 40, true);
+  CHECK(str(placed(c)) == str(xywh(5, 6, 30, 40)));
+  c.setLocation(50, 60);
+  CHECK(str(placed(c)) == str(xywh(50, 60, 30, 40)));
+  c.setSize(70, 80, true);
+  CHECK(str(placed(c)) == str(xywh(50, 60, 70, 80)));
+  SIZE size = c.getSize();
+  CHECK(size.cx == 70);
+  CHECK(size.cy == 80);
+
+  // setLocation leaves a window of zero size alone.
+  c.moveTo(1, 1, 0, 10, true);
+  c.setLocation(40, 40);
+  CHECK(str(placed(c)) == str(xywh(1, 1, 0, 10)));
+
+  // deferBounds with no batch moves at once.
+  HDWP none = nullptr;
+  c.deferBounds(none, 12, 14, 16, 18);
+  CHECK(str(placed(c)) == str(xywh(12, 14, 16, 18)));
+  CHECK(str(c.bounds()) == str(xywh(12, 14, 16, 18)));
+  HDWP batch = BeginDeferWindowPos(1);
+  c.deferBounds(batch, 22, 24, 26, 28);
+  CHECK(batch != nullptr);
+  EndDeferWindowPos(batch);
+  CHECK(str(placed(c)) == str(xywh(22, 24, 26, 28)));
+
+  c.show(false);
+  CHECK_FALSE(c.isVisible());
+  c.show(true);
+  CHECK(c.isVisible());
+  c.setEnabled(false);
+  CHECK_FALSE(c.isEnabled());
+  CHECK_FALSE(c.getEnabledFlag());
+  c.setEnabled(true);
+  CHECK(c.isEnabled());
+
+  CHECK(c.modifyStyle(0, WS_BORDER, SWP_FRAMECHANGED));
+  CHECK((c.getStyle() & WS_BORDER) != 0);
+  CHECK_FALSE(c.modifyStyle(0, WS_BORDER, 0));
+  CHECK(c.modifyExStyle(0, WS_EX_CLIENTEDGE, 0));
+  CHECK((c.getExStyle() & WS_EX_CLIENTEDGE) != 0);
+}
+
+TEST_CASE("setColor takes the nine system indices only") {
+  cXComponent c;
+  CHECK_FALSE(c.setColor(6, RGB(1, 2, 3)));
+  CHECK(c.colorOf(6) == GetSysColor(6));
+  for (int index : {5, 8, 13, 14, 15, 16, 17, 18, 20}) {
+    CHECK(c.setColor(index, RGB(index, 0, 1)));
+    CHECK(c.colorOf(index) == RGB(index, 0, 1));
+  }
+  for (int index : {-1, 0, 4, 7, 19, 21, 30}) CHECK_FALSE(c.setColor(index, 0));
+  cXComponent fresh;
+  CHECK(fresh.colorOf(COLOR_WINDOW) == GetSysColor(COLOR_WINDOW));
+}
+
+TEST_CASE("the palette: initial colours, whole replacement only, drawing by index") {
+  Palette::reset();
+  CHECK(Palette::colour(0) == 0x000000);
+  CHECK(Palette::colour(1) == 0x000080);
+  CHECK(Palette::colour(7) == 0xC0C0C0);
+  CHECK(Palette::colour(18) == 0xA4A0A0);
+  CHECK(Palette::colour(19) == 0xF0FBFF);
+  CHECK(Palette::colour(20) == 0);
+  CHECK(Palette::colour(-1) == 0);
+
+  COLORREF table[21];
+  for (int i = 0; i < 21; ++i) table[i] = RGB(i, 2 * i, 3 * i);
+  cXComponent c;
+  CHECK_FALSE(c.setPalette(table, 19));
+  CHECK_FALSE(c.setPalette(table, 21));
+  CHECK_FALSE(c.setPalette(nullptr, 20));
+  CHECK(Palette::colour(1) == 0x000080);
+  CHECK(c.setPalette(table, 20));
+  CHECK(Palette::colour(1) == RGB(1, 2, 3));
+  CHECK(Palette::colour(19) == RGB(19, 38, 57));
+
+  // Pixels drawn into a DIB section with the fill, brush and pen helpers.
+  BITMAPINFO bi{};
+  bi.bmiHeader.biSize = sizeof(bi.bmiHeader);
+  bi.bmiHeader.biWidth = 8;
+  bi.bmiHeader.biHeight = -8;
+  bi.bmiHeader.biPlanes = 1;
+  bi.bmiHeader.biBitCount = 32;
+  void* bits = nullptr;
+  HDC dc = CreateCompatibleDC(nullptr);
+  HBITMAP bmp = CreateDIBSection(dc, &bi, DIB_RGB_COLORS, &bits, nullptr, 0);
+  REQUIRE(bmp != nullptr);
+  HGDIOBJ old = SelectObject(dc, bmp);
+  auto pixel = [&](int x, int y) {
+    const DWORD v = static_cast<const DWORD*>(bits)[y * 8 + x];
+    return RGB((v >> 16) & 0xFF, (v >> 8) & 0xFF, v & 0xFF);
+  };
+  Palette::fill(dc, RECT{0, 0, 8, 8}, 5);
+  GdiFlush();
+  CHECK(pixel(3, 3) == RGB(5, 10, 15));
+  HBRUSH brush = Palette::makeBrush(9);
+  RECT top{0, 0, 8, 2};
+  FillRect(dc, &top, brush);
+  DeleteObject(brush);
+  HPEN pen = Palette::makePen(12);
+  HGDIOBJ oldPen = SelectObject(dc, pen);
+  MoveToEx(dc, 0, 6, nullptr);
+  LineTo(dc, 8, 6);
+  SelectObject(dc, oldPen);
+  DeleteObject(pen);
+  GdiFlush();
+  CHECK(pixel(4, 1) == RGB(9, 18, 27));
+  CHECK(pixel(4, 6) == RGB(12, 24, 36));
+  CHECK(pixel(4, 7) == RGB(5, 10, 15));  // a one-pixel pen
+  SelectObject(dc, old);
+  DeleteObject(bmp);
+  DeleteDC(dc);
+  Palette::reset();
+}
+
+TEST_CASE("fonts: own fonts are deleted by their component, lent fonts never") {
+  HostWindow host;
+  HFONT lent = CreateFontA(-12, 0, 0, 0, FW_NORMAL, 0, 0, 0, DEFAULT_CHARSET, 0, 0, 0, 0, "Arial");
+  REQUIRE(lent != nullptr);
+  HFONT own = nullptr;
+  {
+    cXComponent c;
+    REQUIRE(c.create(host.hwnd()));
+    CHECK(c.getFont() == nullptr);
+    REQUIRE(c.setFont("Arial", 10, true, false));
+    own = c.ownFont();
+    REQUIRE(own != nullptr);
+    CHECK(c.getFont() == own);
+    CHECK(reinterpret_cast<HFONT>(SendMessageA(c.getHandle(), WM_GETFONT, 0, 0)) == own);
+    LOGFONTA lf{};
+    GetObjectA(own, sizeof(lf), &lf);
+    CHECK(lf.lfWeight == FW_BOLD);
+    CHECK(lf.lfCharSet == DEFAULT_CHARSET);
+    CHECK(lf.lfHeight < 0);
+
+    c.lendFont(lent);
+    CHECK(c.getFont() == lent);
+    CHECK(c.ownFont() == own);
+    CHECK(reinterpret_cast<HFONT>(SendMessageA(c.getHandle(), WM_GETFONT, 0, 0)) == lent);
+
+    // A new own font replaces (and deletes) the old one and ends the loan.
+    REQUIRE(c.setFont("Courier New", 9, false, true));
+    CHECK(GetObjectType(own) == 0);
+    own = c.ownFont();
+    CHECK(c.getFont() == own);
+    CHECK(c.borrowedFont() == nullptr);
+    c.lendFont(lent);
+  }
+  CHECK(GetObjectType(own) == 0);         // the component's own font died with it
+  CHECK(GetObjectType(lent) == OBJ_FONT); // the lent one did not
+  DeleteObject(lent);
+}
+
+TEST_CASE("user values, state, insets and the base of the dialog slots") {
+  cXComponent c;
+  c.setUserValue1(3);
+  c.setUserValue2(-4);
+  c.setUserId(77);
+  c.setState(2);
+  CHECK(c.getUserValue1() == 3);
+  CHECK(c.getUserValue2() == -4);
+  CHECK(c.getUserId() == 77);
+  CHECK(c.getState() == 2);
+  c.setInsets(1, 2, 3, 4);
+  CHECK(str(c.insets()) == str(RECT{1, 2, 3, 4}));
+  std::string result = "kept";
+  CHECK(c.inputBox("Name?", result, 1) == -1);
+  CHECK(result == "kept");
+}

@@ -1,0 +1,392 @@
+// Messages to events, dispatch, bubbling, "consumed", the native procedure of a
+// subclassed window, focus requests, posted and sent events.
+#include <doctest/doctest.h>
+
+#include <algorithm>
+
+#include "ToolkitTestSupport.h"
+#include "toolkit/core/Panel.h"
+#include "toolkit/core/ToolkitWindows.h"
+
+using namespace toolkit;
+using namespace tktest;
+
+namespace {
+
+// Watches what reaches the default processing.
+std::vector<NativeCall> g_defaultCalls;
+LRESULT CALLBACK watchingDefault(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam) {
+  g_defaultCalls.push_back(NativeCall{hwnd, message, wParam});
+  return DefWindowProcA(hwnd, message, wParam, lParam);
+}
+
+struct DefaultWatch {
+  DefaultWatch() {
+    g_defaultCalls.clear();
+    previous = ToolkitWindows::setDefaultProcedure(&watchingDefault);
+  }
+  ~DefaultWatch() { ToolkitWindows::setDefaultProcedure(previous); }
+  const NativeCall* lastOf(UINT message) const {
+    for (auto it = g_defaultCalls.rbegin(); it != g_defaultCalls.rend(); ++it)
+      if (it->message == message) return &*it;
+    return nullptr;
+  }
+  WNDPROC previous;
+};
+
+// A probe whose window is the test's "native control", subclassed by the toolkit.
+void createNative(Probe& probe, HWND parent) {
+  REQUIRE(probe.createWindow(0, nativeClassName(), "", WS_CHILD | WS_VISIBLE, 0, 0, 50, 20, parent, 0));
+}
+
+// A parameter of the last event of that id, or a marker when there was none.
+std::intptr_t param(const Probe& p, int id, int i) {
+  const Seen* s = p.last(id);
+  return s ? s->params[i] : -999999;
+}
+
+}  // namespace
+
+TEST_CASE("every message of the table becomes its event with its parameters") {
+  HostWindow host;
+  Probe p;
+  REQUIRE(p.create(host.hwnd()));
+  HWND h = p.getHandle();
+  auto send = [&](UINT m, WPARAM w, LPARAM l) {
+    p.seen.clear();
+    return SendMessageA(h, m, w, l);
+  };
+
+  send(WM_COMMAND, MAKEWPARAM(1001, 5), 0x1234);
+  REQUIRE(p.last(kEventCommand));
+  CHECK(param(p, kEventCommand, 0) == 5);
+  CHECK(param(p, kEventCommand, 1) == 1001);
+  CHECK(param(p, kEventCommand, 2) == 0x1234);
+  CHECK(p.last(kEventCommand)->source == &p);
+  CHECK(p.last(kEventCommand)->hwnd == h);
+
+  NMHDR nm{h, 7, 0};
+  send(WM_NOTIFY, 7, reinterpret_cast<LPARAM>(&nm));
+  REQUIRE(p.last(kEventNotify));
+  CHECK(param(p, kEventNotify, 0) == 1);
+  CHECK(param(p, kEventNotify, 1) == WM_NOTIFY);
+  CHECK(param(p, kEventNotify, 3) == reinterpret_cast<LPARAM>(&nm));  // a full-width pointer
+  send(WM_DRAWITEM, 0, 0);
+  CHECK(param(p, kEventNotify, 0) == 2);
+  send(WM_MEASUREITEM, 0, 0);
+  CHECK(param(p, kEventNotify, 0) == 3);
+
+  send(WM_KEYDOWN, VK_LEFT, 0x10001);
+  REQUIRE(p.last(kEventKeyDown));
+  CHECK(param(p, kEventKeyDown, 0) == VK_LEFT);
+  CHECK(param(p, kEventKeyDown, 1) == 0x10001);
+  send(WM_KEYUP, 'A', 0);
+  CHECK(param(p, kEventKeyUp, 0) == 'A');
+  send(WM_CHAR, 0x1B0, 0);  // one byte of the character
+  CHECK(param(p, kEventChar, 0) == 0xB0);
+
+  send(WM_RBUTTONDBLCLK, MK_RBUTTON, MAKELPARAM(7, 9));
+  REQUIRE(p.last(kEventMouseDown));
+  const Seen* down = p.last(kEventMouseDown);
+  CHECK(down->params[0] == 7);
+  CHECK(down->params[1] == 9);
+  CHECK(down->params[2] == 1);
+  CHECK(down->params[3] == MK_RBUTTON);
+  CHECK(down->params[4] == 1);
+  CHECK(down->keyState == MK_RBUTTON);
+  send(WM_LBUTTONDOWN, MK_LBUTTON, MAKELPARAM(3, 4));
+  CHECK(param(p, kEventMouseDown, 2) == 0);
+  CHECK(param(p, kEventMouseDown, 4) == 0);
+
+  send(WM_MOUSEMOVE, MK_LBUTTON, MAKELPARAM(11, 12));
+  CHECK(p.last(kEventMouseDrag));
+  CHECK_FALSE(p.last(kEventMouseMove));
+  send(WM_MOUSEMOVE, MK_SHIFT, MAKELPARAM(13, 14));
+  REQUIRE(p.last(kEventMouseMove));
+  CHECK(param(p, kEventMouseMove, 0) == 13);
+  CHECK(param(p, kEventMouseMove, 2) == MK_SHIFT);
+  CHECK_FALSE(p.last(kEventMouseDrag));
+  send(WM_RBUTTONUP, 0, MAKELPARAM(1, 2));
+  CHECK(param(p, kEventMouseUp, 2) == 1);
+  send(WM_MOUSEWHEEL, MAKEWPARAM(0, 120), MAKELPARAM(300, 200));
+  CHECK(param(p, kEventMouseWheel, 0) == 300);
+
+  send(WM_VSCROLL, MAKEWPARAM(SB_THUMBTRACK, 33), 0);
+  CHECK(param(p, kEventScrollThumb, 0) == 33);
+  CHECK(param(p, kEventScrollThumb, 1) == 0);
+  send(WM_HSCROLL, SB_LINEDOWN, 0);
+  CHECK(param(p, kEventScrollLineDown, 0) == 1);
+  send(WM_VSCROLL, SB_LINEUP, 0);
+  CHECK(p.last(kEventScrollLineUp));
+  send(WM_VSCROLL, SB_PAGEDOWN, 0);
+  CHECK(p.last(kEventScrollPageDown));
+  send(WM_VSCROLL, SB_PAGEUP, 0);
+  CHECK(p.last(kEventScrollPageUp));
+  send(WM_VSCROLL, SB_ENDSCROLL, 0);
+  CHECK(p.seen.empty());  // other scroll codes make no event
+
+  send(WM_SIZE, SIZE_MAXIMIZED, MAKELPARAM(640, 480));
+  CHECK(param(p, kEventMaximized, 0) == 640);
+  CHECK(param(p, kEventMaximized, 1) == 480);
+  send(WM_SIZE, SIZE_MINIMIZED, 0);
+  CHECK(p.last(kEventMinimized));
+  send(WM_SIZE, SIZE_RESTORED, MAKELPARAM(5, 6));
+  CHECK(param(p, kEventResized, 1) == 6);
+  send(WM_MOVE, 0, 0);
+  CHECK(p.last(kEventMoved));
+  send(WM_ACTIVATE, WA_CLICKACTIVE, 0);
+  CHECK(p.last(kEventActivated));
+  send(WM_ACTIVATE, WA_INACTIVE, 0);
+  CHECK(p.last(kEventDeactivated));
+  send(WM_TIMER, 5, 0);
+  CHECK(param(p, kEventTimer, 0) == 5);
+  send(WM_SETCURSOR, reinterpret_cast<WPARAM>(h), MAKELPARAM(HTCLIENT, WM_MOUSEMOVE));
+  CHECK(param(p, kEventSetCursor, 0) == reinterpret_cast<std::intptr_t>(h));
+  send(WM_SETFOCUS, 0, 0);
+  CHECK(p.last(kEventFocusGained));
+  send(WM_KILLFOCUS, 0, 0);
+  CHECK(p.last(kEventFocusLost));
+  send(WM_NCHITTEST, 0, 0);
+  CHECK(p.seen.empty());
+
+  // Erasing is claimed by the component (answer 1) so that nothing flickers.
+  HDC dc = GetDC(h);
+  CHECK(send(WM_ERASEBKGND, reinterpret_cast<WPARAM>(dc), 0) == 1);
+  CHECK(param(p, kEventEraseBackground, 0) == reinterpret_cast<std::intptr_t>(dc));
+  ReleaseDC(h, dc);
+
+  // WM_ENABLE keeps the component's flag in step and is consumed.
+  EnableWindow(h, FALSE);
+  CHECK_FALSE(p.getEnabledFlag());
+  CHECK_FALSE(p.isEnabled());
+  EnableWindow(h, TRUE);
+  CHECK(p.getEnabledFlag());
+
+  // WM_CLOSE reaches the default processing, which destroys the window.
+  send(WM_CLOSE, 0, 0);
+  CHECK(p.last(kEventClose));
+  CHECK(p.last(kEventDestroy));
+  CHECK_FALSE(IsWindow(h));
+}
+
+TEST_CASE("WM_CREATE reaches the component being created") {
+  HostWindow host;
+  Probe p;
+  REQUIRE(p.create(host.hwnd()));
+  auto ids = p.ids();
+  CHECK(std::find(ids.begin(), ids.end(), kEventCreate) != ids.end());
+}
+
+TEST_CASE("an unanswered event bubbles to the root, then the message goes to the native procedure") {
+  HostWindow host;
+  ProbePanel root;
+  REQUIRE(root.create(host.hwnd()));
+  auto* middle = new ProbePanel;
+  root.add(middle, "middle");
+  Probe leaf;
+  middle->add(&leaf);  // created by the container: it has a window
+  REQUIRE(middle->isValid());
+  REQUIRE(leaf.isValid());
+  leaf.destroyWindow();
+  createNative(leaf, middle->getHandle());
+
+  auto only = [](const std::vector<Seen>& seen, int id) {
+    std::vector<Seen> out;
+    for (const Seen& s : seen)
+      if (s.id == id) out.push_back(s);
+    return out;
+  };
+  leaf.requestFocus();  // so that the key brings no focus events along
+  middle->seen.clear();
+  root.seen.clear();
+  nativeCalls().clear();
+  SendMessageA(leaf.getHandle(), WM_KEYDOWN, 'Q', 0);
+  REQUIRE(leaf.last(kEventKeyDown));
+  auto atMiddle = only(middle->seen, kEventKeyDown);
+  REQUIRE(atMiddle.size() == 1);
+  CHECK(atMiddle[0].source == &leaf);
+  auto atRoot = only(root.seen, kEventKeyDown);
+  REQUIRE(atRoot.size() == 1);
+  CHECK(atRoot[0].source == &leaf);
+  CHECK(atRoot[0].params[0] == 'Q');
+  REQUIRE(nativeCount(WM_KEYDOWN) == 1);
+  CHECK(nativeCalls().back().wParam == 'Q');
+
+  // An answer ends the bubbling but does not consume the message.
+  middle->answer = 1;
+  root.seen.clear();
+  nativeCalls().clear();
+  SendMessageA(leaf.getHandle(), WM_KEYDOWN, 'R', 0);
+  CHECK(only(root.seen, kEventKeyDown).empty());
+  CHECK(nativeCount(WM_KEYDOWN) == 1);
+
+  // Ids without a handler go straight to the parent.
+  middle->seen.clear();
+  SendMessageA(leaf.getHandle(), WM_COMMAND, 0, 0);
+  CHECK(only(middle->seen, kEventCommand).size() == 1);
+
+  // fireAction hands an action event to the parent.
+  middle->answer = 0;
+  root.answer = 5;
+  root.seen.clear();
+  CHECK(leaf.fireAction() == 5);
+  REQUIRE(root.seen.size() == 1);
+  CHECK(root.seen[0].id == kEventAction);
+  CHECK(root.seen[0].source == &leaf);
+
+  middle->removeComponent(&leaf, false);
+  root.removeComponent(middle, true);
+}
+
+TEST_CASE("a handled WM_KEYDOWN reaches the default processing with key 0, never the native procedure") {
+  HostWindow host;
+  Probe p;
+  createNative(p, host.hwnd());
+  DefaultWatch watch;
+  nativeCalls().clear();
+
+  p.markHandled = true;
+  p.answer = 1;
+  SendMessageA(p.getHandle(), WM_KEYDOWN, 'A', 0x1E0001);
+  CHECK(nativeCount(WM_KEYDOWN) == 0);
+  REQUIRE(watch.lastOf(WM_KEYDOWN));
+  CHECK(watch.lastOf(WM_KEYDOWN)->wParam == 0);
+  SendMessageA(p.getHandle(), WM_CHAR, 'a', 0);
+  CHECK(nativeCount(WM_CHAR) == 0);
+  CHECK(watch.lastOf(WM_CHAR)->wParam == 0);
+
+  // Unmarked, it goes on to the native procedure unchanged.
+  p.markHandled = false;
+  g_defaultCalls.clear();
+  SendMessageA(p.getHandle(), WM_KEYDOWN, 'B', 0);
+  REQUIRE(nativeCount(WM_KEYDOWN) == 1);
+  CHECK(nativeCalls().back().wParam == 'B');
+  const NativeCall* passed = watch.lastOf(WM_KEYDOWN);
+  CHECK((passed == nullptr || passed->wParam == 'B'));
+
+  // Consumed notifications answer 1.
+  p.markHandled = true;
+  NMHDR nm{p.getHandle(), 1, 0};
+  CHECK(SendMessageA(p.getHandle(), WM_NOTIFY, 1, reinterpret_cast<LPARAM>(&nm)) == 1);
+  CHECK(nativeCount(WM_NOTIFY) == 0);
+}
+
+TEST_CASE("a subclassed window gets its procedure back and sees WM_NCDESTROY") {
+  HostWindow host;
+  Probe p;
+  createNative(p, host.hwnd());
+  HWND h = p.getHandle();
+  const bool toolkitProc =
+      reinterpret_cast<WNDPROC>(GetWindowLongPtrA(h, GWLP_WNDPROC)) == &ToolkitWindows::windowProc;
+  CHECK(toolkitProc);
+  CHECK((ToolkitWindows::previousProcOf(h) != nullptr));
+  char name[64] = {};
+  GetClassNameA(h, name, sizeof(name));
+  CHECK(std::string(name) == nativeClassName());
+  nativeCalls().clear();
+  const size_t before = ToolkitWindows::windowCount();
+  DestroyWindow(h);
+  CHECK(nativeCount(WM_NCDESTROY) == 1);
+  CHECK(ToolkitWindows::windowCount() == before - 1);
+  CHECK_FALSE(p.isValid());
+}
+
+TEST_CASE("key, character and mouse-down handlers get the focus first; Tab moves it on") {
+  HostWindow host;
+  Panel root;
+  REQUIRE(root.create(host.hwnd()));
+  Probe a, b;
+  root.add(&a);
+  root.add(&b);
+  SetFocus(host.hwnd());
+  REQUIRE(GetFocus() == host.hwnd());
+
+  SendMessageA(a.getHandle(), WM_LBUTTONDOWN, MK_LBUTTON, 0);
+  CHECK(GetFocus() == a.getHandle());
+  SetFocus(host.hwnd());
+  SendMessageA(b.getHandle(), WM_CHAR, 'x', 0);
+  CHECK(GetFocus() == b.getHandle());
+  SetFocus(host.hwnd());
+  SendMessageA(a.getHandle(), WM_KEYDOWN, 'K', 0);
+  CHECK(GetFocus() == a.getHandle());
+  // Other events do not move the focus.
+  SendMessageA(b.getHandle(), WM_MOUSEMOVE, 0, 0);
+  CHECK(GetFocus() == a.getHandle());
+
+  // Tab goes from a to b and around again; the event is answered there.
+  SendMessageA(a.getHandle(), WM_KEYDOWN, VK_TAB, 0);
+  CHECK(GetFocus() == b.getHandle());
+  SendMessageA(b.getHandle(), WM_KEYDOWN, VK_TAB, 0);
+  CHECK(GetFocus() == a.getHandle());
+  CHECK(a.last(kEventKeyDown)->params[0] == VK_TAB);
+
+  // A container asked for the focus keeps it on a child that has it.
+  root.requestFocus();
+  CHECK(GetFocus() == a.getHandle());
+  root.removeComponent(&a, false);
+  root.removeComponent(&b, false);
+}
+
+TEST_CASE("posted events wait for the message loop; sent events are dispatched at once") {
+  HostWindow host;
+  Probe p;
+  REQUIRE(p.create(host.hwnd()));
+  p.seen.clear();
+  auto posted = std::make_unique<ToolkitEvent>(&p, 40, p.getHandle());
+  posted->params[0] = 99;
+  REQUIRE(p.postEvent(std::move(posted)));
+  CHECK(p.seen.empty());
+  CHECK(p.peer()->queuedEvents() == 1);
+  pump(20);
+  REQUIRE(p.last(40));
+  CHECK(p.last(40)->params[0] == 99);
+  CHECK(p.peer()->queuedEvents() == 0);
+
+  p.seen.clear();
+  REQUIRE(p.sendEvent(std::make_unique<ToolkitEvent>(&p, 41, p.getHandle())));
+  CHECK(p.last(41));
+
+  // Events queued together are dispatched in order.
+  p.seen.clear();
+  p.peer()->queue(std::make_unique<ToolkitEvent>(&p, 50, p.getHandle()));
+  p.peer()->queue(std::make_unique<ToolkitEvent>(&p, 51, p.getHandle()));
+  SendMessageA(p.getHandle(), WM_MOVE, 0, 0);
+  CHECK(p.ids() == std::vector<int>{50, 51, kEventMoved});
+}
+
+TEST_CASE("a handler that deletes its own component ends the dispatch safely") {
+  HostWindow host;
+  int deletions = 0;
+  auto* p = new Probe;
+  p->deletions = &deletions;
+  REQUIRE(p->create(host.hwnd()));
+  HWND h = p->getHandle();
+  p->deleteSelfOnKey = true;
+  SendMessageA(h, WM_KEYDOWN, 'D', 0);
+  CHECK(deletions == 1);
+  CHECK_FALSE(IsWindow(h));
+  CHECK(ToolkitWindows::componentOf(h) == nullptr);
+}
+
+TEST_CASE("onPaint paints only the component's own window and claims nothing") {
+  HostWindow host;
+  struct Painter : Probe {
+    int painted = 0;
+    void paint(HDC) override { ++painted; }
+  } p;
+  REQUIRE(p.create(host.hwnd()));
+  p.setBounds(0, 0, 40, 40, true, true);
+  UpdateWindow(p.getHandle());
+  p.painted = 0;
+  InvalidateRect(p.getHandle(), nullptr, FALSE);
+  UpdateWindow(p.getHandle());
+  CHECK(p.painted == 1);
+  RECT update{};
+  CHECK_FALSE(GetUpdateRect(p.getHandle(), &update, FALSE));
+
+  // With redraw off, nothing is painted (and nothing is invalidated).
+  p.setRedraw(false);
+  SendMessageA(p.getHandle(), WM_PAINT, 0, 0);
+  CHECK(p.painted == 1);
+  p.setRedraw(true);
+}

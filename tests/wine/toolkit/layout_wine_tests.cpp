@@ -1,0 +1,253 @@
+// The five layouts with real child windows: every placement is read back from
+// the child windows' rectangles.
+#include <doctest/doctest.h>
+
+#include <memory>
+#include <vector>
+
+#include "ToolkitTestSupport.h"
+#include "toolkit/core/Panel.h"
+#include "toolkit/layout/BorderLayout.h"
+#include "toolkit/layout/FlowLayout.h"
+#include "toolkit/layout/GridLayout.h"
+#include "toolkit/layout/SplitterLayout.h"
+#include "toolkit/layout/TabLayout.h"
+
+using namespace toolkit;
+using namespace tktest;
+
+namespace {
+
+// A root panel of the given size under a host window, with probe children.
+struct Tree {
+  HostWindow host{600, 400};
+  Panel root;
+  std::vector<std::unique_ptr<Probe>> kids;
+
+  Tree(std::unique_ptr<Layout> layout, int width, int height) : root(std::move(layout)) {
+    REQUIRE(root.create(host.hwnd()));
+    root.setBounds(0, 0, width, height, true, true);
+  }
+  ~Tree() {
+    for (auto& k : kids) root.removeComponent(k.get(), false);
+  }
+  Probe& add(int w, int h, const char* position = nullptr, Container* into = nullptr) {
+    kids.push_back(std::make_unique<Probe>());
+    Probe& p = *kids.back();
+    p.pref = SIZE{w, h};
+    (into ? into : &root)->insertNamed(position, &p, nullptr);
+    return p;
+  }
+  Probe& kid(size_t i) { return *kids[i]; }
+};
+
+#define CHECK_PLACED(component, x, y, w, h) CHECK(str(placed(component)) == str(xywh(x, y, w, h)))
+
+}  // namespace
+
+TEST_CASE("border: a lone \"center\" child fills the area less the gaps of the empty regions") {
+  Tree t(std::make_unique<BorderLayout>(5, 7), 400, 300);
+  Probe& c = t.add(50, 40, "center");
+  t.root.doLayout();
+  CHECK_PLACED(c, 5, 7, 390, 286);
+  CHECK(str(c.bounds()) == str(xywh(5, 7, 390, 286)));
+  SIZE pref = t.root.getPreferredSize();
+  CHECK(pref.cx == 50 + 10);
+  CHECK(pref.cy == 40 + 14);
+}
+
+TEST_CASE("border: two \"North\" children side by side, the region as high as the taller") {
+  Tree t(std::make_unique<BorderLayout>(), 400, 300);
+  Probe& a = t.add(40, 20, "North");
+  Probe& b = t.add(50, 30, "North");
+  Probe& w = t.add(60, 10, "West");
+  Probe& c = t.add(10, 10, "Center");
+  Probe& s = t.add(10, 25, "SOUTH");
+  Probe& e = t.add(35, 10, "east");
+  t.root.doLayout();
+  CHECK_PLACED(a, 0, 0, 200, 30);
+  CHECK_PLACED(b, 200, 0, 200, 30);
+  CHECK_PLACED(s, 0, 275, 400, 25);
+  CHECK_PLACED(w, 0, 30, 60, 245);
+  CHECK_PLACED(e, 365, 30, 35, 245);
+  CHECK_PLACED(c, 60, 30, 305, 245);
+}
+
+TEST_CASE("grid: (1, 2, 0, 0, \"25;75\", 68) in 400 pixels gives 100 and 300") {
+  Tree t(std::make_unique<GridLayout>(1, 2, 0, 0, "25;75", 68), 400, 120);
+  Probe& a = t.add(10, 10);
+  Probe& b = t.add(10, 10);
+  t.root.doLayout();
+  CHECK_PLACED(a, 0, 0, 100, 120);
+  CHECK_PLACED(b, 100, 0, 300, 120);
+
+  // "35,65" reads the same way.
+  t.root.setLayout(std::make_unique<GridLayout>(1, 2, 0, 0, "35,65", 68));
+  t.root.doLayout();
+  CHECK_PLACED(a, 0, 0, 140, 120);
+  CHECK_PLACED(b, 140, 0, 260, 120);
+}
+
+TEST_CASE("grid: 0 x 0 behaves as 1 x 1") {
+  Tree t(std::make_unique<GridLayout>(0, 0, 0, 0, nullptr, 68), 300, 200);
+  Probe& a = t.add(10, 10);
+  t.root.doLayout();
+  CHECK_PLACED(a, 0, 0, 300, 200);
+}
+
+TEST_CASE("flow: a row that cannot fit its first child still holds it") {
+  Tree t(std::make_unique<FlowLayout>(0, 3, 3, false), 100, 200);
+  Probe& a = t.add(150, 20);
+  Probe& b = t.add(150, 20);
+  t.root.doLayout();
+  CHECK_PLACED(a, 0, 0, 150, 20);
+  CHECK_PLACED(b, 0, 23, 150, 20);
+}
+
+TEST_CASE("flow: the controls' centred flow with own widths") {
+  Tree t(std::make_unique<FlowLayout>(), 300, 100);
+  Probe& a = t.add(40, 20);
+  Probe& b = t.add(60, 24);
+  t.root.doLayout();
+  // Row width 2 * (3 + 60) = 126, centred: x = (300 - 126) / 2 = 87.
+  CHECK_PLACED(a, 87, 0, 40, 24);
+  CHECK_PLACED(b, 87 + 43, 0, 60, 24);
+}
+
+TEST_CASE("tabs: index -1 hides every child; preferred size (0, 0)") {
+  auto layout = std::make_unique<TabLayout>();
+  layout->selectedIndex = -1;
+  Tree t(std::move(layout), 250, 150);
+  for (int i = 0; i < 3; ++i) t.add(80, 60);
+  t.root.doLayout();
+  for (size_t i = 0; i < 3; ++i) {
+    CHECK_FALSE(t.kid(i).isVisible());
+    CHECK_PLACED(t.kid(i), 0, 0, 250, 150);  // hidden pages are sized once
+  }
+  SIZE pref = t.root.getPreferredSize();
+  CHECK(pref.cx == 0);
+  CHECK(pref.cy == 0);
+
+  // Selecting a page shows just that one at the next pass.
+  static_cast<TabLayout*>(t.root.getLayout())->selectedIndex = 2;
+  t.root.doLayout();
+  CHECK(t.kid(2).isVisible());
+  CHECK_FALSE(t.kid(0).isVisible());
+  CHECK_FALSE(t.kid(1).isVisible());
+}
+
+TEST_CASE("splitter: with four children only the first three are placed") {
+  auto layout = std::make_unique<SplitterLayout>(kSplitSideBySide, 4);
+  layout->splitNumerator = 1;
+  layout->splitDenominator = 4;
+  Tree t(std::move(layout), 400, 100);
+  for (int i = 0; i < 4; ++i) t.add(20, 30);
+  t.kid(3).setBounds(1, 2, 3, 4, true, true);
+  t.root.doLayout();
+  CHECK_PLACED(t.kid(0), 0, 0, 98, 100);
+  CHECK_PLACED(t.kid(1), 102, 0, 298, 100);
+  CHECK_PLACED(t.kid(2), 204, 0, 196, 100);
+  CHECK_PLACED(t.kid(3), 1, 2, 3, 4);
+}
+
+TEST_CASE("splitter: an unset split divides nothing; initializeSplit measures the panes") {
+  Tree t(std::make_unique<SplitterLayout>(kSplitStacked, 10), 100, 200);
+  Probe& a = t.add(30, 40);
+  Probe& b = t.add(30, 70);
+  t.root.doLayout();
+  CHECK_PLACED(a, 0, 0, 100, 95);
+  CHECK_PLACED(b, 0, 105, 100, 95);
+  t.root.initializeSplit();
+  CHECK(t.root.getLayout()->splitNumerator == 45);
+  CHECK(t.root.getLayout()->splitDenominator == 120);
+  t.root.setBounds(0, 0, 100, 240, true, true);
+  t.root.doLayout();
+  CHECK_PLACED(a, 0, 0, 100, 85);
+  CHECK_PLACED(b, 0, 95, 100, 145);
+}
+
+TEST_CASE("insets shrink the area; nested visible containers are laid out in the same pass") {
+  Tree t(std::make_unique<BorderLayout>(), 400, 300);
+  t.root.setInsets(10, 20, 30, 40);
+  auto* side = new Panel(std::make_unique<GridLayout>(2, 1, 0, 0, nullptr, 68));
+  t.root.insertNamed("West", side, "side");
+  side->setInsets(5, 5, 5, 5);
+  Probe& top = t.add(50, 10, nullptr, side);
+  Probe& bottom = t.add(80, 10, nullptr, side);
+  auto* hiddenBox = new Panel(std::make_unique<GridLayout>(1, 1, 0, 0, nullptr, 68));
+  t.root.insertNamed("Center", hiddenBox, "box");
+  Probe& inHidden = t.add(10, 10, nullptr, hiddenBox);
+  hiddenBox->show(false);
+
+  t.root.doLayout();
+  // West region: as wide as the side panel prefers (grid: 1 * (0 + 80) + insets 10).
+  SIZE sidePref = side->getPreferredSize();
+  CHECK(sidePref.cx == 90);
+  CHECK(sidePref.cy == 20 + 10);
+  CHECK_PLACED(*side, 10, 20, 90, 240);
+  CHECK_PLACED(top, 5, 5, 80, 115);
+  CHECK_PLACED(bottom, 5, 120, 80, 115);
+  CHECK_PLACED(*hiddenBox, 100, 20, 270, 240);
+  CHECK_PLACED(inHidden, 0, 0, 0, 0);  // an invisible container is not recursed into
+
+  // The container's preferred size in a rectangle works inside it less the insets.
+  SIZE in = t.root.getPreferredSizeIn(RECT{0, 0, 400, 300});
+  CHECK(in.cx == 10 + 30 + (0 + 90) + 0 + 0 + (0 + 270));
+  CHECK(in.cy == 20 + 40 + 0 + 0 + 240);
+
+  t.root.removeComponent(side, true);
+  t.root.removeComponent(hiddenBox, true);
+}
+
+TEST_CASE("a drop-down list keeps its own height wherever a layout gives one") {
+  Tree t(std::make_unique<GridLayout>(2, 1, 0, 0, nullptr, 68), 200, 100);
+  FakeChoice list;
+  list.listHeight = 160;
+  t.root.add(&list);
+  Probe& other = t.add(10, 10);
+  t.root.doLayout();
+  CHECK_PLACED(list, 0, 0, 200, 160);
+  CHECK_PLACED(other, 0, 50, 200, 50);
+  t.root.removeComponent(&list, false);
+}
+
+TEST_CASE("nothing is laid out without a layout, children or a client area") {
+  Tree t(std::make_unique<GridLayout>(1, 1), 100, 100);
+  Probe& a = t.add(10, 10);
+  a.setBounds(3, 3, 7, 7, true, true);
+  t.root.setBounds(0, 0, 0, 100, true, true);
+  t.root.doLayout();
+  CHECK_PLACED(a, 3, 3, 7, 7);
+  t.root.setBounds(0, 0, 100, 100, true, true);
+  t.root.setLayout(nullptr);
+  t.root.doLayout();
+  CHECK_PLACED(a, 3, 3, 7, 7);
+  SIZE pref = t.root.getPreferredSize();
+  CHECK(pref.cx == 0);
+
+  Panel empty;
+  empty.setInsets(4, 4, 4, 4);
+  SIZE none = empty.getPreferredSize();
+  CHECK(none.cx == 0);
+  CHECK(none.cy == 0);
+  empty.doLayout();
+}
+
+TEST_CASE("the layout slots can be driven directly; a null batch moves at once") {
+  Tree t(std::make_unique<BorderLayout>(2, 2), 300, 200);
+  Probe& n = t.add(10, 30, "North");
+  HDWP none = nullptr;
+  SIZE used = t.root.layoutBorderRegion(RECT{0, 0, 300, 200}, kRegionNorth, true, none);
+  CHECK(used.cx == 300);
+  CHECK(used.cy == 30);
+  CHECK_PLACED(n, 0, 0, 300, 30);
+  used = t.root.layoutBorderRegion(RECT{0, 50, 300, 200}, kRegionNorth, false, none);
+  CHECK_PLACED(n, 0, 0, 300, 30);
+  used = t.root.layoutGrid(RECT{0, 0, 60, 40}, false, none);
+  CHECK(used.cx == 60);
+  CHECK(used.cy == 40);
+  // The tab slot needs a TabLayout; with another layout it does nothing.
+  used = t.root.layoutTabs(RECT{0, 0, 60, 40}, none);
+  CHECK(used.cx == 0);
+  CHECK(n.isVisible());
+}
