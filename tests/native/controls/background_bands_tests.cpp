@@ -1,0 +1,94 @@
+#include "tides/controls/graph/background_bands.h"
+
+#include <doctest/doctest.h>
+
+#include <vector>
+
+using namespace br::tides::graph;
+
+namespace {
+
+GraphGeometry Plain() { return GraphGeometry(Rect{0, 0, 300, 200}, 8, 8); }
+
+SunEvents AllFour() {
+  SunEvents e;
+  e.twilightBegin = TimeOfDay{5, 30};
+  e.sunrise = TimeOfDay{6, 0};
+  e.sunset = TimeOfDay{18, 0};
+  e.twilightEnd = TimeOfDay{18, 30};
+  return e;
+}
+
+void CheckBand(const Band& band, int left, int right, int colour) {
+  CHECK(band.left == left);
+  CHECK(band.right == right);
+  CHECK(band.colour == colour);
+}
+
+}  // namespace
+
+TEST_CASE("all four sun events: twilight, then daylight over it") {
+  const std::vector<Band> bands = BackgroundBands(AllFour(), Plain());
+  REQUIRE(bands.size() == 2);
+  CheckBand(bands[0], 8 + 65, 8 + 218, kTwilightColour);  // 05:30 .. 18:30
+  CheckBand(bands[1], 8 + 71, 8 + 213, kDaylightColour);  // 06:00 .. 18:00
+}
+
+TEST_CASE("rise and set without twilight: twilight over the whole plot") {
+  SunEvents e = AllFour();
+  e.twilightBegin.reset();
+  e.twilightEnd.reset();
+  const std::vector<Band> bands = BackgroundBands(e, Plain());
+  REQUIRE(bands.size() == 2);
+  CheckBand(bands[0], 8, 292, kTwilightColour);
+  CheckBand(bands[1], 79, 221, kDaylightColour);
+}
+
+TEST_CASE("twilight without rise and set: only the twilight band") {
+  SunEvents e = AllFour();
+  e.sunrise.reset();
+  e.sunset.reset();
+  const std::vector<Band> bands = BackgroundBands(e, Plain());
+  REQUIRE(bands.size() == 1);
+  CheckBand(bands[0], 73, 226, kTwilightColour);
+}
+
+TEST_CASE("no sun event: daylight all day in the polar summer, else night") {
+  SunEvents e;
+  e.latitude = 78.2;
+  e.month = 6;
+  std::vector<Band> bands = BackgroundBands(e, Plain());
+  REQUIRE(bands.size() == 1);
+  CheckBand(bands[0], 8, 292, kDaylightColour);
+  e.month = 12;
+  CHECK(BackgroundBands(e, Plain()).empty());
+  e.latitude = -70.0;
+  REQUIRE(BackgroundBands(e, Plain()).size() == 1);
+  e.month = 7;
+  CHECK(BackgroundBands(e, Plain()).empty());
+  e.latitude = 0.0;
+  e.month = 12;
+  CHECK(BackgroundBands(e, Plain()).empty());
+  e.latitude = 78.2;
+  e.month.reset();  // the month could not be read
+  CHECK(BackgroundBands(e, Plain()).empty());
+}
+
+TEST_CASE("any other combination leaves the night") {
+  SunEvents e = AllFour();
+  e.sunset.reset();
+  CHECK(BackgroundBands(e, Plain()).empty());
+  e = AllFour();
+  e.twilightEnd.reset();
+  CHECK(BackgroundBands(e, Plain()).empty());
+}
+
+TEST_CASE("an interval over midnight is painted at both ends of the plot") {
+  SunEvents e;
+  e.twilightBegin = TimeOfDay{20, 0};  // twilight from 20:00 through midnight to 02:00
+  e.twilightEnd = TimeOfDay{2, 0};
+  const std::vector<Band> bands = BackgroundBands(e, Plain());
+  REQUIRE(bands.size() == 2);
+  CheckBand(bands[0], 8 + 236, 292, kTwilightColour);
+  CheckBand(bands[1], 8, 8 + 23, kTwilightColour);
+}
