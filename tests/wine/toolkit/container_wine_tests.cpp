@@ -292,6 +292,31 @@ TEST_CASE("a container lends its font to its children, who never delete it") {
   DeleteObject(lent);
 }
 
+TEST_CASE("an OLE font object is lent down the whole tree") {
+  HostWindow host;
+  Panel root;
+  Panel inner;
+  Probe leaf;
+  root.add(&inner);
+  inner.add(&leaf);
+  REQUIRE(root.create(host.hwnd()));
+  FONTDESC desc{sizeof(FONTDESC), const_cast<LPOLESTR>(L"Arial"), {{90000, 0}}, FW_BOLD, ANSI_CHARSET,
+                FALSE, FALSE, FALSE};
+  IFont* font = nullptr;
+  REQUIRE(SUCCEEDED(OleCreateFontIndirect(&desc, IID_IFont, reinterpret_cast<void**>(&font))));
+  HFONT hfont = nullptr;
+  REQUIRE(SUCCEEDED(font->get_hFont(&hfont)));
+  root.setFontObject(font);
+  CHECK(root.getFont() == hfont);
+  CHECK(inner.getFont() == hfont);
+  CHECK(leaf.getFont() == hfont);
+  root.setFontObject(nullptr);  // ignored
+  CHECK(leaf.getFont() == hfont);
+  inner.removeComponent(&leaf, false);
+  root.removeComponent(&inner, false);
+  font->Release();
+}
+
 TEST_CASE("repaintAll invalidates the visible windows of the whole tree") {
   HostWindow host;
   Panel root;
