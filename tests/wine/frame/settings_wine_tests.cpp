@@ -7,6 +7,8 @@
 #include "TestSupport.h"
 #include "frame/settings/DataFileSearch.h"
 #include "frame/settings/Settings.h"
+#include "frame/errors/cErr.h"
+#include "frame/settings/cRegKeyReader.h"
 #include "frame/settings/cRegSettings.h"
 
 namespace {
@@ -122,6 +124,41 @@ TEST_CASE("string values stored without a terminator are read whole") {
   RegSetValueExA(key, "Raw", 0, REG_SZ, reinterpret_cast<const BYTE*>(raw), sizeof raw);
   RegCloseKey(key);
   CHECK(cRegSettings::Machine().ReadString(scratch.Name(), "Raw", "dflt") == "abc");
+}
+
+TEST_CASE("the simple key reader throws 0xE0030002 without a key and limits string lengths") {
+  const cRegKeyReader missing(HKEY_LOCAL_MACHINE, "SOFTWARE\\Brine\\NoSuchKey\\AtAll");
+  CHECK_FALSE(missing.IsOpen());
+  DWORD number = 0;
+  std::string text;
+  bool threw = false;
+  try {
+    missing.ReadDword("LogBRCL", number);
+  } catch (const cErr& error) {
+    threw = error.code() == 0xE0030002u;
+  }
+  CHECK(threw);
+  threw = false;
+  try {
+    missing.ReadString("LogFileBRCL", text, 520);
+  } catch (const cErr& error) {
+    threw = error.code() == 0xE0030002u;
+  }
+  CHECK(threw);
+
+  const ScratchSubkey scratch(HKEY_LOCAL_MACHINE);
+  SavedRegistryValue value(HKEY_LOCAL_MACHINE, scratch.FullPath(), "Text");
+  value.SetString(std::string(9, 'z'));  // 10 bytes with the terminator
+  const cRegKeyReader reader(HKEY_LOCAL_MACHINE, scratch.FullPath().c_str());
+  REQUIRE(reader.IsOpen());
+  CHECK(reader.ReadString("Text", text, 10));
+  CHECK(text == std::string(9, 'z'));
+  CHECK_FALSE(reader.ReadString("Text", text, 9));
+  CHECK_FALSE(reader.ReadDword("Text", number));
+  value.SetDword(77);
+  CHECK(reader.ReadDword("Text", number));
+  CHECK(number == 77);
+  CHECK_FALSE(reader.ReadString("Text", text, 10));
 }
 
 TEST_CASE("the settings table: tree mode, folders and the picture window placement") {
