@@ -3,9 +3,13 @@
 #include <windows.h>
 #include <oleauto.h>
 
+#include <cmath>
+
 namespace br::tides {
 
 bool SplitDayCountDate(double date, CalendarDate& out) {
+  // Wine's conversion turns NaN into a date (its range checks are comparisons): refuse it first.
+  if (!std::isfinite(date)) return false;
   SYSTEMTIME st = {};
   if (!VariantTimeToSystemTime(date, &st)) return false;
   out.year = static_cast<std::int16_t>(st.wYear);
