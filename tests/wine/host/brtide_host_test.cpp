@@ -11,38 +11,32 @@
 #include <string>
 #include <vector>
 
+#include <filesystem>
+
 #include "BR_Info.h"
-#include "tests/wine/common/dll_under_test.h"
-#include "tests/wine/common/station_folder.h"
+#include "tests/native/engine/station_folder.h"
 #include "tests/wine/host/brtide_process.h"
 
-using br::test::DllUnderTest;
 using br::test::ProcessResult;
 using br::test::RunBrtide;
-using br::test::StationFolder;
-using br::test::TestStation;
 using br::test::TextLines;
+using br::tides::testing::TempFolder;
+using br::tides::testing::TestStation;
 
 namespace {
 
 constexpr std::int16_t kM2 = 29;
 const char kDegree[] = "\xC2\xB0";
 
+// Constituent records are {number, phase in tenths of a degree, amplitude in millimetres}.
 // Station 0 is the engine's worked day: M2 alone, amplitude 1.000, phase 0.
 const std::vector<TestStation> kStations = {
-    {"Worked M2", 3000, -240, 0, {{0, 0, 0}, {kM2, 1000, 0}}},
-    {"Zone Port", 600, 1200, -1, {{0, 2500, 0}, {kM2, 1500, 900}}},
-    {"Fjord", 4680, 900, -1, {{0, 1000, 0}, {kM2, 500, 1800}}},
-    {"Br\xEAhat", 2931, -190, -1, {{0, 5800, 0}, {kM2, 3000, 1200}}},
-    {"Ghost", 3030, -250, 0, {{0, 1000, 0}, {kM2, 500, 0}}},  // its block is cut short
+    {"Worked M2", 3000, -240, 0, {{0, 0, 0}, {kM2, 0, 1000}}},
+    {"Zone Port", 600, 1200, -1, {{0, 0, 2500}, {kM2, 900, 1500}}},
+    {"Fjord", 4680, 900, -1, {{0, 0, 1000}, {kM2, 1800, 500}}},
+    {"Br\xEAhat", 2931, -190, -1, {{0, 0, 5800}, {kM2, 1200, 3000}}},
+    {"Ghost", 3030, -250, 0, {{0, 0, 1000}, {kM2, 0, 500}}},  // its block is cut short
 };
-
-std::string Utf8(const std::wstring& text) {
-  const int n = WideCharToMultiByte(CP_UTF8, 0, text.data(), static_cast<int>(text.size()), nullptr, 0, nullptr, nullptr);
-  std::string out(static_cast<std::size_t>(n), '\0');
-  WideCharToMultiByte(CP_UTF8, 0, text.data(), static_cast<int>(text.size()), out.data(), n, nullptr, nullptr);
-  return out;
-}
 
 bool HasLine(const std::vector<std::string>& lines, const std::string& wanted) {
   for (const std::string& line : lines) {
@@ -66,20 +60,23 @@ std::string Clock(double dayCountDate) {
 }
 
 // The folder of kStations with the last station's block cut short, as a damaged copy might
-// be: the library cannot find that station, so it has no name and no day.
-class TestFolder : public StationFolder {
-public:
-  TestFolder() : StationFolder(kStations) {
-    const std::wstring data = Path() + L"\\td_pnt.dat";
-    HANDLE file = CreateFileW(data.c_str(), GENERIC_WRITE, 0, nullptr, OPEN_EXISTING, 0, nullptr);
-    REQUIRE(file != INVALID_HANDLE_VALUE);
-    SetFilePointer(file, -3, nullptr, FILE_END);
-    SetEndOfFile(file);
-    CloseHandle(file);
+// be: the library cannot find that station, so it has no name and no day. One folder serves
+// the whole suite: the library opens station files once per process.
+struct SuiteFolder {
+  TempFolder folder{"brtide"};
+  SuiteFolder() {
+    br::tides::testing::WriteStationFolder(folder.path(), kStations);
+    const std::filesystem::path data = folder.path() / "td_pnt.dat";
+    br::tides::testing::TruncateFile(data, std::filesystem::file_size(data) - 3);
   }
 };
 
-// One day as TidesPort gives it, read in this process through the built DLL.
+const TempFolder& SharedFolder() {
+  static const SuiteFolder shared;
+  return shared.folder;
+}
+
+// One day as TidesPort gives it, read in this process through the registered library.
 struct PortDay {
   std::vector<double> heights;
   long maxIndex = 0, minIndex = 0, zone = 0;
@@ -87,12 +84,13 @@ struct PortDay {
   double beginTwilight = 0, sunrise = 0, sunset = 0, endTwilight = 0;
 };
 
-PortDay ReadPortDay(const TestFolder& folder, long station, double step, double date) {
-  DllUnderTest dll;
+PortDay ReadPortDay(long station, double step, double date) {
+  REQUIRE(SUCCEEDED(CoInitializeEx(nullptr, COINIT_APARTMENTTHREADED)));
   PortDay day;
   ITidesDatabase* db = nullptr;
-  REQUIRE(dll.Create(CLSID_TidesDatabase, &db) == S_OK);
-  BSTR path = SysAllocString(folder.Path().c_str());
+  REQUIRE(CoCreateInstance(CLSID_TidesDatabase, nullptr, CLSCTX_INPROC_SERVER, IID_ITidesDatabase,
+                           reinterpret_cast<void**>(&db)) == S_OK);
+  BSTR path = SysAllocString(SharedFolder().path().wstring().c_str());
   REQUIRE(db->Initialize(path) == S_OK);
   SysFreeString(path);
   IUnknown* unknown = nullptr;
@@ -118,6 +116,7 @@ PortDay ReadPortDay(const TestFolder& folder, long station, double step, double 
   REQUIRE(port->get_EndTwilight(&day.endTwilight) == S_OK);
   port->Release();
   db->Release();
+  CoUninitialize();
   return day;
 }
 
@@ -147,8 +146,7 @@ constexpr double k2024_03_20 = 45371.0;
 }  // namespace
 
 TEST_CASE("ports lists the stations strictly inside the box, with numbers, names and positions") {
-  TestFolder folder;
-  const std::string path = Utf8(folder.Path());
+  const std::string path = SharedFolder().str();
   // 48.5..51 N, 5 W..3 W: the worked station, Brehat and the cut one, not the others.
   const ProcessResult r = RunBrtide({"ports", "--folder", path, "--box", "51", "-3", "48.5", "-5"});
   CHECK(r.exitCode == 0);
@@ -170,10 +168,10 @@ TEST_CASE("ports lists the stations strictly inside the box, with numbers, names
 }
 
 TEST_CASE("day prints the port's own extremes, sun times and zone") {
-  TestFolder folder;
-  const PortDay port = ReadPortDay(folder, 1, 1.0, k2024_03_20);
+  const std::string path = SharedFolder().str();
+  const PortDay port = ReadPortDay(1, 1.0, k2024_03_20);
   const ProcessResult r =
-      RunBrtide({"day", "--folder", Utf8(folder.Path()), "--port", "1", "--date", "2024-03-20"});
+      RunBrtide({"day", "--folder", path, "--port", "1", "--date", "2024-03-20"});
   CHECK(r.exitCode == 0);
   CHECK(r.err.empty());
   const std::vector<std::string> lines = TextLines(r.out);
@@ -205,10 +203,10 @@ TEST_CASE("day prints the port's own extremes, sun times and zone") {
 }
 
 TEST_CASE("CSV gives the port's heights at ISO local times, one row per point") {
-  TestFolder folder;
-  const PortDay port = ReadPortDay(folder, 3, 0.5, k2024_03_20);
+  const std::string path = SharedFolder().str();
+  const PortDay port = ReadPortDay(3, 0.5, k2024_03_20);
   const ProcessResult r = RunBrtide(
-      {"day", "--folder", Utf8(folder.Path()), "--port", "3", "--date", "2024-03-20", "--step", "0.5", "--csv"});
+      {"day", "--folder", path, "--port", "3", "--date", "2024-03-20", "--step", "0.5", "--csv"});
   CHECK(r.exitCode == 0);
   CHECK(r.err.empty());
   const std::vector<CsvRow> rows = CsvRows(r.out);
@@ -228,8 +226,7 @@ TEST_CASE("CSV gives the port's heights at ISO local times, one row per point") 
 }
 
 TEST_CASE("the worked M2 day comes out with its known heights and extremes") {
-  TestFolder folder;
-  const std::string path = Utf8(folder.Path());
+  const std::string path = SharedFolder().str();
   const ProcessResult csv = RunBrtide({"day", "--folder", path, "--port", "0", "--date", "1996-01-01", "--csv"});
   REQUIRE(csv.exitCode == 0);
   const std::vector<CsvRow> rows = CsvRows(csv.out);
@@ -242,7 +239,7 @@ TEST_CASE("the worked M2 day comes out with its known heights and extremes") {
   const ProcessResult text = RunBrtide({"day", "--folder", path, "--port", "0", "--date", "1996-01-01"});
   REQUIRE(text.exitCode == 0);
   const std::vector<std::string> lines = TextLines(text.out);
-  const PortDay port = ReadPortDay(folder, 0, 1.0, k1996_01_01);
+  const PortDay port = ReadPortDay(0, 1.0, k1996_01_01);
   CHECK(port.minIndex == 2);
   CHECK(port.maxIndex == 21);
   CHECK(HasLine(lines, "Lowest    " + Fixed3(port.minValue) + " m at 02:00"));
@@ -252,10 +249,10 @@ TEST_CASE("the worked M2 day comes out with its known heights and extremes") {
 }
 
 TEST_CASE("--near chooses the nearest station and says how far it is") {
-  TestFolder folder;
+  const std::string path = SharedFolder().str();
   // 10 N 20.1 E lies 10.95 km east of Zone Port.
   const ProcessResult r =
-      RunBrtide({"day", "--folder", Utf8(folder.Path()), "--near", "10N", "20.1E", "--date", "2024-03-20"});
+      RunBrtide({"day", "--folder", path, "--near", "10N", "20.1E", "--date", "2024-03-20"});
   CHECK(r.exitCode == 0);
   const std::vector<std::string> lines = TextLines(r.out);
   REQUIRE(lines.size() > 3);
@@ -264,8 +261,7 @@ TEST_CASE("--near chooses the nearest station and says how far it is") {
 }
 
 TEST_CASE("near the pole the sun lines say the sun stays up or down") {
-  TestFolder folder;
-  const std::string path = Utf8(folder.Path());
+  const std::string path = SharedFolder().str();
   ProcessResult r = RunBrtide({"day", "--folder", path, "--port", "2", "--date", "2024-06-21"});
   CHECK(r.exitCode == 0);
   CHECK(HasLine(TextLines(r.out), "  the sun stays above the horizon all day"));
@@ -275,13 +271,12 @@ TEST_CASE("near the pole the sun lines say the sun stays up or down") {
 }
 
 TEST_CASE("every failure gives its exit status and one line on standard error") {
-  TestFolder folder;
-  br::test::FolderOptions noData;
-  noData.withoutDataFile = true;
-  StationFolder incomplete(kStations, noData);
-  const std::string path = Utf8(folder.Path());
+  const std::string path = SharedFolder().str();
+  TempFolder incomplete("brtide_partial");
+  br::tides::testing::WriteStationFolder(incomplete.path(), kStations);
+  std::filesystem::remove(incomplete.path() / "td_pnt.dat");
   const std::string missing = path + "\\missing";
-  const std::string partial = Utf8(incomplete.Path());
+  const std::string partial = incomplete.str();
 
   struct Case {
     std::vector<std::string> args;

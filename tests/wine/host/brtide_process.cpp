@@ -5,7 +5,6 @@
 #include <sstream>
 #include <stdexcept>
 
-#include "tests/wine/common/dll_under_test.h"
 
 namespace br::test {
 
@@ -54,9 +53,15 @@ private:
 }  // namespace
 
 std::wstring BuiltBrtidePath() {
-  std::wstring dll = BuiltDllPath();
-  dll.resize(dll.find_last_of(L"\\/"));
-  return dll + L"\\host\\brtide\\brtide.exe";
+  std::vector<wchar_t> buffer(32768);
+  const DWORD n = GetModuleFileNameW(nullptr, buffer.data(), static_cast<DWORD>(buffer.size()));
+  std::wstring folder(buffer.data(), n);
+  for (std::size_t cut; (cut = folder.find_last_of(L"\\/")) != std::wstring::npos;) {
+    folder.resize(cut);
+    const std::wstring candidate = folder + L"\\host\\brtide\\brtide.exe";
+    if (GetFileAttributesW(candidate.c_str()) != INVALID_FILE_ATTRIBUTES) return candidate;
+  }
+  throw std::runtime_error("brtide.exe not found above the test program");
 }
 
 ProcessResult RunBrtide(const std::vector<std::string>& args) {

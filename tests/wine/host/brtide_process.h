@@ -12,7 +12,7 @@ struct ProcessResult {
   std::string err;  // standard error
 };
 
-// The brtide.exe of the build that holds the BR_Info.dll above the test program.
+// The brtide.exe of the build tree the test program lies in.
 std::wstring BuiltBrtidePath();
 
 // brtide with arguments (UTF-8; each is quoted for the command line).
