@@ -1,2 +1,0 @@
-#include <doctest/doctest.h>
-TEST_CASE("smoke") { CHECK(1 + 1 == 2); }
