@@ -102,6 +102,15 @@ void Tooltip::setFittedText(std::string_view text, int maxWidth) {
   setSize(box.right - box.left + 2 * kTextInset + 2, box.bottom - box.top + 2 * kTextInset);
 }
 
+void Tooltip::shutdown() {
+  // Copied: each popup leaves the list as it goes.
+  const std::vector<Tooltip*> list = tooltips();
+  for (Tooltip* tip : list) DestroyWindow(tip->popup_);
+  if (g_scanTimer) KillTimer(nullptr, g_scanTimer);
+  g_scanTimer = 0;
+  UnregisterClassA(kClassName, ToolkitWindows::moduleInstance());
+}
+
 void Tooltip::startScanning() {
   if (!g_scanTimer) g_scanTimer = SetTimer(nullptr, 0, kScanPeriodMs, &Tooltip::scan);
 }
@@ -124,22 +133,33 @@ bool Tooltip::cursorOverOwner() const {
   return ChildWindowFromPointEx(parent, inParent, CWP_SKIPINVISIBLE) == owner_;
 }
 
+Tooltip* Tooltip::findOwner(HWND hwnd) {
+  for (Tooltip* tip : tooltips()) {
+    if (tip->owner_ == hwnd) return tip;
+  }
+  return nullptr;
+}
+
+Tooltip* Tooltip::underCursor() {
+  POINT cursor{};
+  if (!GetCursorPos(&cursor)) return nullptr;
+  // The innermost component under the cursor: a container's popup must not
+  // shadow those of the components inside it.
+  for (HWND hwnd = WindowFromPoint(cursor); hwnd; hwnd = GetAncestor(hwnd, GA_PARENT)) {
+    Tooltip* tip = findOwner(hwnd);
+    if (tip && tip->cursorOverOwner()) return tip;
+    if (!(GetWindowLongA(hwnd, GWL_STYLE) & WS_CHILD)) break;
+  }
+  return nullptr;
+}
+
 void CALLBACK Tooltip::scan(HWND, UINT, UINT_PTR, DWORD) {
-  // Copied: arming may run window code that adds or removes popups.
+  // Copied: destroying popups changes the list.
   const std::vector<Tooltip*> list = tooltips();
   for (Tooltip* tip : list) {
-    if (!IsWindow(tip->owner_)) {
-      DestroyWindow(tip->popup_);  // a popup lives no longer than its owner window
-      continue;
-    }
+    if (!IsWindow(tip->owner_)) DestroyWindow(tip->popup_);  // a popup lives no longer than its owner
   }
-  const std::vector<Tooltip*> alive = tooltips();
-  for (Tooltip* tip : alive) {
-    if (tip->cursorOverOwner()) {
-      tip->arm();
-      break;
-    }
-  }
+  if (Tooltip* tip = underCursor()) tip->arm();
 }
 
 void Tooltip::arm() {
@@ -150,7 +170,7 @@ void Tooltip::arm() {
 }
 
 void Tooltip::tick() {
-  if (cursorOverOwner() && !mouseButtonDown()) {
+  if (underCursor() == this && !mouseButtonDown()) {
     if (!shown_ && GetTickCount() - armedAt_ > kDelayMs) show();
     return;
   }

@@ -1,9 +1,10 @@
 #pragma once
 // The hover popup that every component window gets: a hidden window of the
 // class "AwtAtl__Tooltip__WindowClass" holding a text and a size. One global
-// timer (50 ms) watches which listed owner window lies under the cursor and arms
-// its popup; the armed popup's own timer (20 ms) shows it after a second of
-// hovering and hides it when the cursor leaves or a mouse button goes down.
+// timer (50 ms) watches which listed owner window lies under the cursor (the
+// innermost one, when components are nested) and arms its popup; the armed
+// popup's own timer (20 ms) shows it after a second of hovering and hides it
+// when the cursor leaves or a mouse button goes down.
 // Before showing, the owner gets WM_NOTIFY (id 0xF001, code 3) so that it can
 // set the text just in time.
 
@@ -33,6 +34,8 @@ public:
   static Tooltip* of(HWND popup);
   static Tooltip* of(const cXComponent& component);
   static size_t count();
+  // For module unload: every popup, the scan timer and the window class go.
+  static void shutdown();
 
   void setText(std::string_view text);
   void setSize(int width, int height);
@@ -61,6 +64,8 @@ private:
   static LRESULT CALLBACK windowProc(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam);
   static void CALLBACK scan(HWND, UINT, UINT_PTR, DWORD);
   static void startScanning();
+  static Tooltip* findOwner(HWND hwnd);
+  static Tooltip* underCursor();
   static void stopScanningWhenIdle();
 
   bool cursorOverOwner() const;

@@ -14,6 +14,7 @@
 #include "toolkit/widgets/Choice.h"
 #include "toolkit/widgets/ContainedWindow.h"
 #include "toolkit/widgets/TabContainer.h"
+#include "toolkit/widgets/cXEdit2.h"
 #include "toolkit/widgets/support/MeasuringDC.h"
 
 using namespace toolkit;
@@ -366,4 +367,31 @@ TEST_CASE("tab container: a click on a tab selects its page") {
   CHECK(tabs.getSelectedPage() == 1);
   CHECK(IsWindowVisible(b.getHandle()));
   CHECK_FALSE(IsWindowVisible(a.getHandle()));
+}
+
+TEST_CASE("tab container: Tab on the strip moves the focus on") {
+  HostWindow host;
+  RecordingPanel panel;
+  mount(panel, host);
+  TabContainer tabs;
+  Panel page;
+  cXEdit2 inside, after;
+  panel.add(&tabs);
+  tabs.setBounds(0, 0, 200, 150, true, true);
+  tabs.add(&page, "Page");
+  page.add(&inside);
+  panel.add(&after);
+  tabs.doLayout();
+  SetFocus(tabs.tabStrip());
+  REQUIRE(GetFocus() == tabs.tabStrip());
+
+  NMTCKEYDOWN down{};
+  down.hdr.hwndFrom = tabs.tabStrip();
+  down.hdr.code = TCN_KEYDOWN;
+  down.wVKey = VK_RIGHT;
+  SendMessageA(tabs.peer()->hwnd(), WM_NOTIFY, 0, reinterpret_cast<LPARAM>(&down));
+  CHECK(GetFocus() == tabs.tabStrip());  // other keys are the strip's
+  down.wVKey = VK_TAB;
+  SendMessageA(tabs.peer()->hwnd(), WM_NOTIFY, 0, reinterpret_cast<LPARAM>(&down));
+  CHECK(GetFocus() == inside.getHandle());
 }

@@ -146,6 +146,36 @@ TEST_CASE("hovering a second shows the popup; leaving hides it") {
   CHECK_FALSE(tip->isShown());
 }
 
+TEST_CASE("nested components: the innermost one under the cursor gets the popup") {
+  REQUIRE(cursorMoves());
+  HostWindow host;
+  RecordingPanel panel;
+  mount(panel, host);
+  TipOwner inner;
+  inner.textToGive = "inner";
+  panel.add(&inner);
+  inner.setBounds(20, 20, 100, 50, true, true);
+  Tooltip* outerTip = Tooltip::of(panel);
+  Tooltip* innerTip = Tooltip::of(inner);
+  REQUIRE(outerTip);
+  REQUIRE(innerTip);
+  outerTip->setFittedText("outer");
+
+  SetCursorPos(150, 150);  // over the inner component
+  pump(1300);
+  CHECK(IsWindowVisible(innerTip->window()));
+  CHECK_FALSE(IsWindowVisible(outerTip->window()));
+  CHECK_FALSE(outerTip->isArmed());
+
+  SetCursorPos(400, 350);  // over the panel only
+  pump(1300);
+  CHECK_FALSE(IsWindowVisible(innerTip->window()));
+  CHECK(IsWindowVisible(outerTip->window()));
+  SetCursorPos(5, 5);
+  pump(100);
+  CHECK_FALSE(IsWindowVisible(outerTip->window()));
+}
+
 TEST_CASE("the tooltip draws its frame, background and text") {
   HostWindow host;
   TipOwner owner;
@@ -214,4 +244,23 @@ TEST_CASE("edit clipboard keys move plain ANSI text") {
   key(h, 'V');
   setModifiers(false, false);
   CHECK(edit.getText() == month);
+}
+
+TEST_CASE("shutting the popups down for unload, and starting again") {
+  HostWindow host;
+  TipOwner first;
+  REQUIRE(first.create(host.hwnd()));
+  HWND popup = first.tooltipWindow();
+  REQUIRE(IsWindow(popup));
+  Tooltip::shutdown();
+  CHECK_FALSE(IsWindow(popup));
+  CHECK(Tooltip::count() == 0);
+  WNDCLASSEXA info{};
+  info.cbSize = sizeof(info);
+  CHECK_FALSE(GetClassInfoExA(GetModuleHandleA(nullptr), Tooltip::kClassName, &info));
+
+  TipOwner second;
+  REQUIRE(second.create(host.hwnd()));
+  CHECK(IsWindow(second.tooltipWindow()));
+  CHECK(Tooltip::count() == 1);
 }
