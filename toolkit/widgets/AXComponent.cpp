@@ -47,7 +47,10 @@ bool AXComponent::hostingAvailable() { return atl().ready; }
 
 bool AXComponent::create(HWND parentHwnd) {
   if (!cXComponent::create(parentHwnd)) return false;
-  if (classId_ != CLSID_NULL && !host_) host();
+  if (classId_ != CLSID_NULL && !hostWindow()) {
+    release();  // a window made again: what was hosted went with the old one
+    host();
+  }
   return true;
 }
 

@@ -188,4 +188,11 @@ TEST_CASE("an AXComponent with a class nobody serves hosts nothing") {
   CHECK(object == nullptr);
   CHECK(ax.create(kTestControl));  // a second class replaces the (missing) first
   CHECK(ax.isHosting());
+
+  ax.destroyWindow();  // the control goes with the window ...
+  CHECK(TestControl::alive == 1);  // ... but the component still holds it
+  REQUIRE(ax.create(panel.getHandle()));  // ... and comes back with a new one
+  CHECK(ax.isHosting());
+  CHECK(ax.hostWindow() != nullptr);
+  CHECK(TestControl::alive == 1);
 }
