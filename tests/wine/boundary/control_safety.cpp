@@ -1,0 +1,128 @@
+// No class of the library is marked safe for scripting or for initialisation: the
+// controls read local files and the registry, so a web page must not be able to drive
+// them unasked. Neither IObjectSafety nor the two component categories may appear,
+// whether asked of an instance, of the class keys, or of the component categories manager.
+#include "tests/wine/common/dll_under_test.h"
+
+#include "BR_Info.h"
+
+#include <comcat.h>
+#include <objsafe.h>
+
+#include <doctest/doctest.h>
+
+#include <string>
+#include <vector>
+
+using br::test::DllUnderTest;
+
+namespace {
+
+struct NamedClass {
+  const char* name;
+  const CLSID* clsid;
+};
+const NamedClass kClasses[] = {
+    {"XObjectInspector", &CLSID_XObjectInspector}, {"TidesDatabase", &CLSID_TidesDatabase},
+    {"TidesPort", &CLSID_TidesPort},               {"TidesPortList", &CLSID_TidesPortList},
+    {"TidesWindow", &CLSID_TidesWindow},           {"XChartLegend", &CLSID_XChartLegend},
+    {"XContoursView", &CLSID_XContoursView},       {"XPICREPView", &CLSID_XPICREPView},
+};
+const CATID* const kSafetyCategories[] = {&CATID_SafeForScripting, &CATID_SafeForInitializing};
+
+std::wstring Text(const GUID& id) {
+  wchar_t text[40] = {};
+  StringFromGUID2(id, text, 40);
+  return text;
+}
+
+bool KeyExists(const std::wstring& path) {
+  HKEY key = nullptr;
+  if (RegOpenKeyExW(HKEY_CLASSES_ROOT, path.c_str(), 0, KEY_READ, &key) != ERROR_SUCCESS) return false;
+  RegCloseKey(key);
+  return true;
+}
+
+// Every subkey name and string value under a key, at any depth.
+void CollectTexts(HKEY parent, const std::wstring& path, std::vector<std::wstring>& out) {
+  HKEY key = nullptr;
+  if (RegOpenKeyExW(parent, path.c_str(), 0, KEY_READ, &key) != ERROR_SUCCESS) return;
+  wchar_t name[256];
+  for (DWORD i = 0;; ++i) {
+    DWORD length = 256;
+    if (RegEnumKeyExW(key, i, name, &length, nullptr, nullptr, nullptr, nullptr) != ERROR_SUCCESS) break;
+    out.push_back(name);
+    CollectTexts(key, name, out);
+  }
+  for (DWORD i = 0;; ++i) {
+    DWORD nameLength = 256, type = 0;
+    BYTE data[1024];
+    DWORD size = sizeof data;
+    if (RegEnumValueW(key, i, name, &nameLength, nullptr, &type, data, &size) != ERROR_SUCCESS) break;
+    out.push_back(name);
+    if (type == REG_SZ) out.push_back(reinterpret_cast<const wchar_t*>(data));
+  }
+  RegCloseKey(key);
+}
+
+bool Mentions(const std::vector<std::wstring>& texts, const std::wstring& clsid) {
+  for (const std::wstring& t : texts) {
+    if (CompareStringW(LOCALE_INVARIANT, NORM_IGNORECASE, t.c_str(), -1, clsid.c_str(), -1) == CSTR_EQUAL) return true;
+    if (t.find(clsid.substr(1, 36)) != std::wstring::npos) return true;
+  }
+  return false;
+}
+
+}  // namespace
+
+TEST_CASE("no instance answers IObjectSafety") {
+  DllUnderTest dll;
+  int created = 0;
+  for (const NamedClass& c : kClasses) {
+    INFO(std::string(c.name));
+    IUnknown* object = nullptr;
+    if (dll.Create(*c.clsid, IID_IUnknown, reinterpret_cast<void**>(&object)) != S_OK) continue;  // not built yet
+    ++created;
+    IObjectSafety* safety = reinterpret_cast<IObjectSafety*>(object);  // overwritten by the answer
+    CHECK(object->QueryInterface(IID_IObjectSafety, reinterpret_cast<void**>(&safety)) == E_NOINTERFACE);
+    CHECK(safety == nullptr);
+    object->Release();
+  }
+  CHECK(created >= 2);
+  CHECK(dll.CanUnloadNow() == S_OK);
+}
+
+TEST_CASE("registered classes carry no safety category, and the categories name none of them") {
+  DllUnderTest dll;
+  REQUIRE(dll.RegisterServer() == S_OK);
+
+  ICatInformation* categories = nullptr;
+  const bool haveManager = SUCCEEDED(CoCreateInstance(CLSID_StdComponentCategoriesMgr, nullptr, CLSCTX_INPROC_SERVER,
+                                                      IID_ICatInformation, reinterpret_cast<void**>(&categories)));
+  int registered = 0;
+  for (const NamedClass& c : kClasses) {
+    INFO(std::string(c.name));
+    const std::wstring clsid = Text(*c.clsid);
+    const std::wstring classKey = L"CLSID\\" + clsid;
+    if (!KeyExists(classKey)) continue;
+    ++registered;
+    for (const CATID* category : kSafetyCategories) {
+      const std::wstring id = Text(*category);
+      CHECK_FALSE(KeyExists(classKey + L"\\Implemented Categories\\" + id));
+      CHECK_FALSE(KeyExists(classKey + L"\\Required Categories\\" + id));
+      std::vector<std::wstring> texts;
+      CollectTexts(HKEY_CLASSES_ROOT, L"Component Categories\\" + id, texts);
+      CHECK_FALSE(Mentions(texts, clsid));
+      if (haveManager) {
+        CATID wanted = *category;
+        CHECK(categories->IsClassOfCategories(*c.clsid, 1, &wanted, static_cast<ULONG>(-1), nullptr) != S_OK);
+      }
+    }
+    std::vector<std::wstring> classTexts;
+    CollectTexts(HKEY_CLASSES_ROOT, classKey, classTexts);
+    for (const CATID* category : kSafetyCategories) CHECK_FALSE(Mentions(classTexts, Text(*category)));
+  }
+  if (categories) categories->Release();
+  CHECK(registered >= 2);
+  CHECK(dll.CanUnloadNow() == S_OK);
+}
