@@ -40,20 +40,20 @@ bool ReadLongitude(const std::string& text, const char* what, double& out, std::
 }  // namespace
 
 std::vector<CommandSpec> BrtideCommands() {
-  const OptionSpec folder{kFolder, 1, "F", "station folder (td_num.ntx, td_crd.ntx, td_pnt.dat)", true};
+  const OptionSpec folder{kFolder, 1, "F", "station folder (td_num.ntx, td_crd.ntx, td_pnt.dat)", true, ""};
   CommandSpec ports{"ports", "list the stations inside a latitude/longitude box", {}};
   ports.options = {
       folder,
-      {kBox, 4, "LATMIN LONMIN LATMAX LONMAX", "the box in decimal degrees, north and east positive", true},
+      {kBox, 4, "LATMIN LONMIN LATMAX LONMAX", "the box in decimal degrees, north and east positive", true, ""},
   };
   CommandSpec day{"day", "one day of tide heights, extremes, sunrise, sunset and twilight at a station", {}};
   day.options = {
       folder,
       {kPort, 1, "N", "station number (as \"ports\" lists it)", false, "station"},
       {kNear, 2, "LAT LON", "the station nearest to a position", false, "station"},
-      {kDate, 1, "YYYY-MM-DD", "the day", true},
-      {kStep, 1, "H", "hours between heights (default 1, from 0.001 to 24)", false},
-      {kCsv, 0, "", "heights as CSV: one row per point with its ISO local time", false},
+      {kDate, 1, "YYYY-MM-DD", "the day", true, ""},
+      {kStep, 1, "H", "hours between heights (default 1, from 0.001 to 24)", false, ""},
+      {kCsv, 0, "", "heights as CSV: one row per point with its ISO local time", false, ""},
   };
   return {ports, day};
 }

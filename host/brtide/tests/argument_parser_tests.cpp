@@ -66,7 +66,7 @@ TEST_CASE("command line mistakes give one clear line each") {
 
 TEST_CASE("an extra output's option joins the day command only") {
   std::vector<CommandSpec> commands = BrtideCommands();
-  AddDayOption(commands, {"--png", 1, "FILE", "picture of the curve", false});
+  AddDayOption(commands, {"--png", 1, "FILE", "picture of the curve", false, ""});
   const ArgumentParser parser(commands);
   const ParseOutcome day = parser.Parse({"day", "--folder", "f", "--port", "3", "--date", "2024-01-01", "--png", "a.png"});
   REQUIRE(day.ok);

@@ -77,7 +77,7 @@ TEST_CASE("a day request names the value that is wrong") {
 
 TEST_CASE("options of extra outputs reach the request untouched") {
   std::vector<CommandSpec> commands = BrtideCommands();
-  AddDayOption(commands, {"--png", 1, "FILE", "", false});
+  AddDayOption(commands, {"--png", 1, "FILE", "", false, ""});
   DayRequest request;
   std::string error;
   REQUIRE(BuildDayRequest(Parsed({"day", "--folder", "w", "--port", "1", "--date", "2024-02-03", "--png", "c.png"}, commands),
