@@ -3,6 +3,7 @@
 // A class joins with one row here (and its library in frame/dll.cmake).
 #include "frame/module/class_rows.h"
 
+#include "tides/controls/tides_window.h"
 #include "tides/objects/tides_database.h"
 #include "tides/objects/tides_port.h"
 
@@ -12,6 +13,7 @@ namespace {
 ClassEntry gRows[] = {
     PlainObjectRow<br::tides::TidesDatabase>(L"TidesDatabase"),
     PlainObjectRow<br::tides::TidesPort>(L"TidesPort"),
+    ControlRow<br::tides::TidesWindow>(L"TidesWindow", 109),
 };
 
 }  // namespace
