@@ -1,0 +1,404 @@
+// TidesWindow's picture, drawn through IViewObject::Draw into memory bitmaps: frame,
+// night/twilight/daylight bands, grid, labels and margins, the curve, the palette.
+#include "tests/wine/controls/graph_test_support.h"
+
+#include <doctest/doctest.h>
+
+#include <algorithm>
+#include <string>
+
+using namespace br::test;
+
+namespace {
+
+// Row 137 lies between height lines 1 (155) and 2 (118), below a curve scaled 0..1 with
+// heights of at least 0.5 (y <= 100).
+constexpr int kBandRow = 137;
+
+void CheckBandRow(const Canvas& canvas, const Layout& layout, int dayFrom, int dayTo, int twilightFrom,
+                  int twilightTo) {
+  br::test::CheckBandRow(canvas, layout, kBandRow, dayFrom, dayTo, twilightFrom, twilightTo);
+}
+
+struct Day {
+  DllUnderTest dll;
+  FakeTidesPort port;
+  GraphControl graph{dll};
+
+  explicit Day(std::vector<double> points = CosineDay()) {
+    port.points = std::move(points);
+    REQUIRE(graph->SetPort(&port) == S_OK);
+    REQUIRE(graph->SetScale(1.0, 0.0) == S_OK);
+    REQUIRE(graph.SetDrawText(0) == S_OK);
+  }
+  HRESULT Finish() {
+    graph.Release();
+    CHECK(port.References() == 0);
+    return dll.CanUnloadNow();
+  }
+};
+
+}  // namespace
+
+TEST_CASE("without a port the frame and the empty night plot are drawn") {
+  DllUnderTest dll;
+  GraphControl graph(dll);
+  Canvas canvas(300, 200);
+  REQUIRE(DrawControl(graph.Get(), canvas) == S_OK);
+  CHECK(canvas.At(1, 1) == kFrameColour);
+  CHECK(canvas.At(298, 198) == kFrameColour);
+  CHECK(canvas.At(4, 100) == kFrameColour);
+  CHECK(canvas.At(150, 196) == kFrameColour);
+  // The 3-D border's outer ring, in the system's shadow and highlight colours.
+  CHECK(canvas.At(0, 100) == GetSysColor(COLOR_BTNSHADOW));
+  CHECK(canvas.At(299, 100) == GetSysColor(COLOR_BTNHIGHLIGHT));
+  // Margins of 8, no grid, no labels, no curve: the plot is night from edge to edge.
+  CHECK(canvas.Count(kNightColour, 8, 8, 292, 192) == 284 * 184);
+  CHECK(canvas.Count(kFrameColour, 1, 1, 299, 199) == 298 * 198 - 284 * 184);
+  graph.Release();
+  CHECK(dll.CanUnloadNow() == S_OK);
+}
+
+TEST_CASE("a day with all four sun events: bands at the sun times, grid over them, curve on top") {
+  Day day;
+  Canvas canvas(300, 200);
+  REQUIRE(DrawControl(day.graph.Get(), canvas) == S_OK);
+  const Layout layout;
+  // Twilight 05:30..18:30 and daylight 06:00..18:00 at x = 8 + trunc(minutes * 284 / 1440).
+  CHECK(layout.XOfHours(5.5) == 73);
+  CHECK(layout.XOfHours(18.0) == 221);
+  CheckBandRow(canvas, layout, layout.XOfHours(6.0), layout.XOfHours(18.0), layout.XOfHours(5.5),
+               layout.XOfHours(18.5));
+  CHECK(canvas.At(40, kBandRow) == kNightColour);
+  CHECK(canvas.At(75, kBandRow) == kTwilightColour);
+  CHECK(canvas.At(100, kBandRow) == kDaylightColour);
+  CHECK(canvas.At(223, kBandRow) == kTwilightColour);
+  CHECK(canvas.At(228, kBandRow) == kNightColour);
+
+  // The curve in colour 10 through every point, and along each segment.
+  const std::vector<double> values = CosineDay();
+  for (int k = 0; k < 25; ++k) {
+    CAPTURE(k);
+    const POINT p = layout.CurvePoint(k, 25, values[k], 1.0, 0.0);
+    CHECK(canvas.At(p.x, p.y) == kCurveColour);
+    if (k > 0) {
+      const POINT q = layout.CurvePoint(k - 1, 25, values[k - 1], 1.0, 0.0);
+      CHECK(canvas.Near((p.x + q.x) / 2, (p.y + q.y) / 2, kCurveColour));
+    }
+  }
+  // Three pixels wide: the pen covers the pixels beside the first point's row.
+  const POINT first = layout.CurvePoint(0, 25, values[0], 1.0, 0.0);
+  CHECK(canvas.At(first.x + 2, first.y + 1) == kCurveColour);
+  CHECK(canvas.At(first.x + 2, first.y - 1) == kCurveColour);
+  CHECK(canvas.Count(kCurveColour, 0, 110, 300, 200) == 0);
+  CHECK(day.Finish() == S_OK);
+}
+
+TEST_CASE("draw text 0: no labels, 8-pixel margins, 23 hour lines and 6 height lines") {
+  Day day(std::vector<double>(25, 0.65));  // a flat curve at y = 72, clear of every line
+  Canvas canvas(300, 200);
+  REQUIRE(DrawControl(day.graph.Get(), canvas) == S_OK);
+  const Layout layout;
+  // Between the border and the plot only frame colour (and the round ends of the curve's
+  // 3-pixel pen): no label anywhere.
+  const auto frameOrCurve = [&](int left, int top, int right, int bottom) {
+    return canvas.Count(kFrameColour, left, top, right, bottom) + canvas.Count(kCurveColour, left, top, right, bottom);
+  };
+  CHECK(frameOrCurve(1, 1, 8, 199) == 7 * 198);
+  CHECK(canvas.Count(kCurveColour, 1, 1, 7, 199) == 0);
+  CHECK(frameOrCurve(292, 1, 299, 199) == 7 * 198);
+  CHECK(canvas.Count(kCurveColour, 294, 1, 299, 199) == 0);
+  CHECK(canvas.Count(kFrameColour, 1, 194, 299, 199) == 298 * 5);
+  CHECK(canvas.Count(kFrameColour, 1, 1, 299, 8) == 298 * 7);
+  CHECK(canvas.At(7, kBandRow) == kFrameColour);
+  CHECK(canvas.At(8, kBandRow) == kNightColour);
+  // 23 hour lines, 2 pixels wide, across the plot's height.
+  int lines = 0;
+  for (int x = 8; x < 292; ++x)
+    if (canvas.At(x, kBandRow) == kFrameColour && canvas.At(x - 1, kBandRow) != kFrameColour) ++lines;
+  CHECK(lines == 23);
+  for (int h = 1; h <= 23; ++h) {
+    CAPTURE(h);
+    const int x = layout.HourLine(h);
+    // The flat curve crosses each line on its rows 71..73.
+    CHECK(canvas.Count(kFrameColour, x, 8, x + 2, 192) == 2 * 184 - 6);
+    CHECK(canvas.Count(kCurveColour, x, 8, x + 2, 192) == 6);
+  }
+  // 6 height lines, 2 pixels high, across the plot's width, at 192 155 118 81 44 8.
+  const int expectedRows[6] = {192, 155, 118, 81, 44, 8};
+  for (int i = 0; i <= 5; ++i) {
+    CAPTURE(i);
+    CHECK(layout.HeightLine(i) == expectedRows[i]);
+    CHECK(canvas.Count(kFrameColour, 8, expectedRows[i], 292, expectedRows[i] + 2) == 2 * 284);
+  }
+  CHECK(canvas.At(40, 72) == kCurveColour);
+  CHECK(day.Finish() == S_OK);
+}
+
+TEST_CASE("the five combinations of sun events") {
+  const Layout layout;
+  SUBCASE("rise and set without twilight: twilight all day around the daylight") {
+    Day day;
+    day.port.twilightBegin.reset();
+    day.port.twilightEnd.reset();
+    Canvas canvas(300, 200);
+    REQUIRE(DrawControl(day.graph.Get(), canvas) == S_OK);
+    CheckBandRow(canvas, layout, layout.XOfHours(6.0), layout.XOfHours(18.0), 8, 292);
+    CHECK(day.Finish() == S_OK);
+  }
+  SUBCASE("twilight without rise and set: only the twilight band") {
+    Day day;
+    day.port.sunrise.reset();
+    day.port.sunset.reset();
+    Canvas canvas(300, 200);
+    REQUIRE(DrawControl(day.graph.Get(), canvas) == S_OK);
+    CheckBandRow(canvas, layout, 0, 0, layout.XOfHours(5.5), layout.XOfHours(18.5));
+    CHECK(day.Finish() == S_OK);
+  }
+  SUBCASE("no event in a northern June: daylight all day") {
+    Day day;
+    day.port.sunrise.reset();
+    day.port.sunset.reset();
+    day.port.twilightBegin.reset();
+    day.port.twilightEnd.reset();
+    day.port.latitude = 78.2;
+    day.port.predictionDate = 45092.0;  // 2023-06-15
+    Canvas canvas(300, 200);
+    REQUIRE(DrawControl(day.graph.Get(), canvas) == S_OK);
+    CheckBandRow(canvas, layout, 8, 292, 0, 0);
+    CHECK(day.Finish() == S_OK);
+  }
+  SUBCASE("no event in a northern December, or a southern June: night all day") {
+    Day day;
+    day.port.sunrise.reset();
+    day.port.sunset.reset();
+    day.port.twilightBegin.reset();
+    day.port.twilightEnd.reset();
+    day.port.latitude = 78.2;
+    day.port.predictionDate = 45275.0;  // 2023-12-15
+    Canvas december(300, 200);
+    REQUIRE(DrawControl(day.graph.Get(), december) == S_OK);
+    CheckBandRow(december, layout, 0, 0, 0, 0);
+    day.port.latitude = -70.0;
+    day.port.predictionDate = 45092.0;
+    Canvas june(300, 200);
+    REQUIRE(DrawControl(day.graph.Get(), june) == S_OK);
+    CheckBandRow(june, layout, 0, 0, 0, 0);
+    day.port.predictionDate = 45275.0;  // the southern summer
+    Canvas southernSummer(300, 200);
+    REQUIRE(DrawControl(day.graph.Get(), southernSummer) == S_OK);
+    CheckBandRow(southernSummer, layout, 8, 292, 0, 0);
+    CHECK(day.Finish() == S_OK);
+  }
+  SUBCASE("any other combination leaves the night") {
+    Day day;
+    day.port.sunset.reset();
+    Canvas canvas(300, 200);
+    REQUIRE(DrawControl(day.graph.Get(), canvas) == S_OK);
+    CheckBandRow(canvas, layout, 0, 0, 0, 0);
+    CHECK(day.Finish() == S_OK);
+  }
+}
+
+TEST_CASE("labels: margins from the font's measures, value labels left, hour labels at 3, 6, ..., 21") {
+  Day day;
+  REQUIRE(day.graph.SetDrawText(1) == S_OK);
+  Canvas canvas(300, 200);
+  REQUIRE(DrawControl(day.graph.Get(), canvas) == S_OK);
+
+  // The margins the default GUI font gives labels "0.00" .. "1.00".
+  const Layout layout = LabelledLayout(nullptr, "1.00", "0.00");
+  CAPTURE(layout.left);
+  CAPTURE(layout.bottom);
+  REQUIRE(layout.left > 8);
+
+  CHECK(canvas.At(layout.left - 1, kBandRow) == kFrameColour);
+  CHECK(canvas.At(layout.left, kBandRow) == kNightColour);
+  const int clear = layout.HourLine(1) + 4;  // no hour label before 3 o'clock
+  CHECK(canvas.At(clear, layout.PlotBottom() - 1) == kNightColour);
+  CHECK(canvas.Count(kFrameColour, layout.HourLine(1), layout.PlotBottom() + 2, layout.HourLine(3), 199) ==
+        (layout.HourLine(3) - layout.HourLine(1)) * (199 - layout.PlotBottom() - 2));
+  CheckBandRow(canvas, layout, layout.XOfHours(6.0), layout.XOfHours(18.0), layout.XOfHours(5.5),
+               layout.XOfHours(18.5));
+  // Text (not frame colour) under each hour line 3, 6, ..., 21 and in the left margin.
+  for (int h = 3; h <= 21; h += 3) {
+    CAPTURE(h);
+    const int x = layout.HourLine(h);
+    const int area = 8 * (199 - layout.PlotBottom() - 2);
+    CHECK(canvas.Count(kFrameColour, x, layout.PlotBottom() + 2, x + 8, 199) < area);
+  }
+  CHECK(canvas.Count(kFrameColour, 1, 1, layout.left, layout.PlotBottom()) <
+        (layout.left - 1) * (layout.PlotBottom() - 1));
+  CHECK(day.Finish() == S_OK);
+}
+
+TEST_CASE("feet labels through IUnitsOption keep the margins and change the value labels") {
+  Day day;
+  REQUIRE(day.graph.SetDrawText(1) == S_OK);
+  REQUIRE(day.graph.SetFormat(L"%.0f") == S_OK);
+  REQUIRE(day.graph->SetScale(10.0, 0.0) == S_OK);
+  IUnitsOption* units = nullptr;
+  REQUIRE(day.graph->QueryInterface(IID_IUnitsOption, reinterpret_cast<void**>(&units)) == S_OK);
+  CHECK(units->SetOption(12345) == S_OK);
+
+  Canvas metres(300, 200);
+  REQUIRE(DrawControl(day.graph.Get(), metres) == S_OK);
+  VARIANT feet;
+  VariantInit(&feet);
+  feet.vt = VT_BSTR;
+  feet.bstrVal = SysAllocString(L"1");  // converted to a number
+  CHECK(units->SetUnits(feet) == S_OK);
+  VariantClear(&feet);
+  Canvas inFeet(300, 200);
+  REQUIRE(DrawControl(day.graph.Get(), inFeet) == S_OK);
+  feet.vt = VT_BSTR;
+  feet.bstrVal = SysAllocString(L"feet");  // no number: refused, feet kept
+  CHECK(units->SetUnits(feet) == E_INVALIDARG);
+  VariantClear(&feet);
+  Canvas stillFeet(300, 200);
+  REQUIRE(DrawControl(day.graph.Get(), stillFeet) == S_OK);
+  feet.vt = VT_I2;
+  feet.iVal = 0;
+  CHECK(units->SetUnits(feet) == S_OK);
+  Canvas metresAgain(300, 200);
+  REQUIRE(DrawControl(day.graph.Get(), metresAgain) == S_OK);
+  units->Release();
+
+  CHECK_FALSE(metres.SamePixels(inFeet));
+  CHECK(inFeet.SamePixels(stillFeet));
+  CHECK(metres.SamePixels(metresAgain));
+  // The plot did not move: only the labels (10 m = 33 ft) differ.
+  for (int x = 40; x < 292; ++x) {
+    if (metres.At(x, kBandRow) != inFeet.At(x, kBandRow)) FAIL("plot differs at x = " << x);
+  }
+  CHECK(day.Finish() == S_OK);
+}
+
+TEST_CASE("a flat scale and a one-point day draw a flat line at mid-height") {
+  const Layout layout;
+  const int mid = 8 + 184 / 2;
+  SUBCASE("maximum equal to minimum") {
+    Day day;
+    REQUIRE(day.graph->SetScale(0.5, 0.5) == S_OK);
+    Canvas canvas(300, 200);
+    REQUIRE(DrawControl(day.graph.Get(), canvas) == S_OK);
+    for (int k = 0; k < 25; ++k) CHECK(canvas.At(8 + k * 284 / 24, mid) == kCurveColour);
+    CHECK(canvas.Count(kCurveColour, 0, 0, 300, mid - 2) == 0);
+    CHECK(canvas.Count(kCurveColour, 0, mid + 3, 300, 200) == 0);
+    CHECK(day.Finish() == S_OK);
+  }
+  SUBCASE("an automatic scale of a constant day") {
+    Day day(std::vector<double>(25, 1.25));
+    REQUIRE(day.graph->SetScale(0.0, -1.0) == S_OK);  // Max 0: automatic, Min ignored
+    Canvas canvas(300, 200);
+    REQUIRE(DrawControl(day.graph.Get(), canvas) == S_OK);
+    CHECK(canvas.At(150, mid) == kCurveColour);
+    CHECK(canvas.Count(kCurveColour, 0, 0, 300, mid - 2) == 0);
+    CHECK(day.Finish() == S_OK);
+  }
+  SUBCASE("one point") {
+    Day day(std::vector<double>{0.3});
+    Canvas canvas(300, 200);
+    REQUIRE(DrawControl(day.graph.Get(), canvas) == S_OK);
+    CHECK(canvas.Count(kCurveColour, 8, mid, 292, mid + 1) == 284);
+    CHECK(canvas.Count(kCurveColour, 0, 0, 300, mid - 2) == 0);
+    CHECK(day.Finish() == S_OK);
+  }
+}
+
+TEST_CASE("the automatic scale spans the day's lowest and highest heights") {
+  Day day;
+  REQUIRE(day.graph->SetScale(0.0, -1.0) == S_OK);
+  Canvas canvas(300, 200);
+  REQUIRE(DrawControl(day.graph.Get(), canvas) == S_OK);
+  const std::vector<double> values = CosineDay();
+  const auto [low, high] = std::minmax_element(values.begin(), values.end());
+  const Layout layout;
+  const int kHigh = static_cast<int>(high - values.begin());
+  const int kLow = static_cast<int>(low - values.begin());
+  CHECK(canvas.Near(layout.CurvePoint(kHigh, 25, *high, *high, *low).x, 8, kCurveColour));
+  CHECK(canvas.Near(layout.CurvePoint(kLow, 25, *low, *high, *low).x, 191, kCurveColour));
+  CHECK(day.Finish() == S_OK);
+}
+
+TEST_CASE("a palette given through IEmbeddedControl recolours every band of every control") {
+  Day day;
+  FakeTidesPort otherPort;
+  otherPort.points = CosineDay();
+  GraphControl other(day.dll);
+  REQUIRE(other->SetPort(&otherPort) == S_OK);
+  REQUIRE(other->SetScale(1.0, 0.0) == S_OK);
+  REQUIRE(other.SetDrawText(0) == S_OK);
+
+  std::vector<COLORREF> palette = InitialPalette();
+  palette[7] = RGB(0x20, 0x30, 0x40);
+  palette[17] = RGB(0xC8, 0x00, 0x00);
+  palette[12] = RGB(0xC8, 0xC8, 0x00);
+  palette[5] = RGB(0xC8, 0x00, 0xC8);
+  palette[10] = RGB(0x00, 0x64, 0xC8);
+  VARIANT fresh = PaletteVariant(palette);
+  CHECK(day.graph.SetPalette(fresh) == S_OK);
+  VariantClear(&fresh);
+
+  Canvas canvas(300, 200);
+  REQUIRE(DrawControl(other.Get(), canvas) == S_OK);  // the other control is recoloured too
+  const Layout layout;
+  CHECK(canvas.At(40, kBandRow) == palette[17]);
+  CHECK(canvas.At(75, kBandRow) == palette[12]);
+  CHECK(canvas.At(100, kBandRow) == palette[5]);
+  CHECK(canvas.At(layout.HourLine(12), kBandRow) == palette[7]);
+  CHECK(canvas.At(4, 100) == palette[7]);
+  const POINT first = layout.CurvePoint(0, 25, CosineDay()[0], 1.0, 0.0);
+  CHECK(canvas.At(first.x, first.y) == palette[10]);
+
+  // Arrays of the wrong length, element size or lower bound leave the palette alone, and
+  // still answer S_OK.
+  std::vector<COLORREF> red(20, RGB(0xFF, 0, 0));
+  VARIANT bad[4] = {PaletteVariant(std::vector<COLORREF>(19, RGB(0xFF, 0, 0))), PaletteVariant(red, VT_I2),
+                    PaletteVariant(red, VT_I4, 1), PaletteVariant(std::vector<COLORREF>(21, RGB(0xFF, 0, 0)))};
+  for (VARIANT& v : bad) {
+    CHECK(day.graph.SetPalette(v) == S_OK);
+    VariantClear(&v);
+  }
+  VARIANT scalar;
+  VariantInit(&scalar);
+  scalar.vt = VT_I4;
+  scalar.lVal = 0xFF;
+  CHECK(day.graph.SetPalette(scalar) == S_OK);
+  Canvas unchanged(300, 200);
+  REQUIRE(DrawControl(other.Get(), unchanged) == S_OK);
+  CHECK(unchanged.SamePixels(canvas));
+
+  // A reference to an array is taken too: back to the first colours.
+  VARIANT initial = PaletteVariant(InitialPalette());
+  VARIANT byReference;
+  VariantInit(&byReference);
+  byReference.vt = VT_ARRAY | VT_I4 | VT_BYREF;
+  byReference.pparray = &initial.parray;
+  CHECK(day.graph.SetPalette(byReference) == S_OK);
+  VariantClear(&initial);
+  Canvas restored(300, 200);
+  REQUIRE(DrawControl(other.Get(), restored) == S_OK);
+  CHECK(restored.At(40, kBandRow) == kNightColour);
+  CHECK(restored.At(100, kBandRow) == kDaylightColour);
+
+  other.Release();
+  CHECK(otherPort.References() == 0);
+  CHECK(day.Finish() == S_OK);
+}
+
+TEST_CASE("drawing at an offset paints the same picture inside the bounds and nothing outside") {
+  Day day;
+  Canvas atOrigin(300, 200);
+  REQUIRE(DrawControl(day.graph.Get(), atOrigin) == S_OK);
+  const COLORREF marker = RGB(0x12, 0x34, 0x56);
+  Canvas large(400, 300, marker);
+  REQUIRE(DrawControl(day.graph.Get(), large, RECT{50, 40, 350, 240}) == S_OK);
+  int differing = 0;
+  for (int y = 0; y < 200; ++y)
+    for (int x = 0; x < 300; ++x)
+      if (large.At(x + 50, y + 40) != atOrigin.At(x, y)) ++differing;
+  CHECK(differing == 0);
+  CHECK(large.Count(marker, 0, 0, 400, 300) == 400 * 300 - 300 * 200);
+  CHECK(day.Finish() == S_OK);
+}

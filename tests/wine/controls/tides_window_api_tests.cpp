@@ -1,0 +1,159 @@
+// TidesWindow's automation interface: SetPort, Calculate, SetScale and Property.
+#include "tests/wine/controls/graph_test_support.h"
+
+#include <doctest/doctest.h>
+
+#include <string>
+
+using namespace br::test;
+
+namespace {
+
+VARIANT Get(ITidesWindow* window, TW_PROPERTY code, HRESULT* result = nullptr) {
+  VARIANT value;
+  VariantInit(&value);
+  const HRESULT hr = window->get_Property(code, &value);
+  if (result) *result = hr;
+  return value;
+}
+
+std::wstring FormatOf(ITidesWindow* window) {
+  VARIANT value = Get(window, TW_FORMATTEXT);
+  REQUIRE(value.vt == VT_BSTR);
+  std::wstring text(value.bstrVal, SysStringLen(value.bstrVal));
+  VariantClear(&value);
+  return text;
+}
+
+long DrawTextOf(ITidesWindow* window) {
+  VARIANT value = Get(window, TW_DRAWTEXT);
+  REQUIRE(value.vt == VT_I4);
+  return value.lVal;
+}
+
+}  // namespace
+
+TEST_CASE("a new graph draws labels with the format %.2f") {
+  DllUnderTest dll;
+  GraphControl graph(dll);
+  CHECK(DrawTextOf(graph.Get()) == 1);
+  CHECK(FormatOf(graph.Get()) == L"%.2f");
+  HRESULT hr = S_OK;
+  VARIANT other = Get(graph.Get(), static_cast<TW_PROPERTY>(3), &hr);
+  CHECK(hr == E_INVALIDARG);
+  CHECK(other.vt == VT_EMPTY);
+  CHECK(graph->get_Property(TW_DRAWTEXT, nullptr) == E_INVALIDARG);
+  graph.Release();
+  CHECK(dll.CanUnloadNow() == S_OK);
+}
+
+TEST_CASE("TW_DRAWTEXT takes VT_I4, VT_I2 sign-extended and VT_UI1 zero-extended") {
+  DllUnderTest dll;
+  GraphControl graph(dll);
+  VARIANT v;
+  VariantInit(&v);
+  v.vt = VT_UI1;
+  v.bVal = 255;
+  CHECK(graph->put_Property(TW_DRAWTEXT, v) == S_OK);
+  CHECK(DrawTextOf(graph.Get()) == 255);
+  v.vt = VT_I2;
+  v.iVal = -1;
+  CHECK(graph->put_Property(TW_DRAWTEXT, v) == S_OK);
+  CHECK(DrawTextOf(graph.Get()) == -1);
+  v.vt = VT_I4;
+  v.lVal = 0;
+  CHECK(graph->put_Property(TW_DRAWTEXT, v) == S_OK);
+  CHECK(DrawTextOf(graph.Get()) == 0);
+  // Other types, by-reference forms and unknown codes change nothing.
+  v.vt = VT_R8;
+  v.dblVal = 1.0;
+  CHECK(graph->put_Property(TW_DRAWTEXT, v) == E_INVALIDARG);
+  LONG referenced = 5;
+  v.vt = VT_I4 | VT_BYREF;
+  v.plVal = &referenced;
+  CHECK(graph->put_Property(TW_DRAWTEXT, v) == E_INVALIDARG);
+  v.vt = VT_I4;
+  v.lVal = 7;
+  CHECK(graph->put_Property(static_cast<TW_PROPERTY>(0), v) == E_INVALIDARG);
+  CHECK(graph->put_Property(static_cast<TW_PROPERTY>(3), v) == E_INVALIDARG);
+  CHECK(DrawTextOf(graph.Get()) == 0);
+  graph.Release();
+  CHECK(dll.CanUnloadNow() == S_OK);
+}
+
+TEST_CASE("TW_FORMATTEXT keeps one floating conversion and refuses anything else") {
+  DllUnderTest dll;
+  GraphControl graph(dll);
+  CHECK(graph.SetFormat(L"%.1f m") == S_OK);
+  CHECK(FormatOf(graph.Get()) == L"%.1f m");
+  CHECK(graph.SetFormat(L"") == S_OK);  // empty selects the default
+  CHECK(FormatOf(graph.Get()) == L"%.2f");
+  CHECK(graph.SetFormat(L"%+08.3e%%") == S_OK);
+  for (const wchar_t* bad : {L"%s", L"%n", L"%d", L"%.2f %.2f", L"%", L"%lf", L"no number", L"%*f"}) {
+    CAPTURE(std::wstring(bad));
+    CHECK(graph.SetFormat(bad) == E_INVALIDARG);
+    CHECK(FormatOf(graph.Get()) == L"%+08.3e%%");  // the previous format is kept
+  }
+  VARIANT v;
+  VariantInit(&v);
+  v.vt = VT_I4;
+  v.lVal = 2;
+  CHECK(graph->put_Property(TW_FORMATTEXT, v) == E_INVALIDARG);
+  v.vt = VT_BSTR;
+  v.bstrVal = nullptr;  // a null BSTR is the empty string
+  CHECK(graph->put_Property(TW_FORMATTEXT, v) == S_OK);
+  CHECK(FormatOf(graph.Get()) == L"%.2f");
+  graph.Release();
+  CHECK(dll.CanUnloadNow() == S_OK);
+}
+
+TEST_CASE("SetPort: S_FALSE for null, E_INVALIDARG for a non-port, the old port released") {
+  DllUnderTest dll;
+  FakeTidesPort first;
+  FakeTidesPort second;
+  NotAPort stranger;
+  GraphControl graph(dll);
+  CHECK(graph->SetPort(&first) == S_OK);
+  CHECK(first.References() == 1);
+  CHECK(graph->SetPort(&second) == S_OK);
+  CHECK(first.References() == 0);
+  CHECK(second.References() == 1);
+  CHECK(graph->SetPort(&stranger) == E_INVALIDARG);
+  CHECK(second.References() == 0);
+  CHECK(stranger.References() == 0);
+  // No port now: Calculate forwards nothing and still answers S_OK.
+  CHECK(graph->Calculate(1.0, 45000.0) == S_OK);
+  CHECK(graph->SetPort(&first) == S_OK);
+  CHECK(graph->SetPort(nullptr) == S_FALSE);
+  CHECK(first.References() == 0);
+  CHECK(first.calculateCalls == 0);
+  graph.Release();
+  CHECK(dll.CanUnloadNow() == S_OK);
+}
+
+TEST_CASE("Calculate forwards step and date to the port; SetScale 0 keeps the automatic scale") {
+  DllUnderTest dll;
+  FakeTidesPort port;
+  port.points = CosineDay();
+  GraphControl graph(dll);
+  REQUIRE(graph->SetPort(&port) == S_OK);
+  CHECK(graph->Calculate(0.25, 45123.75) == S_OK);
+  CHECK(port.calculateCalls == 1);
+  CHECK(port.lastStep == 0.25);
+  CHECK(port.lastDate == 45123.75);
+
+  REQUIRE(graph.SetDrawText(0) == S_OK);
+  Canvas automatic(300, 200);
+  REQUIRE(DrawControl(graph.Get(), automatic) == S_OK);
+  CHECK(graph->SetScale(0.0, -1.0) == S_OK);  // Min is ignored while Max is 0
+  Canvas stillAutomatic(300, 200);
+  REQUIRE(DrawControl(graph.Get(), stillAutomatic) == S_OK);
+  CHECK(automatic.SamePixels(stillAutomatic));
+  CHECK(graph->SetScale(2.0, -1.0) == S_OK);
+  Canvas fixed(300, 200);
+  REQUIRE(DrawControl(graph.Get(), fixed) == S_OK);
+  CHECK_FALSE(fixed.SamePixels(automatic));
+  graph.Release();
+  CHECK(port.References() == 0);
+  CHECK(dll.CanUnloadNow() == S_OK);
+}
