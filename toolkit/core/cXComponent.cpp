@@ -409,7 +409,8 @@ int cXComponent::onPaint(ToolkitEvent& event) {
 void cXComponent::paint(HDC) {}
 
 void cXComponent::focusIfSource(const ToolkitEvent& event) {
-  if (event.source == this && isValid() && GetFocus() != peer_->hwnd()) requestFocus();
+  // hasHandle also covers a native control that speaks for this component.
+  if (event.source == this && isValid() && !hasHandle(GetFocus())) requestFocus();
 }
 
 int cXComponent::dispatchEvent(ToolkitEvent& event) {

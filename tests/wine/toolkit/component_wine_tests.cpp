@@ -103,6 +103,35 @@ TEST_CASE("create makes a child window of the toolkit class with the component s
   CHECK(c.peer()->hwnd() == nullptr);
 }
 
+namespace {
+LRESULT CALLBACK strayProc(HWND h, UINT m, WPARAM w, LPARAM l) { return DefWindowProcA(h, m, w, l); }
+}  // namespace
+
+TEST_CASE("a class left behind with another procedure is replaced; classes can be unregistered") {
+  WNDCLASSEXA stray{};
+  stray.cbSize = sizeof(stray);
+  stray.lpfnWndProc = strayProc;
+  stray.hInstance = ToolkitWindows::moduleInstance();
+  stray.lpszClassName = "Brine_AWTATL7";
+  REQUIRE(RegisterClassExA(&stray));
+  REQUIRE(ToolkitWindows::registerClass(7));
+  WNDCLASSEXA info{};
+  info.cbSize = sizeof(info);
+  REQUIRE(GetClassInfoExA(ToolkitWindows::moduleInstance(), "Brine_AWTATL7", &info));
+  const bool replaced = info.lpfnWndProc == &ToolkitWindows::windowProc;
+  CHECK(replaced);
+  CHECK(ToolkitWindows::className(12) == "Brine_AWTATL12");
+
+  ToolkitWindows::unregisterClasses();
+  CHECK_FALSE(GetClassInfoExA(ToolkitWindows::moduleInstance(), "Brine_AWTATL7", &info));
+  CHECK_FALSE(GetClassInfoExA(ToolkitWindows::moduleInstance(), "Brine_AWTATL1", &info));
+  // The next window registers its class again.
+  HostWindow host;
+  cXComponent c;
+  CHECK(c.create(host.hwnd()));
+  CHECK(GetClassInfoExA(ToolkitWindows::moduleInstance(), "Brine_AWTATL1", &info));
+}
+
 TEST_CASE("bounds setters move the window and keep the bounds field") {
   HostWindow host;
   cXComponent c;

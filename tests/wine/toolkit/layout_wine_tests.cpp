@@ -233,6 +233,21 @@ TEST_CASE("nothing is laid out without a layout, children or a client area") {
   empty.doLayout();
 }
 
+TEST_CASE("a batch the platform refuses falls back to immediate moves for the rest of the pass") {
+  Tree t(std::make_unique<GridLayout>(1, 3, 0, 0, nullptr, 68), 300, 60);
+  Probe& a = t.add(10, 10);
+  Probe& b = t.add(10, 10);
+  Probe& c = t.add(10, 10);
+  HDWP stale = BeginDeferWindowPos(3);
+  REQUIRE(stale != nullptr);
+  EndDeferWindowPos(stale);  // freed: DeferWindowPos refuses it
+  t.root.layoutStep(stale);
+  CHECK(stale == nullptr);
+  CHECK_PLACED(a, 0, 0, 100, 60);
+  CHECK_PLACED(b, 100, 0, 100, 60);
+  CHECK_PLACED(c, 200, 0, 100, 60);
+}
+
 TEST_CASE("the layout slots can be driven directly; a null batch moves at once") {
   Tree t(std::make_unique<BorderLayout>(2, 2), 300, 200);
   Probe& n = t.add(10, 30, "North");
