@@ -1,0 +1,39 @@
+#include <doctest/doctest.h>
+
+#include "toolkit/table/logic/CellKinds.h"
+
+#include <string>
+
+using namespace toolkit;
+using namespace toolkit::table;
+
+TEST_CASE("kinds outside 2..8 are text columns") {
+  CHECK(normalizeKind(0) == kCellText);
+  CHECK(normalizeKind(9) == kCellText);
+  CHECK(normalizeKind(-3) == kCellText);
+  for (int kind = 2; kind <= 8; ++kind) CHECK(normalizeKind(kind) == kind);
+}
+
+TEST_CASE("each kind's cell table has its named cell column and User data") {
+  struct Expect {
+    int kind;
+    const char* name;
+    ColumnType storage;
+  };
+  const Expect expected[] = {
+      {1, "Cell data (text)", ColumnType::Text},       {2, "Cell data (long)", ColumnType::Integer},
+      {3, "Cell data (double)", ColumnType::Double},   {4, "Cell data (bool)", ColumnType::Integer},
+      {5, "Cell data (state)", ColumnType::Integer},   {6, "Cell data (Latitude)", ColumnType::Double},
+      {7, "Cell data (Longitud)", ColumnType::Double}, {8, "Cell data (datetime)", ColumnType::Double},
+      {0, "Cell data (text)", ColumnType::Text},
+  };
+  for (const Expect& e : expected) {
+    CAPTURE(e.kind);
+    auto cells = makeCellTable(e.kind);
+    REQUIRE(cells->columnCount() == 2);
+    CHECK(cells->columnName(0) == std::string(e.name));
+    CHECK(cells->columnType(0) == e.storage);
+    CHECK(cells->columnName(1) == "User data");
+    CHECK(cells->columnType(1) == ColumnType::Integer);
+  }
+}
