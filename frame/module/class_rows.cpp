@@ -3,6 +3,7 @@
 // A class joins with one row here (and its library in frame/dll.cmake).
 #include "frame/module/class_rows.h"
 
+#include "tides/controls/TidesPortList.h"
 #include "tides/controls/tides_window.h"
 #include "tides/objects/tides_database.h"
 #include "tides/objects/tides_port.h"
@@ -13,6 +14,7 @@ namespace {
 ClassEntry gRows[] = {
     PlainObjectRow<br::tides::TidesDatabase>(L"TidesDatabase"),
     PlainObjectRow<br::tides::TidesPort>(L"TidesPort"),
+    ControlRow<br::tides::TidesPortList>(L"TidesPortList", 107),
     ControlRow<br::tides::TidesWindow>(L"TidesWindow", 109),
 };
 
