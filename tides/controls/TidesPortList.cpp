@@ -151,7 +151,7 @@ void TidesPortList::BuildContent(HWND window) {
   auto panel = std::make_unique<TidesPortListPanel>(relay_);
   if (!panel->create(window)) return;
   panel_ = std::move(panel);
-  LayOut();
+  LayOut(window);  // Window() is not set yet while the window is being made
   if (!ports_.empty()) Fill();
 }
 
@@ -162,8 +162,7 @@ void TidesPortList::DestroyContent() {
   panel.reset();
 }
 
-void TidesPortList::LayOut() {
-  const HWND window = Window();
+void TidesPortList::LayOut(HWND window) {
   if (!panel_ || !window) return;
   RECT client{};
   GetClientRect(window, &client);
@@ -181,7 +180,7 @@ bool TidesPortList::OnMessage(HWND window, UINT message, WPARAM wParam, LPARAM, 
       ClearPorts();
       return false;
     case WM_SIZE:
-      LayOut();
+      LayOut(window);
       result = 0;
       return true;
     case WM_ERASEBKGND: {
@@ -230,7 +229,7 @@ HRESULT TidesPortList::SetFont(IFont* font) {
   toolkit::Table& table = panel_->table();
   table.autoSizeColumn(0, -1);
   table.setDisplayWidth(table.getColumnWidth(0));
-  LayOut();
+  LayOut(Window());
   if (const HWND window = Window()) InvalidateRect(window, nullptr, TRUE);
   return S_OK;
 }

@@ -53,7 +53,7 @@ private:
   void ClearPorts();
   void TakePorts(const VARIANT& portList);
   void Fill();
-  void LayOut();
+  void LayOut(HWND window);
 
   std::vector<IUnknown*> ports_;
   SelectionRelay relay_{*this};

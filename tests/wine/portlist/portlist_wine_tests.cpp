@@ -1,0 +1,346 @@
+// TidesPortList made from the built DLL: the port list's VARIANT forms, the rows and
+// their order, SelectChanged from filling, clicks and keys, Selected, the erase
+// colour, sinks that re-enter, and the module lock at the end.
+#include "tests/wine/common/dll_under_test.h"
+#include "tests/wine/controls/atl_host.h"
+#include "tests/wine/portlist/named_port.h"
+
+#include "BR_Info.h"
+#include "BR_Private.h"
+
+#include <doctest/doctest.h>
+
+#include <olectl.h>
+
+#include <string>
+#include <vector>
+
+using namespace br::test;
+
+namespace {
+
+SAFEARRAY* UnknownArray(const std::vector<IUnknown*>& items, LONG lower = 0) {
+  SAFEARRAYBOUND bound{static_cast<ULONG>(items.size()), lower};
+  SAFEARRAY* array = SafeArrayCreate(VT_UNKNOWN, 1, &bound);
+  for (LONG i = 0; i < static_cast<LONG>(items.size()); ++i) {
+    LONG index = lower + i;
+    SafeArrayPutElement(array, &index, items[i]);
+  }
+  return array;
+}
+
+VARIANT ArrayVariant(SAFEARRAY* array) {
+  VARIANT v;
+  VariantInit(&v);
+  v.vt = VT_ARRAY | VT_UNKNOWN;
+  v.parray = array;
+  return v;
+}
+
+VARIANT UnknownVariant(IUnknown* item) {
+  VARIANT v;
+  VariantInit(&v);
+  v.vt = VT_UNKNOWN;
+  v.punkVal = item;
+  return v;
+}
+
+HWND FindByClass(HWND parent, const char* name) {
+  for (HWND child = GetWindow(parent, GW_CHILD); child; child = GetWindow(child, GW_HWNDNEXT)) {
+    char found[64] = {};
+    GetClassNameA(child, found, sizeof found);
+    if (std::string(found) == name) return child;
+    if (HWND deeper = FindByClass(child, name)) return deeper;
+  }
+  return nullptr;
+}
+
+// The table's row height: its font's text height plus 6.
+int RowHeight(HWND table) {
+  HGDIOBJ font = reinterpret_cast<HGDIOBJ>(SendMessageA(table, WM_GETFONT, 0, 0));
+  HDC dc = GetDC(nullptr);
+  HGDIOBJ old = SelectObject(dc, font ? font : GetStockObject(DEFAULT_GUI_FONT));
+  TEXTMETRICA metrics{};
+  GetTextMetricsA(dc, &metrics);
+  SelectObject(dc, old);
+  ReleaseDC(nullptr, dc);
+  return metrics.tmHeight + 6;
+}
+
+std::wstring SelectedName(ITidesPortList* list) {
+  IUnknown* port = nullptr;
+  REQUIRE(list->get_Selected(&port) == S_OK);
+  const std::wstring name = NameOf(port);
+  if (port) port->Release();
+  return name;
+}
+
+// A list made from the DLL; hosted in a window on demand.
+struct PortList {
+  DllUnderTest dll;
+  AtlHost atl;
+  ITidesPortList* list = nullptr;
+  HWND host = nullptr;
+  IUnknown* site = nullptr;
+  HWND window = nullptr;
+  HWND table = nullptr;
+  SelectSink sink;
+
+  PortList() {
+    REQUIRE(dll.Create(CLSID_TidesPortList, &list) == S_OK);
+    REQUIRE(sink.Connect(list));
+  }
+  ~PortList() { Finish(); }
+
+  void Host() {
+    host = AtlHost::MakeWindow(300, 200);
+    REQUIRE(atl.Attach(list, host, &site) == S_OK);
+    IOleWindow* ole = nullptr;
+    REQUIRE(list->QueryInterface(IID_IOleWindow, reinterpret_cast<void**>(&ole)) == S_OK);
+    ole->GetWindow(&window);
+    ole->Release();
+    REQUIRE(window != nullptr);
+    table = FindByClass(window, "Brine_AWTATL44");
+    REQUIRE(table != nullptr);
+    RECT tableRect{};
+    GetClientRect(table, &tableRect);
+    CHECK(tableRect.bottom > 150);  // laid out over the control
+  }
+
+  void Click(int displayRow) {
+    const int h = RowHeight(table);
+    const LPARAM at = MAKELPARAM(20, h * (displayRow + 1) + h / 2);
+    SendMessageA(table, WM_LBUTTONDOWN, MK_LBUTTON, at);
+    SendMessageA(table, WM_LBUTTONUP, 0, at);
+  }
+
+  HRESULT Finish() {
+    if (!list) return dll.CanUnloadNow();
+    sink.Disconnect();
+    if (host) DestroyWindow(host);
+    host = nullptr;
+    ReleaseAndNull(site);
+    ReleaseAndNull(list);
+    return dll.CanUnloadNow();
+  }
+};
+
+}  // namespace
+
+TEST_CASE("the list's VARIANT forms before any window") {
+  NamedPort havre(L"Le Havre"), anvers(L"Anvers");
+  PortList p;
+  IUnknown* selected = reinterpret_cast<IUnknown*>(1);
+  CHECK(p.list->get_Selected(&selected) == S_OK);
+  CHECK(selected == nullptr);
+  CHECK(p.list->get_Selected(nullptr) == E_POINTER);
+
+  SAFEARRAY* array = UnknownArray({&havre, &anvers}, 3);
+  CHECK(p.list->SetPortList(ArrayVariant(array)) == S_OK);
+  CHECK(havre.References() == 2);  // the array's and the list's
+  CHECK(p.sink.names.empty());     // no window: nothing selected, nothing fired
+  CHECK(SelectedName(p.list).empty());
+
+  VARIANT empty;
+  VariantInit(&empty);
+  CHECK(p.list->SetPortList(empty) == S_OK);
+  CHECK(havre.References() == 1);
+
+  // A single port, a null one, dispatch and by-reference forms.
+  CHECK(p.list->SetPortList(UnknownVariant(&havre)) == S_OK);
+  CHECK(havre.References() == 2);
+  CHECK(p.list->SetPortList(UnknownVariant(nullptr)) == S_OK);
+  CHECK(havre.References() == 1);
+  VARIANT dispatch;
+  dispatch.vt = VT_DISPATCH;
+  dispatch.pdispVal = &havre;
+  CHECK(p.list->SetPortList(dispatch) == S_OK);
+  CHECK(havre.References() == 1);
+  VARIANT byRef;
+  byRef.vt = VT_BYREF | VT_ARRAY | VT_UNKNOWN;
+  byRef.pparray = &array;
+  CHECK(p.list->SetPortList(byRef) == S_OK);
+  CHECK(havre.References() == 1);
+
+  // An array whose elements are not pointer-sized is refused.
+  SAFEARRAY* shorts = SafeArrayCreateVector(VT_I2, 0, 4);
+  CHECK(p.list->SetPortList(ArrayVariant(shorts)) == S_OK);
+  SafeArrayDestroy(shorts);
+  CHECK(p.list->SetPortList(ArrayVariant(nullptr)) == S_OK);
+
+  SafeArrayDestroy(array);
+  CHECK(havre.References() == 0);
+  CHECK(p.Finish() == S_OK);
+}
+
+TEST_CASE("three ports in a window: shown by name, the first selected and fired once") {
+  NamedPort havre(L"Le Havre"), anvers(L"Anvers"), brest(L"Brest");
+  PortList p;
+  p.Host();
+  SAFEARRAY* array = UnknownArray({&havre, &anvers, &brest});
+  CHECK(p.list->SetPortList(ArrayVariant(array)) == S_OK);
+  SafeArrayDestroy(array);
+  REQUIRE(p.sink.names.size() == 1);
+  CHECK(p.sink.names[0] == L"Anvers");
+  CHECK(p.sink.types[0] == VT_DISPATCH);
+  CHECK(SelectedName(p.list) == L"Anvers");
+
+  // Rows are mapped through their row data, whatever the order shown.
+  p.Click(2);
+  REQUIRE(p.sink.names.size() == 2);
+  CHECK(p.sink.names[1] == L"Le Havre");
+  CHECK(SelectedName(p.list) == L"Le Havre");
+  p.Click(1);
+  CHECK(p.sink.names.back() == L"Brest");
+  p.Click(1);  // the same row: no change, no event
+  CHECK(p.sink.names.size() == 3);
+
+  // Keys: Up and Down move through the shown order.
+  SendMessageA(p.table, WM_KEYDOWN, VK_UP, 1);
+  CHECK(p.sink.names.back() == L"Anvers");
+  SendMessageA(p.table, WM_KEYDOWN, VK_DOWN, 1);
+  SendMessageA(p.table, WM_KEYDOWN, VK_DOWN, 1);
+  CHECK(p.sink.names.back() == L"Le Havre");
+  CHECK(p.sink.names.size() == 6);
+
+  // Replacing the list with nothing empties the table: nothing is selected.
+  VARIANT empty;
+  VariantInit(&empty);
+  CHECK(p.list->SetPortList(empty) == S_OK);
+  CHECK(SelectedName(p.list).empty());
+  CHECK(p.sink.names.size() == 6);
+  CHECK(havre.References() == 0);
+  CHECK(p.Finish() == S_OK);
+}
+
+TEST_CASE("a single port shows one row and fires once; entries that are no ports keep their index") {
+  NamedPort havre(L"Le Havre"), brest(L"Brest");
+  NotAPort stranger;
+  PortList p;
+  p.Host();
+  CHECK(p.list->SetPortList(UnknownVariant(&brest)) == S_OK);
+  REQUIRE(p.sink.names.size() == 1);
+  CHECK(p.sink.names[0] == L"Brest");
+  p.Click(1);  // no second row
+  CHECK(p.sink.names.size() == 1);
+
+  SAFEARRAY* array = UnknownArray({&havre, &stranger, nullptr, &brest});
+  CHECK(p.list->SetPortList(ArrayVariant(array)) == S_OK);
+  SafeArrayDestroy(array);
+  CHECK(stranger.References() == 1);  // kept, though not shown
+  REQUIRE(p.sink.names.size() == 2);
+  CHECK(p.sink.names[1] == L"Brest");
+  p.Click(1);
+  CHECK(p.sink.names.back() == L"Le Havre");
+  p.Click(2);  // only two rows
+  CHECK(p.sink.names.size() == 3);
+  CHECK(p.Finish() == S_OK);
+  CHECK(stranger.References() == 0);
+}
+
+TEST_CASE("ports set before the window fill the table when it is made") {
+  NamedPort havre(L"Le Havre"), anvers(L"Anvers");
+  PortList p;
+  SAFEARRAY* array = UnknownArray({&havre, &anvers});
+  p.list->SetPortList(ArrayVariant(array));
+  SafeArrayDestroy(array);
+  CHECK(p.sink.names.empty());
+  p.Host();
+  REQUIRE(p.sink.names.size() == 1);
+  CHECK(p.sink.names[0] == L"Anvers");
+  CHECK(SelectedName(p.list) == L"Anvers");
+  CHECK(p.Finish() == S_OK);
+  CHECK(havre.References() == 0);
+}
+
+TEST_CASE("navigation keys given to the accelerator translation reach the focused table") {
+  NamedPort havre(L"Le Havre"), anvers(L"Anvers"), brest(L"Brest");
+  PortList p;
+  p.Host();
+  SAFEARRAY* array = UnknownArray({&havre, &anvers, &brest});
+  p.list->SetPortList(ArrayVariant(array));
+  SafeArrayDestroy(array);
+  SetFocus(p.table);
+  IOleInPlaceActiveObject* active = nullptr;
+  REQUIRE(p.list->QueryInterface(IID_IOleInPlaceActiveObject, reinterpret_cast<void**>(&active)) == S_OK);
+  MSG down{p.table, WM_KEYDOWN, VK_DOWN, 1, 0, {0, 0}};
+  CHECK(active->TranslateAccelerator(&down) == S_OK);
+  CHECK(p.sink.names.back() == L"Brest");
+  MSG letter{p.table, WM_KEYDOWN, 'A', 1, 0, {0, 0}};
+  CHECK(active->TranslateAccelerator(&letter) == S_FALSE);
+  MSG up{p.table, WM_KEYUP, VK_DOWN, 1, 0, {0, 0}};
+  CHECK(active->TranslateAccelerator(&up) == S_OK);
+  active->Release();
+  CHECK(p.Finish() == S_OK);
+}
+
+TEST_CASE("sinks that replace the list or disconnect while being called") {
+  NamedPort havre(L"Le Havre"), anvers(L"Anvers");
+  PortList p;
+  p.Host();
+  p.sink.onCall = [&] {
+    VARIANT empty;
+    VariantInit(&empty);
+    p.list->SetPortList(empty);
+  };
+  SAFEARRAY* array = UnknownArray({&havre, &anvers});
+  CHECK(p.list->SetPortList(ArrayVariant(array)) == S_OK);
+  CHECK(p.sink.names.size() == 1);
+  CHECK(havre.References() == 1);  // the array's only
+  CHECK(SelectedName(p.list).empty());
+
+  p.sink.onCall = [&] { p.sink.Disconnect(); };
+  CHECK(p.list->SetPortList(ArrayVariant(array)) == S_OK);
+  CHECK(p.sink.names.size() == 2);
+  p.Click(1);
+  CHECK(p.sink.names.size() == 2);
+  SafeArrayDestroy(array);
+  CHECK(p.Finish() == S_OK);
+}
+
+TEST_CASE("the background is palette colour 7; the preferred size is 300 x 200") {
+  PortList p;
+  p.Host();
+  IEmbeddedControl* embedded = nullptr;
+  REQUIRE(p.list->QueryInterface(IID_IEmbeddedControl, reinterpret_cast<void**>(&embedded)) == S_OK);
+  SAFEARRAY* colours = SafeArrayCreateVector(VT_I4, 0, 20);
+  for (LONG i = 0; i < 20; ++i) {
+    LONG value = RGB(10 * i, 3, 5);
+    SafeArrayPutElement(colours, &i, &value);
+  }
+  VARIANT palette;
+  palette.vt = VT_ARRAY | VT_I4;
+  palette.parray = colours;
+  CHECK(embedded->SetPalette(palette) == S_OK);
+  SafeArrayDestroy(colours);
+  long width = 0, height = 0;
+  CHECK(embedded->GetPreferredSize(&width, &height) == S_OK);
+  CHECK(width == 300);
+  CHECK(height == 200);
+  CHECK(embedded->GetPreferredSize(nullptr, &height) == E_POINTER);
+
+  HDC screen = GetDC(nullptr);
+  HDC dc = CreateCompatibleDC(screen);
+  HBITMAP bitmap = CreateCompatibleBitmap(screen, 300, 200);
+  ReleaseDC(nullptr, screen);
+  HGDIOBJ old = SelectObject(dc, bitmap);
+  CHECK(SendMessageA(p.window, WM_ERASEBKGND, reinterpret_cast<WPARAM>(dc), 0) != 0);
+  CHECK(GetPixel(dc, 5, 5) == RGB(70, 3, 5));
+  CHECK(GetPixel(dc, 299, 199) == RGB(70, 3, 5));
+  SelectObject(dc, old);
+  DeleteObject(bitmap);
+  DeleteDC(dc);
+
+  // A font through slot 3 keeps the table working.
+  FONTDESC description{sizeof(FONTDESC), const_cast<LPOLESTR>(L"Tahoma"), {120000, 0}, FW_BOLD, ANSI_CHARSET,
+                       FALSE, FALSE, FALSE};
+  IFont* font = nullptr;
+  REQUIRE(OleCreateFontIndirect(&description, IID_IFont, reinterpret_cast<void**>(&font)) == S_OK);
+  CHECK(embedded->SetFont(0, font, 0) == S_OK);
+  CHECK(SendMessageA(p.table, WM_GETFONT, 0, 0) != 0);
+  embedded->Release();
+  // The font object may go once the control has let go of its handle.
+  p.Finish();
+  font->Release();
+  CHECK(p.dll.CanUnloadNow() == S_OK);
+}
