@@ -174,7 +174,8 @@ int Table::appendRowText(int column, const char* text, int userData) {
   const int row = rowCount_++;
   setCellText(column, row, text);
   setUserData(column, row, userData);
-  updateScrollBars();
+  // Filling thousands of rows must not set the scroll bars thousands of times.
+  scrollBarsStale_ = true;
   invalidate();
   return row;
 }
@@ -385,9 +386,11 @@ void Table::setBoolColors(int pair, int background, int foreground) {
 }
 
 int Table::getRowHeight() const {
+  if (rowHeight_ > 0) return rowHeight_;
   MeasuringDC dc(getFont());
   const int textHeight = dc.valid() ? static_cast<int>(dc.metrics().tmHeight) : 13;
-  return textHeight + 6;
+  rowHeight_ = textHeight + 6;
+  return rowHeight_;
 }
 
 int Table::displayRowCount() const {

@@ -178,6 +178,7 @@ public:
   int onEraseBackground(ToolkitEvent& event) override;
   int onSetCursor(ToolkitEvent& event) override;
   void lendFont(HFONT font) override;
+  bool setFontIndirect(const LOGFONTA& font) override;
 
 private:
   DataTable* cellsOf(int column) const;
@@ -224,6 +225,8 @@ private:
   int resizeStartX_ = 0;
   int resizeStartWidth_ = 0;
   int pressedHeader_ = -1;
+  mutable int rowHeight_ = 0;     // cached; 0 = measure again
+  bool scrollBarsStale_ = false;  // rows were added since the scroll bars were set
   std::unique_ptr<cXEdit2> editor_;
   bool editing_ = false;
   int editRow_ = -1;

@@ -333,8 +333,18 @@ int Table::onEraseBackground(ToolkitEvent& event) {
   return 1;
 }
 
+bool Table::setFontIndirect(const LOGFONTA& font) {
+  rowHeight_ = 0;
+  const bool made = cXComponent::setFontIndirect(font);
+  rowHeight_ = 0;
+  updateScrollBars();
+  return made;
+}
+
 void Table::lendFont(HFONT font) {
+  rowHeight_ = 0;
   cXComponent::lendFont(font);
+  rowHeight_ = 0;
   if (editor_) editor_->lendFont(font);
   updateScrollBars();
 }

@@ -82,6 +82,7 @@ bool Table::hitTest(int x, int y, int& row, int& column) const {
 
 void Table::updateScrollBars() {
   if (!isValid()) return;
+  scrollBarsStale_ = false;
   const RECT client = getClientRect();
   SCROLLINFO info{};
   info.cbSize = sizeof info;
@@ -106,6 +107,7 @@ void Table::updateScrollBars() {
 }
 
 void Table::scrollIntoView(int row) {
+  if (scrollBarsStale_) updateScrollBars();
   const int index = shownIndexOf(row);
   if (index < 0) return;
   const int visible = std::max(visibleRowCount(), 1);
@@ -135,6 +137,7 @@ void Table::fillLastColumn() {
 }
 
 void Table::paint(HDC dc) {
+  if (scrollBarsStale_) updateScrollBars();
   RECT client = getClientRect();
   if (client.right <= 0 || client.bottom <= 0) return;
   HFONT font = getFont();
