@@ -1,10 +1,12 @@
 #include "tides/controls/tide_day_reader.h"
 
+#include "tides/engine/prediction.h"
 #include "tides/objects/platform_dates.h"
 
 #include <oleauto.h>
 
 #include <algorithm>
+#include <cmath>
 #include <limits>
 
 namespace br::tides {
@@ -15,7 +17,7 @@ using Getter = HRESULT (STDMETHODCALLTYPE ITidesPort::*)(double*);
 
 std::optional<graph::TimeOfDay> ReadEvent(ITidesPort* port, Getter getter) {
   double date = 0.0;
-  if (FAILED((port->*getter)(&date))) return std::nullopt;
+  if (FAILED((port->*getter)(&date)) || !std::isfinite(date)) return std::nullopt;  // Wine makes a time of NaN
   SYSTEMTIME time{};
   if (!VariantTimeToSystemTime(date, &time)) return std::nullopt;
   return graph::TimeOfDay{time.wHour, time.wMinute};
@@ -27,7 +29,8 @@ bool ReadTideDay(ITidesPort* port, graph::TideDay& day) {
   day = graph::TideDay{};
   if (!port) return false;
   long count = 0;
-  if (FAILED(port->get_NumPoints(&count)) || count < 1) return false;
+  // A port of another make may claim any count: more than a day can have is no day.
+  if (FAILED(port->get_NumPoints(&count)) || count < 1 || count > kMaxDayPoints) return false;
 
   day.points.resize(static_cast<std::size_t>(count));
   for (long k = 0; k < count; ++k) {

@@ -7,7 +7,8 @@
 
 namespace br::tides {
 
-// False when there is no port, or its point count cannot be read or is below 1. Heights
+// False when there is no port, or its point count cannot be read, is below 1 or above
+// kMaxDayPoints. Heights
 // that cannot be read are not-a-number (the curve shows them at mid-height); a sun event
 // the port does not give, or whose date the platform cannot split, is absent.
 bool ReadTideDay(ITidesPort* port, graph::TideDay& day);

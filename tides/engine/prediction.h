@@ -21,6 +21,12 @@ namespace br::tides {
 // that the count leaves 32 bits (given as INT32_MIN). A step below about -16.1 gives 1.
 std::int32_t DaySampleCount(double step);
 
+// The most points a day is given: one a second. A finer step says nothing more about the
+// tide and would only cost time and memory (a step of 1e-7 hour asks for 240 million
+// points: minutes of work and a gigabyte), so the objects refuse it like any bad step, and
+// the graph draws no day of more points from a port of any make.
+inline constexpr std::int32_t kMaxDayPoints = 24 * 3600 + 1;
+
 // Start of the day in hours since the prediction epoch, from its local-midnight instant.
 double StartHours(std::int64_t localMidnightSeconds);
 

@@ -25,10 +25,6 @@ namespace {
 constexpr double kDegreesPerMinute = 0.016666666666666666;
 constexpr double kPublishedPerInternal = 0.01;
 constexpr DISPID kCalculatedEvent = 1;
-// One point a second: a finer step says nothing more about the tide, and a day of it
-// would only cost time and memory (a step of 1e-7 hour asks for 240 million points:
-// minutes of work and a gigabyte), so such a step is refused like any other bad step.
-constexpr std::int32_t kMaxDayPoints = 24 * 3600 + 1;
 }  // namespace
 
 void TidesPort::Attach(const std::wstring& name, std::int16_t latitude, std::int16_t longitude) {
