@@ -142,7 +142,13 @@ HRESULT TidesWindow::SetFeet(LONG feet) {
 
 void TidesWindow::Paint(HDC dc, const RECT& client) {
   graph::TideDay day;
-  const bool haveDay = ReadTideDay(port_, day);
+  bool haveDay = false;
+  if (ITidesPort* port = port_) {
+    // A port of another make may take itself away from us inside one of its getters.
+    port->AddRef();
+    haveDay = ReadTideDay(port, day);
+    port->Release();
+  }
   TideGraphStyle style;
   style.font = font_;
   style.drawText = drawText_ != 0;
@@ -199,12 +205,21 @@ bool TidesWindow::OnMessage(HWND window, UINT message, WPARAM wParam, LPARAM lPa
 }
 
 bool TidesWindow::ReportPointer(HWND window, unsigned pointerX) {
-  if (!port_) return false;
+  ITidesPort* port = port_;
+  if (!port) return false;
+  // Held for the reading: a port of another make may take itself away inside a getter.
+  port->AddRef();
+  const bool fired = ReportPointerOf(port, window, pointerX);
+  port->Release();
+  return fired;
+}
+
+bool TidesWindow::ReportPointerOf(ITidesPort* port, HWND window, unsigned pointerX) {
   long count = 0;
-  if (FAILED(port_->get_NumPoints(&count)) || count < 1) return false;
+  if (FAILED(port->get_NumPoints(&count)) || count < 1) return false;
   double predictionDate = 0.0;
   CalendarDate date;
-  if (FAILED(port_->get_PredictionDate(&predictionDate)) || !SplitDayCountDate(predictionDate, date)) return false;
+  if (FAILED(port->get_PredictionDate(&predictionDate)) || !SplitDayCountDate(predictionDate, date)) return false;
   RECT client{};
   GetClientRect(window, &client);
   const graph::GraphGeometry geometry(graph::Rect{client.left, client.top, client.right, client.bottom},
@@ -214,7 +229,9 @@ bool TidesWindow::ReportPointer(HWND window, unsigned pointerX) {
   double time = 0.0;
   if (!ComposeDayCountDate(date, reading.hour, reading.minute, time)) return false;
   double value = 0.0;
-  if (FAILED(port_->get_WavePoint(reading.index, &value))) return false;
+  if (FAILED(port->get_WavePoint(reading.index, &value))) return false;
+  // Taken away while we read it: the day under the pointer is no longer the one shown.
+  if (port != port_) return false;
 
   VARIANT arguments[2];  // in reverse order: MouseAction(Time, WaveValue)
   arguments[1].vt = VT_R8;

@@ -42,6 +42,7 @@ private:
   void CopyFont(HFONT font);
   // Fires MouseAction for the pointer at x; false when nothing was fired.
   bool ReportPointer(HWND window, unsigned pointerX);
+  bool ReportPointerOf(ITidesPort* port, HWND window, unsigned pointerX);
   HRESULT PutDrawText(const VARIANT& value);
   HRESULT PutFormatText(const VARIANT& value);
 
