@@ -1,0 +1,95 @@
+// A doctest main that runs the suite with the heap's free checking on: freed blocks are
+// filled with 0xFEEEFEEE, so a use after free (an object that goes on after its last
+// reference went inside its own call) reads garbage and fails instead of passing by luck.
+// The platform takes the switch from the program's GlobalFlag under Image File Execution
+// Options when a process starts: the first run sets it and runs the suite again as a child.
+#define DOCTEST_CONFIG_IMPLEMENT
+#include <doctest/doctest.h>
+
+#include <windows.h>
+#include <winternl.h>
+
+#include <cstdio>
+#include <string>
+
+namespace {
+
+constexpr DWORD kHeapFlags = 0x10 | 0x20 | 0x40;  // tail check, free check, parameter check
+constexpr const wchar_t* kChildMark = L"BR_HEAP_CHECKED_CHILD";
+
+bool FreeCheckingOn() {
+  PROCESS_BASIC_INFORMATION basic = {};
+  if (NtQueryInformationProcess(GetCurrentProcess(), ProcessBasicInformation, &basic, sizeof basic, nullptr) != 0)
+    return false;
+  const std::size_t offset = sizeof(void*) == 8 ? 0xBC : 0x68;  // PEB NtGlobalFlag
+  const DWORD flags = *reinterpret_cast<const DWORD*>(reinterpret_cast<const char*>(basic.PebBaseAddress) + offset);
+  return (flags & 0x20) != 0;
+}
+
+bool SetGlobalFlagForThisProgram() {
+  wchar_t path[MAX_PATH] = {};
+  GetModuleFileNameW(nullptr, path, MAX_PATH);
+  std::wstring name(path);
+  name = name.substr(name.find_last_of(L"\\/") + 1);
+  const std::wstring key = L"Software\\Microsoft\\Windows NT\\CurrentVersion\\Image File Execution Options\\" + name;
+  HKEY handle = nullptr;
+  if (RegCreateKeyExW(HKEY_LOCAL_MACHINE, key.c_str(), 0, nullptr, 0, KEY_SET_VALUE, nullptr, &handle, nullptr) !=
+      ERROR_SUCCESS)
+    return false;
+  const LONG set = RegSetValueExW(handle, L"GlobalFlag", 0, REG_DWORD, reinterpret_cast<const BYTE*>(&kHeapFlags),
+                                  sizeof kHeapFlags);
+  RegCloseKey(handle);
+  return set == ERROR_SUCCESS;
+}
+
+// Runs this program again with the same command line; its exit code, or -1.
+int RunChild() {
+  SetEnvironmentVariableW(kChildMark, L"1");
+  STARTUPINFOW startup = {};
+  startup.cb = sizeof startup;
+  PROCESS_INFORMATION process = {};
+  wchar_t path[MAX_PATH] = {};
+  GetModuleFileNameW(nullptr, path, MAX_PATH);
+  std::wstring commandLine = GetCommandLineW();
+  // The child ends with this process (a test runner that gives up on us kills only us).
+  HANDLE job = CreateJobObjectW(nullptr, nullptr);
+  JOBOBJECT_EXTENDED_LIMIT_INFORMATION limits = {};
+  limits.BasicLimitInformation.LimitFlags = JOB_OBJECT_LIMIT_KILL_ON_JOB_CLOSE;
+  if (job) SetInformationJobObject(job, JobObjectExtendedLimitInformation, &limits, sizeof limits);
+  if (!CreateProcessW(path, &commandLine[0], nullptr, nullptr, TRUE, CREATE_SUSPENDED, nullptr, nullptr, &startup,
+                      &process)) {
+    if (job) CloseHandle(job);
+    return -1;
+  }
+  if (job) AssignProcessToJobObject(job, process.hProcess);
+  ResumeThread(process.hThread);
+  WaitForSingleObject(process.hProcess, INFINITE);
+  DWORD code = static_cast<DWORD>(-1);
+  GetExitCodeProcess(process.hProcess, &code);
+  CloseHandle(process.hThread);
+  CloseHandle(process.hProcess);
+  if (job) CloseHandle(job);
+  return static_cast<int>(code);
+}
+
+LONG WINAPI ReportCrash(EXCEPTION_POINTERS* exception) {
+  std::fprintf(stderr, "crash: exception %08lX at %p\n",
+               static_cast<unsigned long>(exception->ExceptionRecord->ExceptionCode),
+               exception->ExceptionRecord->ExceptionAddress);
+  std::fflush(stderr);
+  TerminateProcess(GetCurrentProcess(), 3);
+  return EXCEPTION_EXECUTE_HANDLER;
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+  // A crash ends the suite at once, as a failure, instead of waiting on a debugger.
+  SetErrorMode(SEM_FAILCRITICALERRORS | SEM_NOGPFAULTERRORBOX);
+  SetUnhandledExceptionFilter(ReportCrash);
+  if (!FreeCheckingOn() && !GetEnvironmentVariableW(kChildMark, nullptr, 0) && SetGlobalFlagForThisProgram())
+    return RunChild();
+  doctest::Context context(argc, argv);
+  if (!FreeCheckingOn()) std::fputs("heap free checking is off: uses after free may pass unseen\n", stderr);
+  return context.run();
+}
