@@ -98,9 +98,14 @@ void TidesPortList::TakePorts(const VARIANT& portList) {
   if (SafeArrayGetDim(array) < 1 || SafeArrayGetElemsize(array) != sizeof(IUnknown*)) return;
   LONG lower = 0, upper = -1;
   if (FAILED(SafeArrayGetLBound(array, 1, &lower)) || FAILED(SafeArrayGetUBound(array, 1, &upper))) return;
+  // Never more than the array holds: with an empty dimension elsewhere it holds nothing,
+  // however many elements the first dimension names.
+  unsigned long long held = 1;
+  for (USHORT d = 0; d < array->cDims; ++d) held *= array->rgsabound[d].cElements;
   if (FAILED(SafeArrayLock(array))) return;
   IUnknown** elements = static_cast<IUnknown**>(array->pvData);
-  const LONG count = upper >= lower ? upper - lower + 1 : 0;
+  LONG count = upper >= lower ? upper - lower + 1 : 0;
+  if (static_cast<unsigned long long>(count) > held) count = static_cast<LONG>(held);
   ports_.reserve(static_cast<size_t>(count));
   for (LONG i = 0; i < count && elements; ++i) {
     IUnknown* port = elements[i];
