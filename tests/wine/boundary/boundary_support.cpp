@@ -198,6 +198,17 @@ SAFEARRAY* MakeRawArray(ULONG elementSize, ULONG count) {
   return array;
 }
 
+SAFEARRAY* MakeEmptyTwoDimensionArray(IUnknown** data, ULONG claimed, bool emptyFirst) {
+  SAFEARRAY* array = nullptr;
+  if (FAILED(SafeArrayAllocDescriptor(2, &array))) throw std::runtime_error("SafeArrayAllocDescriptor failed");
+  array->cbElements = sizeof(IUnknown*);
+  array->fFeatures = FADF_STATIC | FADF_FIXEDSIZE;
+  array->rgsabound[emptyFirst ? 0 : 1] = SAFEARRAYBOUND{0, 0};
+  array->rgsabound[emptyFirst ? 1 : 0] = SAFEARRAYBOUND{claimed, 0};
+  array->pvData = data;
+  return array;
+}
+
 SAFEARRAY* ZeroDimensionArray() {
   static SAFEARRAY none = {0, FADF_STATIC | FADF_FIXEDSIZE, 4, 0, nullptr, {{0, 0}}};
   return &none;

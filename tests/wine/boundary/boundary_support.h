@@ -77,6 +77,11 @@ SAFEARRAY* MakeUnknownArray(const std::vector<IUnknown*>& objects, LONG lower = 
 // as a client that builds its descriptor by hand makes it.
 SAFEARRAY* MakeRawArray(ULONG elementSize, ULONG count);
 
+// A two-dimensional descriptor of interface pointers with no elements at all (one
+// dimension is empty) whose other dimension claims `claimed` elements, over `data`, which
+// it neither owns nor frees: an array that holds nothing however long a dimension says it is.
+SAFEARRAY* MakeEmptyTwoDimensionArray(IUnknown** data, ULONG claimed, bool emptyFirst);
+
 // A descriptor with no dimensions at all: the automation functions refuse to make one, so
 // it lives in static storage; never destroy it or clear a VARIANT that holds it.
 SAFEARRAY* ZeroDimensionArray();
