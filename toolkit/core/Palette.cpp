@@ -34,7 +34,10 @@ bool Palette::replace(const COLORREF* table, int count) {
   return true;
 }
 
-bool Palette::replace(const VARIANT& palette) {
+bool Palette::replace(const VARIANT& given) {
+  // A reference to a VARIANT (what Basic passes for a Variant variable) stands for it; one
+  // level only.
+  const VARIANT& palette = given.vt == (VT_BYREF | VT_VARIANT) && given.pvarVal ? *given.pvarVal : given;
   if (!(palette.vt & VT_ARRAY)) return false;
   SAFEARRAY* array = nullptr;
   if (palette.vt & VT_BYREF) {

@@ -14,8 +14,9 @@ public:
   static COLORREF colour(int index);  // 0 (black) for an index outside 0..19
   // Copies exactly kSize entries; any other count (or no table) changes nothing.
   static bool replace(const COLORREF* table, int count);
-  // The same from a VARIANT holding (or referring to) a one-dimensional SAFEARRAY of
-  // kSize 4-byte values with lower bound 0; anything else changes nothing.
+  // The same from a VARIANT (or a reference to one) holding, or referring to, a
+  // one-dimensional SAFEARRAY of kSize 4-byte values with lower bound 0; anything else
+  // changes nothing.
   static bool replace(const VARIANT& palette);
   static void reset();                // back to the initial colours
 
