@@ -2,6 +2,7 @@
 
 #include <oleauto.h>
 
+#include <cwchar>
 #include <new>
 
 namespace br::module {
@@ -107,8 +108,20 @@ HRESULT RemoveClassKeys(const ClassEntry& row) noexcept {
 
 HRESULT RegisterTypeLibrary(const std::wstring& modulePath) noexcept {
   ITypeLib* library = nullptr;
-  const HRESULT hr = LoadTypeLibEx(modulePath.c_str(), REGKIND_REGISTER, &library);
-  if (library) library->Release();
+  HRESULT hr = LoadTypeLibEx(modulePath.c_str(), REGKIND_NONE, &library);
+  if (FAILED(hr)) return hr;
+  try {
+    // Registered under the module's own path (REGKIND_REGISTER would let the loader pick
+    // the spelling of the path), with the module's folder as the help folder.
+    std::wstring folder = modulePath;
+    const std::size_t cut = folder.find_last_of(L"\\/");
+    folder.resize(cut == std::wstring::npos ? 0 : cut);
+    hr = RegisterTypeLib(library, const_cast<LPOLESTR>(modulePath.c_str()),
+                         folder.empty() ? nullptr : const_cast<LPOLESTR>(folder.c_str()));
+  } catch (...) {
+    hr = E_OUTOFMEMORY;
+  }
+  library->Release();
   return hr;
 }
 
@@ -119,9 +132,16 @@ HRESULT UnregisterTypeLibrary(const std::wstring& modulePath) noexcept {
   TLIBATTR* attributes = nullptr;
   hr = library->GetLibAttr(&attributes);
   if (SUCCEEDED(hr)) {
-    hr = UnRegisterTypeLib(attributes->guid, attributes->wMajorVerNum, attributes->wMinorVerNum,
-                           attributes->lcid, attributes->syskind);
-    if (hr == TYPE_E_REGISTRYACCESS) hr = S_OK;  // was not registered
+    // A type library that is not registered (any more) is no failure of unregistration.
+    wchar_t version[32];
+    swprintf(version, 32, L"\\%x.%x", attributes->wMajorVerNum, attributes->wMinorVerNum);
+    const std::wstring key = L"TypeLib\\" + GuidText(attributes->guid) + version;
+    HKEY opened = nullptr;
+    if (RegOpenKeyExW(HKEY_CLASSES_ROOT, key.c_str(), 0, KEY_READ, &opened) == ERROR_SUCCESS) {
+      RegCloseKey(opened);
+      hr = UnRegisterTypeLib(attributes->guid, attributes->wMajorVerNum, attributes->wMinorVerNum,
+                             attributes->lcid, attributes->syskind);
+    }
     library->ReleaseTLibAttr(attributes);
   }
   library->Release();
