@@ -1,0 +1,52 @@
+#include "tests/wine/common/dll_under_test.h"
+
+#include <stdexcept>
+#include <vector>
+
+namespace br::test {
+
+std::wstring BuiltDllPath() {
+  std::vector<wchar_t> buffer(32768);
+  const DWORD n = GetModuleFileNameW(nullptr, buffer.data(), static_cast<DWORD>(buffer.size()));
+  std::wstring folder(buffer.data(), n);
+  for (;;) {
+    const std::size_t cut = folder.find_last_of(L"\\/");
+    if (cut == std::wstring::npos) break;
+    folder.resize(cut);
+    const std::wstring candidate = folder + L"\\BR_Info.dll";
+    if (GetFileAttributesW(candidate.c_str()) != INVALID_FILE_ATTRIBUTES) return candidate;
+  }
+  throw std::runtime_error("BR_Info.dll not found above the test program");
+}
+
+DllUnderTest::DllUnderTest() : path_(BuiltDllPath()) {
+  comInitialised_ = SUCCEEDED(CoInitializeEx(nullptr, COINIT_APARTMENTTHREADED));
+  module_ = LoadLibraryW(path_.c_str());
+  if (!module_) throw std::runtime_error("BR_Info.dll cannot be loaded");
+  canUnloadNow_ = reinterpret_cast<Entry0>(reinterpret_cast<void*>(GetProcAddress(module_, "DllCanUnloadNow")));
+  getClassObject_ = reinterpret_cast<GetClassObjectEntry>(
+      reinterpret_cast<void*>(GetProcAddress(module_, "DllGetClassObject")));
+  registerServer_ = reinterpret_cast<Entry0>(reinterpret_cast<void*>(GetProcAddress(module_, "DllRegisterServer")));
+  unregisterServer_ =
+      reinterpret_cast<Entry0>(reinterpret_cast<void*>(GetProcAddress(module_, "DllUnregisterServer")));
+  if (!canUnloadNow_ || !getClassObject_ || !registerServer_ || !unregisterServer_) {
+    FreeLibrary(module_);
+    throw std::runtime_error("BR_Info.dll lacks an entry point");
+  }
+}
+
+DllUnderTest::~DllUnderTest() {
+  FreeLibrary(module_);
+  if (comInitialised_) CoUninitialize();
+}
+
+HRESULT DllUnderTest::Create(REFCLSID clsid, REFIID riid, void** out) const {
+  IClassFactory* factory = nullptr;
+  HRESULT hr = GetClassObject(clsid, IID_IClassFactory, reinterpret_cast<void**>(&factory));
+  if (FAILED(hr)) return hr;
+  hr = factory->CreateInstance(nullptr, riid, out);
+  factory->Release();
+  return hr;
+}
+
+}  // namespace br::test

@@ -1,0 +1,50 @@
+// A test sink for an events dispinterface: counts the calls, keeps the last dispatch id
+// and arguments, and can run an action from inside a call (to disconnect or release).
+#pragma once
+
+#include <windows.h>
+#include <oaidl.h>
+#include <ocidl.h>
+
+#include <functional>
+#include <vector>
+
+namespace br::test {
+
+class EventSink final : public IDispatch {
+public:
+  explicit EventSink(const IID& events) : events_(events) {}
+
+  // Connects to source's connection point for the events interface; false on failure.
+  bool Connect(IUnknown* source);
+  void Disconnect();
+
+  int calls = 0;
+  DISPID lastId = 0;
+  LCID lastLocale = 0;
+  WORD lastFlags = 0;
+  bool lastIidNull = false;
+  std::vector<double> lastDoubles;  // VT_R8 arguments of the last call, in call order
+  UINT lastArgumentCount = 0;
+  std::function<void()> onCall;     // runs inside Invoke, after counting
+
+  STDMETHODIMP QueryInterface(REFIID riid, void** out) override;
+  STDMETHODIMP_(ULONG) AddRef() override { return ++refs_; }
+  STDMETHODIMP_(ULONG) Release() override { return --refs_; }  // lives on the test's stack
+  STDMETHODIMP GetTypeInfoCount(UINT* count) override;
+  STDMETHODIMP GetTypeInfo(UINT, LCID, ITypeInfo** out) override;
+  STDMETHODIMP GetIDsOfNames(REFIID, LPOLESTR*, UINT, LCID, DISPID*) override;
+  STDMETHODIMP Invoke(DISPID id, REFIID riid, LCID locale, WORD flags, DISPPARAMS* params, VARIANT* result,
+                      EXCEPINFO*, UINT*) override;
+
+  ULONG References() const { return refs_; }
+  DWORD Cookie() const { return cookie_; }
+
+private:
+  const IID& events_;
+  ULONG refs_ = 0;
+  IConnectionPoint* point_ = nullptr;
+  DWORD cookie_ = 0;
+};
+
+}  // namespace br::test

@@ -1,0 +1,50 @@
+// Station folders written by the tests themselves into a temporary folder, with the
+// engine's record encoders. Removed again when the object goes (declare it before the
+// DllUnderTest that opens it, so the DLL has closed the files by then).
+#pragma once
+
+#include <cstdint>
+#include <set>
+#include <string>
+#include <vector>
+
+namespace br::test {
+
+struct TestConstituent {
+  std::int16_t number;      // row of the constituent table; 0 = mean level
+  std::uint16_t amplitude;  // thousandths of the published unit
+  std::uint16_t phase;      // Greenwich phase lag, tenths of a degree
+};
+
+struct TestStation {
+  std::string name;
+  std::int16_t latitude;   // minutes, north positive
+  std::int16_t longitude;  // minutes, east positive
+  std::int8_t zone;        // hours: universal time = zone time + zone
+  std::vector<TestConstituent> constituents;
+};
+
+struct FolderOptions {
+  bool withoutDataFile = false;             // leave "td_pnt.dat" out
+  // Stations whose "td_crd.ntx" record is replaced by one at a position no station has, so
+  // the coordinate search cannot find them (the index keeps its full count).
+  std::set<std::size_t> notInCoordinateIndex;
+};
+
+class StationFolder {
+public:
+  explicit StationFolder(const std::vector<TestStation>& stations, const FolderOptions& options = {});
+  ~StationFolder();
+  StationFolder(const StationFolder&) = delete;
+  StationFolder& operator=(const StationFolder&) = delete;
+
+  const std::wstring& Path() const { return path_; }  // no trailing separator
+
+private:
+  std::wstring path_;
+};
+
+// Positions in minutes as the library reports them in degrees.
+inline double Degrees(std::int16_t minutes) { return minutes * 0.016666666666666666; }
+
+}  // namespace br::test
