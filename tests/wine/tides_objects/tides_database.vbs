@@ -1,0 +1,58 @@
+' TidesDatabase as a VBScript client uses it: created by programmatic identifier, opened
+' on the embedded world station set. Wine's VBScript cannot call methods on the ports
+' (they come back as IUnknown) nor pass ByRef arguments, so this stays with the database.
+Option Explicit
+Dim fso, root, folder, db, db2, port, n, r, x, failures
+failures = 0
+
+Sub Check(condition, what)
+  If Not condition Then
+    WScript.Echo "FAILED: " & what
+    failures = failures + 1
+  End If
+End Sub
+
+Set fso = CreateObject("Scripting.FileSystemObject")
+root = fso.GetParentFolderName(WScript.ScriptFullName)
+root = fso.GetParentFolderName(fso.GetParentFolderName(fso.GetParentFolderName(root)))
+folder = fso.BuildPath(root, "data\world")
+
+Set db = CreateObject("BR_Info.TidesDatabase")
+On Error Resume Next
+n = db.NumPorts
+Check Err.Number = 70, "NumPorts before Initialize is refused, got error " & Err.Number
+Err.Clear
+db.Initialize fso.BuildPath(root, "no such folder")
+Check Err.Number = &H80070057, "a folder without station files is refused (E_INVALIDARG), got error " & Err.Number
+Err.Clear
+db.Initialize folder
+Check Err.Number = 0, "Initialize " & folder & ": error " & Err.Number & " " & Err.Description
+Err.Clear
+Set port = CreateObject("BR_Info.TidesPort")
+x = port.PortName
+Check Err.Number = 70, "a port created directly is refused, got error " & Err.Number
+Err.Clear
+On Error GoTo 0
+
+n = db.NumPorts
+Check n > 100, "the world set has its stations: " & n
+
+' Once open, the files stay: a later folder is ignored, and a second database sees them.
+db.Initialize "C:\no\such\folder"
+Check db.NumPorts = n, "a later folder is ignored"
+Set db2 = CreateObject("BR_Info.TidesDatabase")
+db2.Initialize ""
+Check db2.NumPorts = n, "a second database sees the same stations"
+
+r = db.GetPorts(10, 10, 10, 20)
+Check IsEmpty(r), "a box of no height is empty"
+r = db.GetPorts(-90, -180, 90, 180)
+' (Wine's VBScript cannot look inside an array of objects: UBound ends the script.)
+Check IsArray(r), "the whole world is an array of ports"
+Check VarType(r) = (vbArray + vbObject) Or VarType(r) = (vbArray + 13), "an array of object references: " & VarType(r)
+r = Empty
+Set db2 = Nothing
+Set db = Nothing
+
+If failures = 0 Then WScript.Echo "ok: " & n & " stations"
+WScript.Quit failures

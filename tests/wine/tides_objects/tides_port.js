@@ -1,0 +1,60 @@
+// A day of tides as a JScript client computes it: ports from GetPort, Calculate with a
+// step and a day-count date, then the points, extremes and sun times.
+var failures = 0;
+function check(condition, what) {
+  if (!condition) {
+    WScript.Echo("FAILED: " + what);
+    failures++;
+  }
+}
+
+var fso = new ActiveXObject("Scripting.FileSystemObject");
+var root = fso.GetParentFolderName(WScript.ScriptFullName);
+root = fso.GetParentFolderName(fso.GetParentFolderName(fso.GetParentFolderName(root)));
+var db = new ActiveXObject("BR_Info.TidesDatabase");
+db.Initialize(fso.BuildPath(root, "data\\world"));
+var count = db.NumPorts;
+check(count > 100, "station count " + count);
+check(db.GetPort(-1) == null, "no port before the first station");
+check(db.GetPort(count) == null, "no port after the last station");
+
+var port = db.GetPort(0);
+check(typeof port.PortName == "string" && port.PortName.length > 0, "the first station has a name");
+check(port.NumPoints == 0, "a new port has no points");
+
+port.Calculate(1, 36526.75);  // 2000-01-01, the fraction is dropped
+check(port.NumPoints == 25, "25 points for a step of one hour, got " + port.NumPoints);
+check(port.PredictionDate == 36526, "the whole day, got " + port.PredictionDate);
+check(port.Step == 1, "step read back");
+var max = port.MaxValue, min = port.MinValue;
+check(max > min, "a tide rises and falls: " + min + " .. " + max);
+check(port.WavePoint(port.MaxValueIndex) == max, "the highest point is at MaxValueIndex");
+check(port.WavePoint(port.MinValueIndex) == min, "the lowest point is at MinValueIndex");
+for (var k = 0; k < 25; k++) {
+  var v = port.WavePoint(k);
+  check(v >= min && v <= max, "point " + k + " lies between the extremes");
+}
+check(Math.floor(port.SunRise) == 36526, "sunrise on the day");
+check(port.SunRise <= port.SunSet, "sunrise before sunset");
+check(typeof port.TimeZone == "number", "zone description");
+
+try {
+  port.WavePoint(25);
+  check(false, "WavePoint(25) is refused");
+} catch (e) {
+  // Windows reports E_INVALIDARG; Wine's JScript turns a failed indexed property read into
+  // DISP_E_MEMBERNOTFOUND.
+  var code = e.number >>> 0;
+  check(code == 0x80070057 || code == 0x80020003, "WavePoint(25) is refused, got " + code.toString(16));
+}
+port.Calculate(0, 36526);
+check(port.NumPoints == 0, "a step of 0 leaves no points");
+try {
+  port.MaxValue;
+  check(false, "MaxValue without points is refused");
+} catch (e) {
+  check((e.number >>> 0) == 0x80070005, "E_ACCESSDENIED without points");
+}
+
+if (failures == 0) WScript.Echo("ok: " + count + " stations, day of " + port.PortName);
+WScript.Quit(failures);
