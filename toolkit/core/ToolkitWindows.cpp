@@ -4,6 +4,7 @@
 
 #include <set>
 #include <unordered_map>
+#include <vector>
 
 #include "toolkit/core/ComponentPeer.h"
 #include "toolkit/core/cXComponent.h"
@@ -29,6 +30,10 @@ std::set<int>& registeredKinds() {
 }
 
 thread_local cXComponent* t_creating = nullptr;
+
+// Busy depth of this thread and the components waiting for it to fall to 0.
+thread_local int t_busy = 0;
+thread_local std::vector<std::unique_ptr<cXComponent>>* t_waiting = nullptr;
 
 WNDPROC g_defaultProcedure = &DefWindowProcA;
 
@@ -130,6 +135,28 @@ WNDPROC ToolkitWindows::setDefaultProcedure(WNDPROC procedure) {
   return previous;
 }
 
+ToolkitWindows::Busy::Busy() { ++t_busy; }
+
+ToolkitWindows::Busy::~Busy() {
+  if (--t_busy > 0) return;
+  // Deleting may run window procedures again (their windows go): those stay busy, and
+  // whatever they hand over is deleted in the next pass.
+  while (t_waiting) {
+    std::unique_ptr<std::vector<std::unique_ptr<cXComponent>>> batch(t_waiting);
+    t_waiting = nullptr;
+    ++t_busy;
+    batch.reset();
+    --t_busy;
+  }
+}
+
+void ToolkitWindows::deleteWhenIdle(std::unique_ptr<cXComponent> component) {
+  if (!component) return;
+  if (t_busy == 0) return;  // nothing of it is on the stack: it goes now
+  if (!t_waiting) t_waiting = new std::vector<std::unique_ptr<cXComponent>>();
+  t_waiting->push_back(std::move(component));
+}
+
 ToolkitWindows::Creating::Creating(cXComponent* component) : previous_(t_creating) {
   t_creating = component;
 }
@@ -137,6 +164,7 @@ ToolkitWindows::Creating::Creating(cXComponent* component) : previous_(t_creatin
 ToolkitWindows::Creating::~Creating() { t_creating = previous_; }
 
 LRESULT CALLBACK ToolkitWindows::windowProc(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam) {
+  const Busy busy;
   Entry* entry = find(hwnd);
   if (!entry) {
     // A window of the toolkit's class being made right now: enter it at its

@@ -5,6 +5,7 @@
 
 #include <windows.h>
 
+#include <memory>
 #include <string>
 
 namespace toolkit {
@@ -37,6 +38,19 @@ public:
   // (DefWindowProcA unless replaced, e.g. to watch what reaches it). Answers the
   // previous one; null restores DefWindowProcA.
   static WNDPROC setDefaultProcedure(WNDPROC procedure);
+
+  // While a toolkit window procedure runs on this thread, or a Busy scope is open, the
+  // components handed to deleteWhenIdle wait until the outermost one has returned: a
+  // component's own call may still be on the stack when its owner lets it go (a host that
+  // closes its window from inside a selection event the table is still delivering).
+  class Busy {
+  public:
+    Busy();
+    ~Busy();
+    Busy(const Busy&) = delete;
+    Busy& operator=(const Busy&) = delete;
+  };
+  static void deleteWhenIdle(std::unique_ptr<cXComponent> component);
 
   // The component whose window CreateWindowEx is making on this thread, so that
   // the window's first messages (WM_NCCREATE, WM_CREATE) already reach it.
