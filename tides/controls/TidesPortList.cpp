@@ -3,6 +3,7 @@
 #include "frame/com/bstr_text.h"
 #include "frame/control/owner_hold.h"
 #include "toolkit/core/Palette.h"
+#include "toolkit/core/ToolkitWindows.h"
 
 namespace br::tides {
 
@@ -52,6 +53,8 @@ TidesPortList::~TidesPortList() {
 
 STDMETHODIMP TidesPortList::SetPortList(VARIANT portList) {
   br::control::OwnerHold hold(*static_cast<ITidesPortList*>(this));
+  // The fill selects a row, which fires SelectChanged: the table stays until it is done.
+  const toolkit::ToolkitWindows::Busy busy;
   Guard([&] {
     if (panel_) panel_->table().removeAllRows();
     ClearPorts();
@@ -163,8 +166,9 @@ void TidesPortList::BuildContent(HWND window) {
 void TidesPortList::DestroyContent() {
   if (!panel_) return;
   panel_->table().removeAllRows();
-  std::unique_ptr<TidesPortListPanel> panel = std::move(panel_);
-  panel.reset();
+  // The window may go from inside a selection the table is still delivering (a host that
+  // closes on SelectChanged): the table is deleted once that call has returned.
+  toolkit::ToolkitWindows::deleteWhenIdle(std::move(panel_));
 }
 
 void TidesPortList::LayOut(HWND window) {
