@@ -30,4 +30,8 @@ struct StationEntry {
 // "station 12 "Newlyn"" for messages.
 std::string DescribeStation(std::size_t index, const std::string& utf8Name);
 
+// A text from the input as messages show it: one line (control characters become '?'),
+// at most 80 bytes, so that every message stays one line whatever the input holds.
+std::string MessageText(const std::string& text);
+
 }  // namespace br::tidefiles

@@ -19,7 +19,7 @@ constexpr double kDegrees = 180.0 / 3.14159265358979323846;
 // Zone descriptions run from UTC+14 (-14) to UTC-12 (12); a little room either side.
 constexpr int kMaxZone = 14;
 
-std::string Quoted(const std::string& s) { return "\"" + s + "\""; }
+std::string Quoted(const std::string& s) { return "\"" + MessageText(s) + "\""; }
 
 std::optional<double> FiniteNumber(const Json& value) {
   if (!value.is_number()) return std::nullopt;
@@ -136,9 +136,10 @@ class StationReader {
           Error(where + ": \"name\" must be a non-empty string");
           return;
         }
-        c.label = value.get<std::string>();
+        const std::string& name = value.get_ref<const std::string&>();
+        c.label = MessageText(name);  // the label only ever goes into messages
         named = true;
-        byName = MatchConstituentName(c.label);
+        byName = MatchConstituentName(name);
       } else if (key == "number") {
         const std::optional<long> n = WholeNumber(value, 0, br::tides::kConstituentCount - 1);
         if (!n) {
