@@ -4,6 +4,8 @@
 #include "frame/module/class_rows.h"
 #include "frame/module/registration.h"
 #include "tides/objects/tides_database.h"
+#include "toolkit/core/ToolkitWindows.h"
+#include "toolkit/widgets/Tooltip.h"
 
 #include "BR_Info.h"
 
@@ -22,7 +24,12 @@ extern "C" BOOL WINAPI DllMain(HINSTANCE instance, DWORD reason, LPVOID reserved
       br::tides::TidesDatabase::CloseStationFiles();
       // At process exit other DLLs may be gone already: let the cached type library go
       // only when the library itself is being unloaded.
-      if (!reserved) br::com::TypeLibrary::Unload();
+      if (!reserved) {
+        br::com::TypeLibrary::Unload();
+        // Window classes and the tooltip timer would otherwise point into unloaded code.
+        toolkit::Tooltip::shutdown();
+        toolkit::ToolkitWindows::unregisterClasses();
+      }
       break;
     default:
       break;

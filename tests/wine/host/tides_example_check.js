@@ -80,4 +80,5 @@ try {
 } catch (e) {
   check(false, "script error " + (e.number >>> 0).toString(16) + " " + e.message);
 }
+WScript.Echo("script completed");
 WScript.Quit(failures == 0 ? 0 : 1);

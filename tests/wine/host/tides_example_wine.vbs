@@ -45,4 +45,5 @@ Check IsEmpty(ocean), "an open-ocean box is Empty"
 flat = db.GetPorts(48, -6, 48, -3)
 Check IsEmpty(flat), "a box of no height is Empty (strict edges)"
 
+WScript.Echo "script completed"
 WScript.Quit failures

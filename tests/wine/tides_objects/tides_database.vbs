@@ -55,4 +55,5 @@ Set db2 = Nothing
 Set db = Nothing
 
 If failures = 0 Then WScript.Echo "ok: " & n & " stations"
+WScript.Echo "script completed"
 WScript.Quit failures

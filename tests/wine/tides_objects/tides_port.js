@@ -57,4 +57,5 @@ try {
 }
 
 if (failures == 0) WScript.Echo("ok: " + count + " stations, day of " + port.PortName);
+WScript.Echo("script completed");
 WScript.Quit(failures);
