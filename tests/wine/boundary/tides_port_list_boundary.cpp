@@ -42,9 +42,12 @@ struct Stations {
       ports.push_back(port);
     }
   }
-  ~Stations() {
+  ~Stations() { Release(); }
+  void Release() {
     for (IUnknown* p : ports) p->Release();
-    database->Release();
+    ports.clear();
+    if (database) database->Release();
+    database = nullptr;
   }
   std::vector<ULONG> References() const {
     std::vector<ULONG> counts;
@@ -194,6 +197,8 @@ TEST_CASE("ITidesPortList SetPortList: every form of list, on a window, answers 
   list->Release();
   hosted.Close();
   CHECK(s.References() == base);
+  s.Release();
+  CHECK(dll.CanUnloadNow() == S_OK);
 }
 
 TEST_CASE("ITidesPortList without a window: lists are kept, nothing is selected, and Selected checks its pointer") {
@@ -211,6 +216,8 @@ TEST_CASE("ITidesPortList without a window: lists are kept, nothing is selected,
   CHECK(SelectedName(list) == L"<none>");
   list->Release();  // the list's end lets every port go
   CHECK(s.References() == base);
+  s.Release();
+  CHECK(dll.CanUnloadNow() == S_OK);
 }
 
 TEST_CASE("ITidesPortList late bound: a GetPorts result passed on as scripts pass it") {
@@ -260,4 +267,6 @@ TEST_CASE("ITidesPortList late bound: a GetPorts result passed on as scripts pas
   list->Release();
   hosted.Close();
   CHECK(s.References() == base);
+  s.Release();
+  CHECK(dll.CanUnloadNow() == S_OK);
 }

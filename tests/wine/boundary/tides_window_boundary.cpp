@@ -11,6 +11,7 @@
 #include "tests/wine/common/station_folder.h"
 
 #include "BR_Info.h"
+#include "BR_Private.h"
 
 #include <doctest/doctest.h>
 
@@ -170,6 +171,25 @@ TEST_CASE("ITidesWindow Property: wrong codes, wrong types, by-reference forms a
   REQUIRE(w->get_Property(TW_FORMATTEXT, &v) == S_OK);
   CHECK(std::wstring(v.bstrVal) == L"%.2f");
   VariantClear(&v);
+  CHECK(g.Finish() == S_OK);
+}
+
+TEST_CASE("IUnitsOption of TidesWindow: values that are no whole number change nothing") {
+  Graph g;
+  IUnitsOption* units = g.hosted.Query<IUnitsOption>();
+  LONG feet = 1;
+  RunUnchanged(g.window, {
+      {"SetUnits(\"feet\")", [&] { return units->SetUnits(Variant::Bstr(L"feet").get()); }, E_INVALIDARG},
+      {"SetUnits(1e20)", [&] { return units->SetUnits(Variant::R8(1e20).get()); }, E_INVALIDARG},
+      {"SetUnits(VT_NULL)", [&] { return units->SetUnits(Variant::Null().get()); }, E_INVALIDARG},
+      {"SetUnits(an array)", [&] { return units->SetUnits(Variant::Array(VT_I4, MakeLongArray({1})).get()); },
+       E_INVALIDARG},
+      {"SetUnits(null object)", [&] { return units->SetUnits(Variant::Dispatch(nullptr).get()); }, E_INVALIDARG},
+      {"SetOption(anything)", [&] { return units->SetOption(LONG_MIN); }, S_OK},
+  });
+  // A whole number by reference is converted like any other.
+  CHECK(units->SetUnits(Variant::RefI4(&feet).get()) == S_OK);
+  units->Release();
   CHECK(g.Finish() == S_OK);
 }
 

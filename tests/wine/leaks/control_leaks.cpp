@@ -38,7 +38,16 @@ struct World {
     Variant path = Variant::Bstr(folder.Path());
     REQUIRE(database->Initialize(path.get().bstrVal) == S_OK);
   }
-  ~World() { database->Release(); }
+  ~World() { Release(); }
+  void Release() {
+    if (database) database->Release();
+    database = nullptr;
+  }
+  // Everything released: the library can go.
+  HRESULT Finish() {
+    Release();
+    return dll.CanUnloadNow();
+  }
   IUnknown* Port(long i) {
     IUnknown* port = nullptr;
     REQUIRE(database->GetPort(i, &port) == S_OK);
@@ -116,6 +125,7 @@ TEST_CASE("TidesWindow: paints, font changes and palette replacements leave the 
     window->Release();
   });
   port->Release();
+  CHECK(w.Finish() == S_OK);
 }
 
 TEST_CASE("TidesPortList: paints, font changes and palette replacements leave the GDI objects as they were") {
@@ -129,6 +139,7 @@ TEST_CASE("TidesPortList: paints, font changes and palette replacements leave th
     list->Release();
   });
   for (IUnknown* p : ports) p->Release();
+  CHECK(w.Finish() == S_OK);
 }
 
 TEST_CASE("TidesPortList holds one reference per port it keeps: through lists, the window's end and its own") {
@@ -169,4 +180,5 @@ TEST_CASE("TidesPortList holds one reference per port it keeps: through lists, t
     CHECK(counts() == base);
   }
   for (IUnknown* p : ports) p->Release();
+  CHECK(w.Finish() == S_OK);
 }

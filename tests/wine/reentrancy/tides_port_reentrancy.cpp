@@ -129,6 +129,8 @@ TEST_CASE("a sink that calculates again inside Calculated: the inner day is the 
   CHECK(port->get_WavePoint(0, &value) == E_ACCESSDENIED);
   sink.Disconnect();
   port->Release();
+  f.ReleaseDatabase();
+  CHECK(f.Dll().CanUnloadNow() == S_OK);
 }
 
 TEST_CASE("sinks that disconnect themselves, disconnect others or connect new ones inside Calculated") {
@@ -164,6 +166,8 @@ TEST_CASE("sinks that disconnect themselves, disconnect others or connect new on
   second.Disconnect();
   late.Disconnect();
   port->Release();
+  f.ReleaseDatabase();
+  CHECK(f.Dll().CanUnloadNow() == S_OK);
 }
 
 TEST_CASE("a sink that releases the database and the port and then calculates through its own reference") {
