@@ -1,5 +1,7 @@
 #include "tests/wine/common/dll_under_test.h"
 
+#include <doctest/doctest.h>
+
 #include <stdexcept>
 #include <vector>
 
@@ -36,6 +38,8 @@ DllUnderTest::DllUnderTest() : path_(BuiltDllPath()) {
 }
 
 DllUnderTest::~DllUnderTest() {
+  // Every test ends with everything of the library released.
+  CHECK_MESSAGE(canUnloadNow_() == S_OK, "objects, class objects or locks of the library outlive the test");
   FreeLibrary(module_);
   if (comInitialised_) CoUninitialize();
 }
