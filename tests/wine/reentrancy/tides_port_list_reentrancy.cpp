@@ -4,6 +4,7 @@
 // inside its own selection. Run with the heap's free checking on.
 #include "tests/wine/boundary/boundary_support.h"
 #include "tests/wine/boundary/control_host.h"
+#include "tests/wine/boundary/foreign_port.h"
 #include "tests/wine/common/dll_under_test.h"
 #include "tests/wine/common/event_sink.h"
 #include "tests/wine/common/station_folder.h"
@@ -164,5 +165,31 @@ TEST_CASE("a SelectChanged sink that disconnects itself, and one that closes the
   CHECK(closing.calls == 1);
   CHECK_FALSE(IsWindow(controlWindow));
   for (ULONG count : l.References()) CHECK(count == 1);  // the list let every port go
+  CHECK(l.Finish() == S_OK);
+}
+
+TEST_CASE("a port of another make that empties the list from inside its name, while the list fills") {
+  List l;
+  EventSink sink(DIID__ITidesPortListEvents);
+  REQUIRE(sink.Connect(l.list));
+  ForeignPort* foreign = ForeignPort::Create();
+  bool armed = true;
+  foreign->onGet = [&] {
+    if (!armed) return;
+    armed = false;
+    CHECK(l.list->SetPortList(Variant::Empty().get()) == S_OK);  // lets this very port go too
+  };
+  {
+    Variant list = Variant::Array(VT_UNKNOWN, MakeUnknownArray({l.ports[0], foreign, l.ports[1]}));
+    foreign->Release();  // the array's and the list's references are the only ones
+    CHECK(l.list->SetPortList(list.get()) == S_OK);
+  }
+  CHECK_FALSE(armed);
+  CHECK(ForeignPort::Alive() == 0);
+  for (ULONG count : l.References()) CHECK(count == 1);  // nothing kept
+  CHECK(SelectedName(l.list) != L"Foreign");
+  l.Key(VK_DOWN);
+  l.Key(VK_HOME);
+  sink.Disconnect();
   CHECK(l.Finish() == S_OK);
 }
