@@ -105,6 +105,33 @@ TEST_CASE("in-place activation makes a window of the control's own, a child of t
   CHECK(hosted.Finish() == S_OK);
 }
 
+TEST_CASE("verbs: UI activation takes the focus, hide and show, and the verbs a control has not") {
+  Hosted hosted;
+  IOleObject* ole = nullptr;
+  REQUIRE(hosted.graph->QueryInterface(IID_IOleObject, reinterpret_cast<void**>(&ole)) == S_OK);
+  IOleClientSite* site = nullptr;
+  CHECK(ole->GetClientSite(&site) == S_OK);
+  CHECK(site != nullptr);
+  RECT position{0, 0, 300, 200};
+  CHECK(ole->DoVerb(OLEIVERB_UIACTIVATE, nullptr, site, 0, hosted.host, &position) == S_OK);
+  CHECK(GetFocus() == hosted.window);
+  CHECK(ole->DoVerb(OLEIVERB_HIDE, nullptr, site, 0, hosted.host, &position) == S_OK);
+  CHECK_FALSE(IsWindowVisible(hosted.window));
+  CHECK(ole->DoVerb(OLEIVERB_SHOW, nullptr, site, 0, hosted.host, &position) == S_OK);
+  CHECK(IsWindowVisible(hosted.window));
+  CHECK(ole->DoVerb(OLEIVERB_OPEN, nullptr, site, 0, hosted.host, &position) == OLEOBJ_S_CANNOT_DOVERB_NOW);
+  CHECK(ole->DoVerb(OLEIVERB_PROPERTIES, nullptr, site, 0, hosted.host, &position) == E_NOTIMPL);
+  CHECK(ole->DoVerb(7, nullptr, site, 0, hosted.host, &position) == OLEOBJ_S_INVALIDVERB);
+  CHECK(ole->DoVerb(-99, nullptr, site, 0, hosted.host, &position) == E_NOTIMPL);
+  CHECK(WindowOf(hosted.graph.Get()) == hosted.window);  // still the one window
+  // Closing deactivates: the window goes, the site stays until the host lets it go.
+  CHECK(ole->Close(OLECLOSE_NOSAVE) == S_OK);
+  CHECK_FALSE(IsWindow(hosted.window));
+  site->Release();
+  ole->Release();
+  CHECK(hosted.Finish() == S_OK);
+}
+
 TEST_CASE("the control's own window paints the same picture as IViewObject::Draw") {
   Hosted hosted;
   Canvas drawn(300, 200);
