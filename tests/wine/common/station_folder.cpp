@@ -36,9 +36,13 @@ StationFolder::StationFolder(const std::vector<TestStation>& stations, const Fol
   static LONG counter = 0;
   wchar_t temp[MAX_PATH + 1] = {};
   GetTempPathW(MAX_PATH, temp);
-  path_ = std::wstring(temp) + L"brtest_" + std::to_wstring(GetCurrentProcessId()) + L"_" +
-          std::to_wstring(InterlockedIncrement(&counter));
-  CreateDirectoryW(path_.c_str(), nullptr);
+  // A folder of its own: never one left behind by an earlier run with the same process id.
+  for (;;) {
+    path_ = std::wstring(temp) + L"brtest_" + std::to_wstring(GetCurrentProcessId()) + L"_" +
+            std::to_wstring(GetTickCount()) + L"_" + std::to_wstring(InterlockedIncrement(&counter));
+    if (CreateDirectoryW(path_.c_str(), nullptr)) break;
+    if (GetLastError() != ERROR_ALREADY_EXISTS) throw std::runtime_error("cannot make a station folder");
+  }
 
   std::vector<StationIndexRecord> index;
   std::vector<std::uint8_t> data;

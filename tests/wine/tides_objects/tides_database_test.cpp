@@ -161,6 +161,7 @@ TEST_CASE("after an unload the next load opens another folder") {
   database->get_NumPorts(&count);
   CHECK(count == 1);
   database->Release();
+  CHECK(dll.CanUnloadNow() == S_OK);
 }
 
 TEST_CASE("GetPortInfo: positions in degrees, names through the coordinate index") {
@@ -217,7 +218,7 @@ TEST_CASE("station names come through the ANSI code page, the whole 40-byte fiel
   REQUIRE(database->GetPortInfo(1, &latitude, &longitude, &name) == S_OK);
   CHECK(std::wstring(name) == std::wstring(40, L'N'));
   SysFreeString(name);
-  database->Release();
+  database->Release();  CHECK(dll.CanUnloadNow() == S_OK);
 }
 
 TEST_CASE("GetPort: a new initialised port per call; out of range gives S_OK and null") {

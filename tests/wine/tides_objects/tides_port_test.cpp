@@ -104,8 +104,7 @@ SunTimes SunOf(ITidesPort* port) {
 SunTimes SunTimesAt(std::int16_t latitude, std::int16_t longitude, std::int8_t zone, double date) {
   StationFolder folder({{"Sun", latitude, longitude, zone, {{0, 1000, 0}}}});
   DllUnderTest dll;
-  Stations stations(dll, folder);
-  ITidesPort* port = stations.Port(0);
+  ITidesPort* port = Stations(dll, folder).Port(0);
   REQUIRE(port->Calculate(1.0, date) == S_OK);
   REQUIRE(Points(port) == 25);
   double day = 0;
@@ -115,6 +114,7 @@ SunTimes SunTimesAt(std::int16_t latitude, std::int16_t longitude, std::int8_t z
   CHECK(std::floor(rise) == day);  // the times are on the predicted day
   const SunTimes times = SunOf(port);
   port->Release();
+  CHECK(dll.CanUnloadNow() == S_OK);
   return times;
 }
 
@@ -155,8 +155,7 @@ TEST_CASE("a port created directly answers E_ACCESSDENIED everywhere and fires n
 TEST_CASE("state machine: without points, with points, and back after a failed Calculate") {
   StationFolder folder({kS2Station});
   DllUnderTest dll;
-  Stations stations(dll, folder);
-  ITidesPort* port = stations.Port(0);
+  ITidesPort* port = Stations(dll, folder).Port(0);
   EventSink sink(DIID__ITidesPortEvents);
   REQUIRE(sink.Connect(port));
 
@@ -205,13 +204,13 @@ TEST_CASE("state machine: without points, with points, and back after a failed C
   CHECK(sink.calls == 3);
   sink.Disconnect();
   port->Release();
+  CHECK(dll.CanUnloadNow() == S_OK);
 }
 
 TEST_CASE("Calculate: point counts of the step and the steps that give no day") {
   StationFolder folder({kS2Station});
   DllUnderTest dll;
-  Stations stations(dll, folder);
-  ITidesPort* port = stations.Port(0);
+  ITidesPort* port = Stations(dll, folder).Port(0);
   EventSink sink(DIID__ITidesPortEvents);
   REQUIRE(sink.Connect(port));
   const double day = Date(2000, 1, 1);
@@ -258,13 +257,13 @@ TEST_CASE("Calculate: point counts of the step and the steps that give no day") 
   SysFreeString(exception.bstrHelpFile);
   sink.Disconnect();
   port->Release();
+  CHECK(dll.CanUnloadNow() == S_OK);
 }
 
 TEST_CASE("the day: whole-day truncation, heights x 0.01 at local midnight + k x step") {
   StationFolder folder({kS2Station});
   DllUnderTest dll;
-  Stations stations(dll, folder);
-  ITidesPort* port = stations.Port(0);
+  ITidesPort* port = Stations(dll, folder).Port(0);
 
   REQUIRE(port->Calculate(1.0, 36526.75) == S_OK);
   double date = 0;
@@ -306,13 +305,13 @@ TEST_CASE("the day: whole-day truncation, heights x 0.01 at local midnight + k x
   REQUIRE(port->Calculate(1.0, 1.0e7) == S_OK);
   CHECK(Points(port) == 0);
   port->Release();
+  CHECK(dll.CanUnloadNow() == S_OK);
 }
 
 TEST_CASE("a day of more than 32767 points is computed to its last point") {
   StationFolder folder({kS2Station});
   DllUnderTest dll;
-  Stations stations(dll, folder);
-  ITidesPort* port = stations.Port(0);
+  ITidesPort* port = Stations(dll, folder).Port(0);
   const double step = 0.0005;  // 48001 points
   REQUIRE(port->Calculate(step, 36526.0) == S_OK);
   REQUIRE(Points(port) == 48001);
@@ -322,6 +321,7 @@ TEST_CASE("a day of more than 32767 points is computed to its last point") {
     CHECK(Point(port, k) == doctest::Approx(2.0 + std::cos((30.0 * hours - 90.0) * kPi / 180.0)).epsilon(1e-4));
   }
   port->Release();
+  CHECK(dll.CanUnloadNow() == S_OK);
 }
 
 TEST_CASE("a constant curve: extremes at 0, heights x 0.01, zone read back sign-extended") {
