@@ -111,15 +111,4 @@ HRESULT FakeTidesPort::Event(const std::optional<double>& hours, double* value) 
   return S_OK;
 }
 
-STDMETHODIMP NotAPort::QueryInterface(REFIID riid, void** out) {
-  if (!out) return E_POINTER;
-  if (IsEqualIID(riid, IID_IUnknown)) {
-    *out = this;
-    AddRef();
-    return S_OK;
-  }
-  *out = nullptr;
-  return E_NOINTERFACE;
-}
-
 }  // namespace br::test

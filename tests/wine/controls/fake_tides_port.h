@@ -4,6 +4,7 @@
 #pragma once
 
 #include "BR_Info.h"
+#include "tests/wine/common/not_a_port.h"
 
 #include <optional>
 #include <vector>
@@ -63,18 +64,6 @@ public:
 
 private:
   HRESULT Event(const std::optional<double>& hours, double* value) const;
-  ULONG refs_ = 0;
-};
-
-// A plain COM object that is no port.
-class NotAPort final : public IUnknown {
-public:
-  STDMETHODIMP QueryInterface(REFIID riid, void** out) override;
-  STDMETHODIMP_(ULONG) AddRef() override { return ++refs_; }
-  STDMETHODIMP_(ULONG) Release() override { return --refs_; }
-  ULONG References() const { return refs_; }
-
-private:
   ULONG refs_ = 0;
 };
 

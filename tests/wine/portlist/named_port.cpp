@@ -21,17 +21,6 @@ STDMETHODIMP NamedPort::get_PortName(BSTR* name) {
   return S_OK;
 }
 
-STDMETHODIMP NotAPort::QueryInterface(REFIID riid, void** out) {
-  if (!out) return E_POINTER;
-  if (IsEqualIID(riid, IID_IUnknown)) {
-    *out = this;
-    AddRef();
-    return S_OK;
-  }
-  *out = nullptr;
-  return E_NOINTERFACE;
-}
-
 bool SelectSink::Connect(IUnknown* source) {
   IConnectionPointContainer* container = nullptr;
   if (FAILED(source->QueryInterface(IID_IConnectionPointContainer, reinterpret_cast<void**>(&container)))) return false;

@@ -4,6 +4,7 @@
 #pragma once
 
 #include "BR_Info.h"
+#include "tests/wine/common/not_a_port.h"
 
 #include <functional>
 #include <string>
@@ -42,18 +43,6 @@ public:
 
 private:
   std::wstring name_;
-  ULONG refs_ = 0;
-};
-
-// An object that is not a port.
-class NotAPort final : public IUnknown {
-public:
-  STDMETHODIMP QueryInterface(REFIID riid, void** out) override;
-  STDMETHODIMP_(ULONG) AddRef() override { return ++refs_; }
-  STDMETHODIMP_(ULONG) Release() override { return --refs_; }
-  ULONG References() const { return refs_; }
-
-private:
   ULONG refs_ = 0;
 };
 
