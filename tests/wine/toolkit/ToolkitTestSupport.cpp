@@ -11,10 +11,6 @@ using namespace toolkit;
 
 namespace {
 
-LRESULT CALLBACK hostProc(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam) {
-  return DefWindowProcA(hwnd, message, wParam, lParam);
-}
-
 LRESULT CALLBACK nativeProc(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam) {
   nativeCalls().push_back(NativeCall{hwnd, message, wParam});
   return DefWindowProcA(hwnd, message, wParam, lParam);
@@ -40,28 +36,6 @@ Seen record(const ToolkitEvent& e) {
 }
 
 }  // namespace
-
-HostWindow::HostWindow(int width, int height) {
-  registerOnce("ToolkitTestHost", hostProc);
-  hwnd_ = CreateWindowExA(0, "ToolkitTestHost", "host", WS_POPUP | WS_VISIBLE | WS_CLIPCHILDREN, 100, 100,
-                          width, height, nullptr, nullptr, GetModuleHandleA(nullptr), nullptr);
-}
-
-HostWindow::~HostWindow() {
-  if (hwnd_ && IsWindow(hwnd_)) DestroyWindow(hwnd_);
-}
-
-void pump(int ms) {
-  const DWORD end = GetTickCount() + static_cast<DWORD>(ms);
-  do {
-    MSG msg;
-    while (PeekMessageA(&msg, nullptr, 0, 0, PM_REMOVE)) {
-      TranslateMessage(&msg);
-      DispatchMessageA(&msg);
-    }
-    Sleep(1);
-  } while (static_cast<int>(end - GetTickCount()) > 0);
-}
 
 RECT placed(HWND hwnd) {
   RECT r{};

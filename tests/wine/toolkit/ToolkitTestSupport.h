@@ -1,31 +1,20 @@
 #pragma once
-// Helpers for the toolkit suites: a visible top-level host window, a message
-// pump, components that record what reaches them, and window rectangles read
-// back in parent coordinates.
+// Helpers for the toolkit suites: components that record what reaches them and window
+// rectangles in parent coordinates; the host window and pump are the widget suites'.
 
 #include <windows.h>
 
 #include <string>
 #include <vector>
 
+#include "tests/wine/widgets/WidgetTestSupport.h"
 #include "toolkit/core/Container.h"
 #include "toolkit/core/cXComponent.h"
 
 namespace tktest {
 
-// A plain popup window at (100, 100) on the screen, the parent of the trees under test.
-class HostWindow {
-public:
-  explicit HostWindow(int width = 400, int height = 300);
-  ~HostWindow();
-  HWND hwnd() const { return hwnd_; }
-
-private:
-  HWND hwnd_ = nullptr;
-};
-
-// Handles pending messages for about `ms` milliseconds.
-void pump(int ms);
+using wtest::HostWindow;
+using wtest::pump;
 
 // The window's rectangle in its parent's client coordinates.
 RECT placed(HWND hwnd);
