@@ -44,8 +44,6 @@ Set db2 = CreateObject("BR_Info.TidesDatabase")
 db2.Initialize ""
 Check db2.NumPorts = n, "a second database sees the same stations"
 
-r = db.GetPorts(10, 10, 10, 20)
-Check IsEmpty(r), "a box of no height is empty"
 r = db.GetPorts(-90, -180, 90, 180)
 ' (Wine's VBScript cannot look inside an array of objects: UBound ends the script.)
 Check IsArray(r), "the whole world is an array of ports"
