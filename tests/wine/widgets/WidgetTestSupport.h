@@ -48,6 +48,12 @@ public:
 // The panel made a window inside `host`, filling it.
 void mount(RecordingPanel& panel, HostWindow& host);
 
+// A recording panel filling a host window of its own.
+struct MountedPanel : RecordingPanel {
+  HostWindow host;
+  MountedPanel() { mount(*this, host); }
+};
+
 // Shift and Ctrl as GetKeyState sees them on this thread.
 void setModifiers(bool shift, bool ctrl);
 

@@ -134,9 +134,7 @@ struct Registered {
 TEST_CASE("an AXComponent hosts a control by class id in the platform's hosting window") {
   Registered registered;
   REQUIRE(AXComponent::hostingAvailable());
-  HostWindow host;
-  RecordingPanel panel;
-  mount(panel, host);
+  MountedPanel panel;
   g_lastMade = nullptr;
   {
     AXComponent ax;
@@ -175,9 +173,7 @@ TEST_CASE("an AXComponent hosts a control by class id in the platform's hosting 
 
 TEST_CASE("an AXComponent with a class nobody serves hosts nothing") {
   Registered registered;
-  HostWindow host;
-  RecordingPanel panel;
-  mount(panel, host);
+  MountedPanel panel;
   AXComponent ax;
   panel.add(&ax);
   const CLSID unknown = {0x11111111, 0x2222, 0x3333, {4, 4, 4, 4, 4, 4, 4, 4}};

@@ -85,9 +85,7 @@ TEST_CASE("tree view: native child, style, font of the parent, filling the compo
 }
 
 TEST_CASE("tree view notifications become events") {
-  HostWindow host;
-  RecordingPanel panel;
-  mount(panel, host);
+  MountedPanel panel;
   ContainedWindow tree;
   panel.add(&tree);
   tree.setBounds(0, 0, 150, 120, true, true);
@@ -115,9 +113,7 @@ TEST_CASE("tree view notifications become events") {
 }
 
 TEST_CASE("tree repaintAll puts the window colour into tree and image list") {
-  HostWindow host;
-  RecordingPanel panel;
-  mount(panel, host);
+  MountedPanel panel;
   ContainedWindow tree;
   panel.add(&tree);
   HWND native = tree.getHandle();
@@ -133,9 +129,7 @@ TEST_CASE("tree repaintAll puts the window colour into tree and image list") {
 }
 
 TEST_CASE("choice: styles, extent, items before and after the window") {
-  HostWindow host;
-  RecordingPanel panel;
-  mount(panel, host);
+  MountedPanel panel;
   Choice plain(300, 0, false), editable(0, 0, true);
   editable.setSorted(true);
   plain.addItem("zero");
@@ -173,9 +167,7 @@ TEST_CASE("choice: styles, extent, items before and after the window") {
 }
 
 TEST_CASE("choice events: selection changes bubble as commands, its own keys stay") {
-  HostWindow host;
-  RecordingPanel panel;
-  mount(panel, host);
+  MountedPanel panel;
   Choice choice;
   panel.add(&choice);
   choice.setBounds(0, 0, 120, 150, true, true);
@@ -257,9 +249,7 @@ TEST_CASE("a choice in a grid keeps the height of its list") {
 }
 
 TEST_CASE("tab container: tabs follow the children") {
-  HostWindow host;
-  RecordingPanel panel;
-  mount(panel, host);
+  MountedPanel panel;
   TabContainer tabs;
   Panel first, second, third, fourth;
   tabs.add(&first, "First");  // before the window: its tab comes with the window
@@ -296,9 +286,7 @@ TEST_CASE("tab container: tabs follow the children") {
 }
 
 TEST_CASE("tab container: selectPage rules and the tab strip's own selection change") {
-  HostWindow host;
-  RecordingPanel panel;
-  mount(panel, host);
+  MountedPanel panel;
   TabContainer tabs;
   Panel pages[3];
   panel.add(&tabs);
@@ -349,9 +337,7 @@ TEST_CASE("tab container: selectPage rules and the tab strip's own selection cha
 }
 
 TEST_CASE("tab container: a click on a tab selects its page") {
-  HostWindow host;
-  RecordingPanel panel;
-  mount(panel, host);
+  MountedPanel panel;
   TabContainer tabs;
   Panel a, b;
   panel.add(&tabs);
@@ -370,9 +356,7 @@ TEST_CASE("tab container: a click on a tab selects its page") {
 }
 
 TEST_CASE("tab container: Tab on the strip moves the focus on") {
-  HostWindow host;
-  RecordingPanel panel;
-  mount(panel, host);
+  MountedPanel panel;
   TabContainer tabs;
   Panel page;
   cXEdit2 inside, after;

@@ -148,9 +148,7 @@ TEST_CASE("hovering a second shows the popup; leaving hides it") {
 
 TEST_CASE("nested components: the innermost one under the cursor gets the popup") {
   REQUIRE(cursorMoves());
-  HostWindow host;
-  RecordingPanel panel;
-  mount(panel, host);
+  MountedPanel panel;
   TipOwner inner;
   inner.textToGive = "inner";
   panel.add(&inner);
@@ -195,9 +193,7 @@ TEST_CASE("the tooltip draws its frame, background and text") {
 }
 
 TEST_CASE("edit clipboard keys move plain ANSI text") {
-  HostWindow host;
-  RecordingPanel panel;
-  mount(panel, host);
+  MountedPanel panel;
   cXEdit2 edit;
   panel.add(&edit);
   edit.setBounds(0, 0, 200, 24, true, true);
