@@ -11,41 +11,12 @@ using namespace br::tides;
 using namespace br::tides::testing;
 namespace fs = std::filesystem;
 
-namespace {
-
-TestStation Station(const std::string& name, std::int16_t lat, std::int16_t lon,
-                    std::vector<ConstituentRecord> records = {{0, 0, 1234}}) {
-  TestStation s;
-  s.name = name;
-  s.latitude = lat;
-  s.longitude = lon;
-  s.constituents = std::move(records);
-  return s;
-}
-
-StationIndexRecord Key(std::int16_t lat, std::int16_t lon) {
-  StationIndexRecord r;
-  r.latitude = lat;
-  r.longitude = lon;
-  return r;
-}
-
-struct Closer {
-  ~Closer() { CloseTideFiles(); }
-};
-
-}  // namespace
-
 TEST_CASE("record images are little-endian whatever the host") {
-  StationIndexRecord r{0x1234, -630, -315, 0xA1B2C3D4u};
-  const auto b = EncodeStationIndexRecord(r);
+  const auto b = EncodeStationIndexRecord({0x1234, -630, -315, 0xA1B2C3D4u});
   const std::uint8_t expected[10] = {0x34, 0x12, 0x8A, 0xFD, 0xC5, 0xFE, 0xD4, 0xC3, 0xB2, 0xA1};
   for (int i = 0; i < 10; ++i) CHECK(b[static_cast<std::size_t>(i)] == expected[i]);
   const StationIndexRecord back = DecodeStationIndexRecord(b.data());
-  CHECK(back.station == 0x1234);
-  CHECK(back.latitude == -630);
-  CHECK(back.longitude == -315);
-  CHECK(back.offset == 0xA1B2C3D4u);
+  CHECK((back.station == 0x1234 && back.latitude == -630 && back.longitude == -315 && back.offset == 0xA1B2C3D4u));
 
   StationHeader h;
   SetStationName(h, "A name that is longer than the forty byte field of the header");
@@ -54,34 +25,23 @@ TEST_CASE("record images are little-endian whatever the host") {
   h.zone = -11;
   h.constituentCount = -3;
   const auto hb = EncodeStationHeader(h);
-  CHECK(hb[40] == 0x00);
-  CHECK(hb[41] == 0x80);
-  CHECK(hb[44] == 0xF5);
-  CHECK(hb[45] == 0xFD);
+  CHECK((hb[40] == 0x00 && hb[41] == 0x80 && hb[44] == 0xF5 && hb[45] == 0xFD));
   const StationHeader hh = DecodeStationHeader(hb.data());
   CHECK(StationName(hh) == "A name that is longer than the forty byt");
-  CHECK(hh.latitude == -32768);
-  CHECK(hh.longitude == 32767);
-  CHECK(hh.zone == -11);
-  CHECK(hh.constituentCount == -3);
+  CHECK((hh.latitude == -32768 && hh.longitude == 32767 && hh.zone == -11 && hh.constituentCount == -3));
 
   const auto cb = EncodeConstituentRecord({-2, 3599, 65535});
   const ConstituentRecord c = DecodeConstituentRecord(cb.data());
-  CHECK(cb[0] == 0xFE);
-  CHECK(cb[1] == 0xFF);
-  CHECK(c.number == -2);
-  CHECK(c.phase == 3599);
-  CHECK(c.amplitude == 65535);
+  CHECK((cb[0] == 0xFE && cb[1] == 0xFF));
+  CHECK((c.number == -2 && c.phase == 3599 && c.amplitude == 65535));
 
   SetStationName(h, "Brest");
   CHECK(StationName(h) == "Brest");
-  CHECK(h.name[5] == '\0');
-  CHECK(h.name[39] == '\0');
+  CHECK((h.name[5] == '\0' && h.name[39] == '\0'));
 }
 
 TEST_CASE("station key: latitude in the low half, longitude in the high half, unsigned") {
-  // 10 deg 30' S, 5 deg 15' W
-  const std::uint32_t key = StationKey(-630, -315);
+  const std::uint32_t key = StationKey(-630, -315);  // 10 deg 30' S, 5 deg 15' W
   CHECK((key >> 16) == 65221u);
   CHECK((key & 0xFFFFu) == 64906u);
   // Sorts after every station of non-negative longitude, whatever its latitude.
@@ -93,26 +53,24 @@ TEST_CASE("station key: latitude in the low half, longitude in the high half, un
 TEST_CASE("opening a folder") {
   Closer closer;
   TempFolder tmp;
-  WriteStationFolder(tmp.path(), {Station("North", 100, 200), Station("South", -630, -315),
-                                  Station("East", 0, 60)});
+  WriteStationFolder(tmp.path(), {Station(100, 200), Station(-630, -315), Station(0, 60)});
   const std::string plain = tmp.str();
 
   SUBCASE("with or without the trailing separator") {
-    REQUIRE(OpenTideFiles(plain.c_str()) == 0);
-    CHECK(StationCount() == 3);
-    REQUIRE(OpenTideFiles((plain + "/").c_str()) == 0);
-    CHECK(StationCount() == 3);
+    std::vector<std::string> forms = {plain, plain + "/"};
 #ifdef _WIN32
-    REQUIRE(OpenTideFiles((plain + "\\").c_str()) == 0);
-    CHECK(StationCount() == 3);
+    forms.push_back(plain + "\\");
 #endif
+    for (const std::string& form : forms) {
+      REQUIRE(OpenTideFiles(form.c_str()) == 0);
+      CHECK(StationCount() == 3);
+    }
   }
   SUBCASE("station numbers follow td_num.ntx") {
     REQUIRE(OpenTideFiles(plain.c_str()) == 0);
     StationIndexRecord r;
     REQUIRE(ReadStationIndexRecord(1, r));
-    CHECK(r.latitude == -630);
-    CHECK(r.longitude == -315);
+    CHECK((r.latitude == -630 && r.longitude == -315));
     REQUIRE(ReadStationIndexRecord(2, r));
     CHECK(r.longitude == 60);
     CHECK_FALSE(ReadStationIndexRecord(3, r));
@@ -127,7 +85,7 @@ TEST_CASE("opening a folder") {
   }
   SUBCASE("a folder without td_pnt.dat fails, and a later open succeeds") {
     TempFolder broken;
-    WriteStationFolder(broken.path(), {Station("Only", 1, 1)});
+    WriteStationFolder(broken.path(), {Station(1, 1)});
     fs::remove(broken.path() / kStationDataFileName);
     CHECK(OpenTideFiles(broken.str().c_str()) == -1);
     CHECK(StationCount() == 0);
@@ -138,7 +96,7 @@ TEST_CASE("opening a folder") {
   }
   SUBCASE("a second open replaces the first folder") {
     TempFolder other;
-    WriteStationFolder(other.path(), {Station("Other", 5, 5)});
+    WriteStationFolder(other.path(), {Station(5, 5)});
     REQUIRE(OpenTideFiles(plain.c_str()) == 0);
     REQUIRE(OpenTideFiles(other.str().c_str()) == 0);
     CHECK(StationCount() == 1);
@@ -155,19 +113,14 @@ TEST_CASE("folder path length: 240 characters accepted, 241 refused") {
     // Components of at most 100 characters keep within the file system's name limit.
     while (p.size() < length) {
       const std::size_t room = length - p.size();
-      if (room > 101) p += std::string(100, fill) + "/";
-      else p += std::string(room, fill);
+      p += room > 101 ? std::string(100, fill) + "/" : std::string(room, fill);
     }
     return p;
   };
-  const std::string p240 = folderOfLength(240, 'a');
-  const std::string p241 = folderOfLength(241, 'b');
-  REQUIRE(p240.size() == 240);
-  REQUIRE(p241.size() == 241);
-  REQUIRE(p240.back() != '/');
-  REQUIRE(p241.back() != '/');
-  WriteStationFolder(p240, {Station("A", 1, 2)});
-  WriteStationFolder(p241, {Station("B", 1, 2)});
+  const std::string p240 = folderOfLength(240, 'a'), p241 = folderOfLength(241, 'b');
+  REQUIRE((p240.size() == 240 && p241.size() == 241 && p240.back() != '/' && p241.back() != '/'));
+  WriteStationFolder(p240, {Station(1, 2)});
+  WriteStationFolder(p241, {Station(1, 2)});
   CHECK(OpenTideFiles(p240.c_str()) == 0);
   CHECK(OpenTideFiles(p241.c_str()) == -1);
   // A trailing separator makes a 240-character folder 241 long: refused as written.
@@ -177,7 +130,7 @@ TEST_CASE("folder path length: 240 characters accepted, 241 refused") {
 TEST_CASE("index files of odd or short lengths") {
   Closer closer;
   TempFolder tmp;
-  WriteStationFolder(tmp.path(), {Station("One", 10, 10), Station("Two", 20, 20), Station("Three", 30, 30)});
+  WriteStationFolder(tmp.path(), {Station(10, 10), Station(20, 20, {{0, 0, 1234}}, "Two"), Station(30, 30)});
 
   SUBCASE("a 25-byte td_num.ntx gives two stations") {
     TruncateFile(tmp.path() / kStationIndexFileName, 25);
@@ -201,13 +154,12 @@ TEST_CASE("index files of odd or short lengths") {
   }
   SUBCASE("more than 32767 stations is refused") {
     std::vector<std::uint8_t> big(static_cast<std::size_t>(kMaxStationCount + 1) * StationIndexRecord::kSize, 0);
-    WriteBytes(tmp.path() / kStationIndexFileName, big);
-    WriteBytes(tmp.path() / kCoordinateIndexFileName, big);
-    CHECK(OpenTideFiles(tmp.str().c_str()) == -1);
-    big.resize(big.size() - StationIndexRecord::kSize);
-    WriteBytes(tmp.path() / kStationIndexFileName, big);
-    WriteBytes(tmp.path() / kCoordinateIndexFileName, big);
-    REQUIRE(OpenTideFiles(tmp.str().c_str()) == 0);
+    for (int fits = 0; fits < 2; ++fits) {
+      if (fits) big.resize(big.size() - StationIndexRecord::kSize);
+      WriteBytes(tmp.path() / kStationIndexFileName, big);
+      WriteBytes(tmp.path() / kCoordinateIndexFileName, big);
+      CHECK(OpenTideFiles(tmp.str().c_str()) == (fits ? 0 : -1));
+    }
     CHECK(StationCount() == kMaxStationCount);
   }
 }
@@ -215,14 +167,13 @@ TEST_CASE("index files of odd or short lengths") {
 TEST_CASE("finding stations and loading their constituents") {
   Closer closer;
   TempFolder tmp;
-  TestStation brest = Station("Brest", 2903, -269, {{0, 0, 4500}, {29, 1053, 2050}, {36, 1450, 750}});
+  TestStation brest = Station(2903, -269, {{0, 0, 4500}, {29, 1053, 2050}, {36, 1450, 750}}, "Brest");
   brest.zone = -1;
-  TestStation negative = Station("Negative", -630, -315, {{0, 900, 1000}});
-  TestStation empty = Station("Empty", 1, 1, {});
-  TestStation negativeCount = Station("NegativeCount", 2, 2, {{29, 0, 1000}});
+  TestStation negativeCount = Station(2, 2, {{29, 0, 1000}});
   negativeCount.overrideCount = true;
   negativeCount.count = -5;
-  WriteStationFolder(tmp.path(), {brest, negative, empty, negativeCount});
+  WriteStationFolder(tmp.path(), {brest, Station(-630, -315, {{0, 900, 1000}}, "Negative"), Station(1, 1, {}),
+                                  negativeCount});
   REQUIRE(OpenTideFiles(tmp.str().c_str()) == 0);
   const TideEngine& engine = TheTideEngine();
 
@@ -230,20 +181,14 @@ TEST_CASE("finding stations and loading their constituents") {
     StationHeader h;
     REQUIRE(FindStation(Key(2903, -269), h));
     CHECK(StationName(h) == "Brest");
-    CHECK(h.latitude == 2903);
-    CHECK(h.longitude == -269);
-    CHECK(h.zone == -1);
-    CHECK(h.constituentCount == 3);
+    CHECK((h.latitude == 2903 && h.longitude == -269 && h.zone == -1 && h.constituentCount == 3));
     REQUIRE(engine.workingCount == 3);
     CHECK(engine.working[1].number == 29);
     CHECK(engine.working[1].g == doctest::Approx(105.3 * kPi / 180.0));
     CHECK(engine.working[1].H == doctest::Approx(205.0));
     CHECK(engine.working[1].V == 0.0);
     CHECK(engine.working[2].number == 36);
-    CHECK(engine.constituents[0].used == 1);
-    CHECK(engine.constituents[29].used == 1);
-    CHECK(engine.constituents[36].used == 1);
-    CHECK(engine.constituents[38].used == 0);
+    for (int n : {0, 29, 36, 38}) CHECK(engine.constituents[static_cast<std::size_t>(n)].used == (n != 38 ? 1 : 0));
   }
   SUBCASE("negative keys sort last and are still found") {
     StationHeader h;
@@ -282,16 +227,16 @@ TEST_CASE("bad station data is clipped, skipped or refused without reading past 
   Closer closer;
   TempFolder tmp;
   // A count above 69 with 80 records on file: only the first 69 are loaded.
-  TestStation many = Station("Many", 10, 10);
-  many.constituents.clear();
+  TestStation many = Station(10, 10, {});
   for (int i = 0; i < 80; ++i)
     many.constituents.push_back({static_cast<std::int16_t>(i % 69), static_cast<std::uint16_t>(i), 10});
-  TestStation bad = Station("Bad", 20, 20, {{0, 0, 100}, {-1, 0, 500}, {69, 0, 500}, {29, 0, 1000}, {300, 0, 9}});
+  const TestStation bad = Station(20, 20, {{0, 0, 100}, {-1, 0, 500}, {69, 0, 500}, {29, 0, 1000}, {300, 0, 9}});
   // Last block in the file: its count promises more records than remain.
-  TestStation cut = Station("Cut", 30, 30, {{0, 0, 100}, {29, 0, 1000}, {36, 0, 500}});
+  const TestStation cut = Station(30, 30, {{0, 0, 100}, {29, 0, 1000}, {36, 0, 500}});
   WriteStationFolder(tmp.path(), {many, bad, cut});
   REQUIRE(OpenTideFiles(tmp.str().c_str()) == 0);
   const TideEngine& engine = TheTideEngine();
+  const fs::path data = tmp.path() / kStationDataFileName;
 
   StationHeader h;
   REQUIRE(FindStation(Key(10, 10), h));
@@ -302,19 +247,17 @@ TEST_CASE("bad station data is clipped, skipped or refused without reading past 
 
   REQUIRE(FindStation(Key(20, 20), h));
   REQUIRE(engine.workingCount == 2);
-  CHECK(engine.working[0].number == 0);
-  CHECK(engine.working[1].number == 29);
+  CHECK((engine.working[0].number == 0 && engine.working[1].number == 29));
   CHECK(engine.working[1].H == doctest::Approx(100.0));
 
   SUBCASE("a block cut short counts as not found") {
-    TruncateFile(tmp.path() / kStationDataFileName, fs::file_size(tmp.path() / kStationDataFileName) - 1);
+    TruncateFile(data, fs::file_size(data) - 1);
     REQUIRE(OpenTideFiles(tmp.str().c_str()) == 0);
     CHECK_FALSE(FindStation(Key(30, 30), h));
     CHECK(FindStation(Key(20, 20), h));
   }
   SUBCASE("a header cut short counts as not found") {
-    const auto size = fs::file_size(tmp.path() / kStationDataFileName);
-    TruncateFile(tmp.path() / kStationDataFileName, size - 3 * ConstituentRecord::kSize - 10);
+    TruncateFile(data, fs::file_size(data) - 3 * ConstituentRecord::kSize - 10);
     REQUIRE(OpenTideFiles(tmp.str().c_str()) == 0);
     StationHeader kept;
     SetStationName(kept, "kept");
@@ -322,8 +265,7 @@ TEST_CASE("bad station data is clipped, skipped or refused without reading past 
     CHECK(StationName(kept) == "kept");
   }
   SUBCASE("an offset past the end of td_pnt.dat counts as not found") {
-    StationIndexRecord far{0, 40, 40, 0xFFFFFFF0u};
-    const auto b = EncodeStationIndexRecord(far);
+    const auto b = EncodeStationIndexRecord({0, 40, 40, 0xFFFFFFF0u});
     WriteBytes(tmp.path() / kStationIndexFileName, {b.begin(), b.end()});
     WriteBytes(tmp.path() / kCoordinateIndexFileName, {b.begin(), b.end()});
     REQUIRE(OpenTideFiles(tmp.str().c_str()) == 0);

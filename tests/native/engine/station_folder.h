@@ -45,4 +45,28 @@ void TruncateFile(const std::filesystem::path& file, std::uintmax_t size);
 // Writes raw bytes as a file.
 void WriteBytes(const std::filesystem::path& file, const std::vector<std::uint8_t>& bytes);
 
+// An index record that only carries a position, as the search takes it.
+inline StationIndexRecord Key(std::int16_t lat, std::int16_t lon) {
+  StationIndexRecord r;
+  r.latitude = lat;
+  r.longitude = lon;
+  return r;
+}
+
+// A station at (lat, lon) minutes; an empty name becomes "S<lat>_<lon>".
+inline TestStation Station(std::int16_t lat, std::int16_t lon,
+                           std::vector<ConstituentRecord> records = {{0, 0, 1234}}, std::string name = {}) {
+  TestStation s;
+  s.name = name.empty() ? "S" + std::to_string(lat) + "_" + std::to_string(lon) : std::move(name);
+  s.latitude = lat;
+  s.longitude = lon;
+  s.constituents = std::move(records);
+  return s;
+}
+
+// Closes the tide files at the end of a test case.
+struct Closer {
+  ~Closer() { CloseTideFiles(); }
+};
+
 }  // namespace br::tides::testing
