@@ -1,5 +1,7 @@
 #include "tests/wine/common/event_sink.h"
 
+#include "BR_Info.h"
+
 namespace br::test {
 
 bool EventSink::Connect(IUnknown* source) {
@@ -63,9 +65,26 @@ STDMETHODIMP EventSink::Invoke(DISPID id, REFIID riid, LCID locale, WORD flags, 
       if (v.vt == VT_R8) lastDoubles.push_back(v.dblVal);
     }
   }
+  if (params && params->cArgs > 0) {
+    const VARIANT& first = params->rgvarg[params->cArgs - 1];
+    argumentTypes.push_back(first.vt);
+    if (recordPortNames)
+      portNames.push_back(first.vt == VT_DISPATCH || first.vt == VT_UNKNOWN ? PortName(first.punkVal) : L"");
+  }
   if (result) result->vt = VT_EMPTY;
   if (onCall) onCall();
   return S_OK;
+}
+
+std::wstring PortName(IUnknown* port) {
+  ITidesPort* tides = nullptr;
+  if (!port || FAILED(port->QueryInterface(IID_ITidesPort, reinterpret_cast<void**>(&tides)))) return L"";
+  BSTR name = nullptr;
+  std::wstring out;
+  if (SUCCEEDED(tides->get_PortName(&name)) && name) out = name;
+  SysFreeString(name);
+  tides->Release();
+  return out;
 }
 
 }  // namespace br::test

@@ -7,6 +7,7 @@
 #include <ocidl.h>
 
 #include <functional>
+#include <string>
 #include <vector>
 
 namespace br::test {
@@ -26,6 +27,11 @@ public:
   bool lastIidNull = false;
   std::vector<double> lastDoubles;  // VT_R8 arguments of the last call, in call order
   UINT lastArgumentCount = 0;
+  // Of every call: the type of its first argument and, when recordPortNames is set, the
+  // name of the port it is (empty when it is none).
+  std::vector<VARTYPE> argumentTypes;
+  bool recordPortNames = false;
+  std::vector<std::wstring> portNames;
   std::function<void()> onCall;     // runs inside Invoke, after counting
 
   STDMETHODIMP QueryInterface(REFIID riid, void** out) override;
@@ -46,5 +52,8 @@ private:
   IConnectionPoint* point_ = nullptr;
   DWORD cookie_ = 0;
 };
+
+// The name of a port given as any of its interfaces (empty when it is no port).
+std::wstring PortName(IUnknown* port);
 
 }  // namespace br::test

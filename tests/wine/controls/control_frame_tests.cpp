@@ -1,12 +1,9 @@
 // The control frame as a container sees it, through TidesWindow: the interfaces it
-// answers, status and extent, persistence, the data object, quick activation and
-// IEmbeddedControl's other slots.
+// answers, status and extent, persistence, the data object and quick activation.
 #include "tests/wine/common/event_sink.h"
 #include "tests/wine/controls/graph_test_support.h"
 
 #include <doctest/doctest.h>
-
-#include <objsafe.h>
 
 using namespace br::test;
 
@@ -51,9 +48,8 @@ TEST_CASE("a control answers every control interface, one object behind them all
     face->Release();
   }
   identity->Release();
-  // Never marked safe for scripting or initialisation, and no aggregation helpers.
+  // (IObjectSafety is refused in the boundary suite.)
   IUnknown* none = nullptr;
-  CHECK(graph->QueryInterface(IID_IObjectSafety, reinterpret_cast<void**>(&none)) == E_NOINTERFACE);
   CHECK(graph->QueryInterface(IID_IPersistPropertyBag, reinterpret_cast<void**>(&none)) == E_NOINTERFACE);
   CHECK(none == nullptr);
 
@@ -66,7 +62,7 @@ TEST_CASE("a control answers every control interface, one object behind them all
   CHECK(dll.CanUnloadNow() == S_OK);
 }
 
-TEST_CASE("status, class, extent and the embedded-control slots") {
+TEST_CASE("status, class, extent and property pages") {
   DllUnderTest dll;
   GraphControl graph(dll);
   IOleObject* ole = Query<IOleObject>(graph.Get(), IID_IOleObject);
@@ -98,16 +94,6 @@ TEST_CASE("status, class, extent and the embedded-control slots") {
   CHECK(extent.cy == 4000);
   view->Release();
   ole->Release();
-
-  IEmbeddedControl* embedded = Query<IEmbeddedControl>(graph.Get(), IID_IEmbeddedControl);
-  LONG width = 0, height = 0;
-  CHECK(embedded->GetPreferredSize(&width, &height) == S_OK);
-  CHECK(width == 300);
-  CHECK(height == 200);
-  CHECK(embedded->GetPreferredSize(nullptr, &height) == E_POINTER);
-  CHECK(embedded->GetPreferredSize(&width, nullptr) == E_POINTER);
-  CHECK(embedded->Reserved(1, 2) == S_OK);
-  embedded->Release();
 
   ISpecifyPropertyPages* pages = Query<ISpecifyPropertyPages>(graph.Get(), IID_ISpecifyPropertyPages);
   CAUUID list{7, reinterpret_cast<GUID*>(1)};

@@ -25,9 +25,9 @@ STDMETHODIMP FakeTidesPort::GetTypeInfo(UINT, LCID, ITypeInfo** out) {
   return E_NOTIMPL;
 }
 
-STDMETHODIMP FakeTidesPort::get_PortName(BSTR* name) {
-  if (!name) return E_POINTER;
-  *name = SysAllocString(L"Fake");
+STDMETHODIMP FakeTidesPort::get_PortName(BSTR* out) {
+  if (!out) return E_POINTER;
+  *out = SysAllocString(name.c_str());
   return S_OK;
 }
 

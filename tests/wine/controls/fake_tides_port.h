@@ -1,5 +1,5 @@
-// A port of another make for the graph tests: its points, extremes, sun times and
-// position are whatever the test sets, and a sun event can be left out (its getter
+// A port of another make for the control tests: its name, points, extremes, sun times
+// and position are whatever the test sets, and a sun event can be left out (its getter
 // fails). Records the Calculate calls it receives.
 #pragma once
 
@@ -7,15 +7,16 @@
 #include "tests/wine/common/not_a_port.h"
 
 #include <optional>
+#include <string>
 #include <vector>
 
 namespace br::test {
 
 class FakeTidesPort final : public ITidesPort {
 public:
-  FakeTidesPort() = default;
+  explicit FakeTidesPort(const wchar_t* portName = L"Fake") : name(portName) {}
 
-  // Settings read by the graph.
+  std::wstring name;
   std::vector<double> points;
   double predictionDate = 45000.0;  // 2023-03-15
   double latitude = 48.0;

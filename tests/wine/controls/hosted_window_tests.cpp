@@ -1,7 +1,7 @@
 // TidesWindow in a standard container (Wine's ATL host): windowed activation as a child of
 // the host's window, its own window's pictures (WM_PRINTCLIENT, PrintWindow), the
 // pointer readout (MouseAction), font, cursor and erase handling, creation by
-// programmatic identifier and the registry entries behind it.
+// programmatic identifier.
 #include "tests/wine/common/event_sink.h"
 #include "tests/wine/controls/atl_host.h"
 #include "tests/wine/controls/graph_test_support.h"
@@ -160,30 +160,30 @@ TEST_CASE("MouseAction reports the time and height under the pointer") {
   const std::vector<double>& heights = hosted.port.points;
   const auto move = [&](int x) { return SendMessageW(hosted.window, WM_MOUSEMOVE, 0, MAKELPARAM(x, 100)); };
 
-  move(3);  // left of the plot: 00:00 and the first point
-  REQUIRE(sink.calls == 1);
+  struct Move {
+    int x;
+    int hour, minute;
+    std::size_t point;
+  };
+  const Move moves[] = {
+      {3, 0, 0, 0},       // left of the plot: 00:00 and the first point
+      {150, 12, 0, 12},   // dx 142 = 12 hours exactly; point trunc(142 / 284 * 25) = 12
+      {100, 7, 46, 8},    // dx 92: 7.77 hours = 07:46, point 8
+      {291, 23, 54, 24},  // the last pixel of the plot: 23:54, the last point
+  };
+  int calls = 0;
+  for (const Move& m : moves) {
+    CAPTURE(m.x);
+    move(m.x);
+    REQUIRE(sink.calls == ++calls);
+    REQUIRE(sink.lastDoubles.size() == 2);
+    CHECK(sink.lastDoubles[0] == doctest::Approx(TimeOf(m.hour, m.minute)).epsilon(1e-12));
+    CHECK(sink.lastDoubles[1] == heights[m.point]);
+  }
   CHECK(sink.lastId == 1);
   CHECK(sink.lastIidNull);
   CHECK(sink.lastFlags == DISPATCH_METHOD);
   CHECK(sink.lastLocale == LOCALE_USER_DEFAULT);
-  REQUIRE(sink.lastDoubles.size() == 2);
-  CHECK(sink.lastDoubles[0] == doctest::Approx(kDate).epsilon(1e-12));
-  CHECK(sink.lastDoubles[1] == heights[0]);
-
-  move(150);  // dx 142 = 12 hours exactly; point trunc(142 / 284 * 25) = 12
-  REQUIRE(sink.calls == 2);
-  CHECK(sink.lastDoubles[0] == doctest::Approx(TimeOf(12, 0)).epsilon(1e-12));
-  CHECK(sink.lastDoubles[1] == heights[12]);
-
-  move(100);  // dx 92: 7.77 hours = 07:46, point 8
-  REQUIRE(sink.calls == 3);
-  CHECK(sink.lastDoubles[0] == doctest::Approx(TimeOf(7, 46)).epsilon(1e-12));
-  CHECK(sink.lastDoubles[1] == heights[8]);
-
-  move(291);  // the last pixel of the plot: 23:54, the last point
-  REQUIRE(sink.calls == 4);
-  CHECK(sink.lastDoubles[0] == doctest::Approx(TimeOf(23, 54)).epsilon(1e-12));
-  CHECK(sink.lastDoubles[1] == heights[24]);
 
   move(292);  // 24:00 and the strip right of the plot: no time of this day, no event
   move(296);
@@ -331,39 +331,4 @@ TEST_CASE("created by its programmatic identifier in Wine's ATL host, it paints 
   CHECK(hostedPort.References() == 0);
   CHECK(directPort.References() == 0);
   CHECK(dll.CanUnloadNow() == S_OK);
-}
-
-TEST_CASE("registration gives the control its control keys and no safety categories") {
-  CLSID clsid{};
-  REQUIRE(CLSIDFromProgID(L"BR_Info.TidesWindow", &clsid) == S_OK);
-  CHECK(IsEqualCLSID(clsid, CLSID_TidesWindow));
-  wchar_t text[64];
-  StringFromGUID2(CLSID_TidesWindow, text, 64);
-  const std::wstring key = std::wstring(L"CLSID\\") + text;
-  const auto exists = [&](const std::wstring& sub) {
-    HKEY handle = nullptr;
-    const bool found = RegOpenKeyExW(HKEY_CLASSES_ROOT, (key + sub).c_str(), 0, KEY_READ, &handle) == ERROR_SUCCESS;
-    if (handle) RegCloseKey(handle);
-    return found;
-  };
-  const auto value = [&](const std::wstring& sub) {
-    wchar_t buffer[1024] = {};
-    LONG size = sizeof buffer;
-    if (RegQueryValueW(HKEY_CLASSES_ROOT, (key + sub).c_str(), buffer, &size) != ERROR_SUCCESS) return std::wstring();
-    return std::wstring(buffer);
-  };
-  CHECK(exists(L"\\Control"));
-  CHECK(exists(L"\\Insertable"));
-  CHECK(value(L"\\MiscStatus") == L"0");
-  CHECK(value(L"\\MiscStatus\\1") == L"131473");
-  CHECK(value(L"\\Version") == L"1.0");
-  const std::wstring toolbox = value(L"\\ToolboxBitmap32");
-  CHECK(toolbox.size() > 5);
-  CHECK(toolbox.substr(toolbox.size() - 5) == L", 109");
-  CHECK(value(L"\\InprocServer32").find(L"BR_Info.dll") != std::wstring::npos);
-  CHECK_FALSE(exists(L"\\Implemented Categories"));
-  HKEY insertable = nullptr;
-  CHECK(RegOpenKeyExW(HKEY_CLASSES_ROOT, L"BR_Info.TidesWindow.1\\Insertable", 0, KEY_READ, &insertable) ==
-        ERROR_SUCCESS);
-  if (insertable) RegCloseKey(insertable);
 }
