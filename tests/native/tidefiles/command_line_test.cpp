@@ -83,59 +83,55 @@ TEST_CASE("help and bad command lines") {
 
 TEST_CASE("build, check and dump a folder on disk") {
   TemporaryFolder tmp;
-  const auto json = tmp.Path() / "stations.json";
+  const auto json = tmp.path() / "stations.json";
   WriteText(json, kStations);
-  const std::string folder = (tmp.Path() / "folder").string();
+  const std::string folder = (tmp.path() / "folder").string();
   const ToolRun build = RunTool({"build", json.string(), folder});
-  CHECK(build.status == 0);
-  CHECK(build.out == "wrote 3 stations to " + folder + ", 0 warnings\n");
-  CHECK(std::filesystem::file_size(tmp.Path() / "folder" / "td_num.ntx") == 30);
-  CHECK_FALSE(std::filesystem::exists(tmp.Path() / "folder" / "td_num.ntx.tmp"));
+  CHECK((build.status == 0 && build.out == "wrote 3 stations to " + folder + ", 0 warnings\n"));
+  CHECK(std::filesystem::file_size(tmp.path() / "folder" / "td_num.ntx") == 30);
+  CHECK_FALSE(std::filesystem::exists(tmp.path() / "folder" / "td_num.ntx.tmp"));
 
   const ToolRun check = RunTool({"check", folder});
-  CHECK(check.status == 0);
-  CHECK(check.out == "ok: 3 stations\n");
+  CHECK((check.status == 0 && check.out == "ok: 3 stations\n"));
 
   const ToolRun dump = RunTool({"dump", folder});
   CHECK(dump.status == 0);
   const Json stations = Json::parse(dump.out);
   REQUIRE(stations.size() == 3);
-  CHECK(stations[2]["name"] == "South");
-  CHECK(stations[2]["zone"] == -1);
-  CHECK(stations[2]["constituents"][1]["name"] == "K1");
+  CHECK((stations[2]["name"] == "South" && stations[2]["zone"] == -1 && stations[2]["constituents"][1]["name"] == "K1"));
 
   // Standard input works as the JSON source, and errors leave the folder untouched.
-  const ToolRun fromStdin = RunTool({"build", "-", (tmp.Path() / "other").string()}, kStations);
-  CHECK(fromStdin.status == 0);
+  CHECK(RunTool({"build", "-", (tmp.path() / "other").string()}, kStations).status == 0);
   const ToolRun bad = RunTool({"build", "-", folder}, R"([{"name": "X"}])");
-  CHECK(bad.status == 1);
-  CHECK(bad.err.find("nothing written (4 errors)") != std::string::npos);
+  CHECK((bad.status == 1 && bad.err.find("nothing written (4 errors)") != std::string::npos));
   CHECK(RunTool({"check", folder}).out == "ok: 3 stations\n");
 }
 
 TEST_CASE("missing files and folders are reported, never crash") {
   TemporaryFolder tmp;
-  const ToolRun noJson = RunTool({"build", (tmp.Path() / "absent.json").string(), tmp.Str()});
-  CHECK(noJson.status == 1);
-  CHECK(noJson.err.find("absent.json: cannot open") != std::string::npos);
-  const ToolRun noFolder = RunTool({"check", (tmp.Path() / "absent").string()});
-  CHECK(noFolder.status == 1);
-  CHECK(noFolder.out.find("absent: not a folder") != std::string::npos);
-  const ToolRun noData = RunTool({"check", tmp.Str()});
-  CHECK(noData.status == 1);
-  CHECK(noData.out.find("td_num.ntx: cannot read") != std::string::npos);
-  CHECK(RunTool({"dump", tmp.Str()}).status == 1);
-  const ToolRun noPredict = RunTool({"predict", tmp.Str(), "--station", "0", "--date", "2024-01-01"});
-  CHECK(noPredict.status == 1);
-  CHECK(noPredict.err.find("cannot open the station folder") != std::string::npos);
-  const ToolRun longPath = RunTool({"predict", std::string(241, 'x'), "--station", "0", "--date", "2024-01-01"});
-  CHECK(longPath.status == 1);
-  CHECK(longPath.err.find("longer than 240 characters") != std::string::npos);
+  const std::string absent = (tmp.path() / "absent").string();
+  const struct {
+    std::vector<std::string> args;
+    bool onOut;
+    const char* message;
+  } cases[] = {
+      {{"build", absent + ".json", tmp.str()}, false, "absent.json: cannot open"},
+      {{"check", absent}, true, "absent: not a folder"},
+      {{"check", tmp.str()}, true, "td_num.ntx: cannot read"},
+      {{"dump", tmp.str()}, false, ""},
+      {{"predict", tmp.str(), "--station", "0", "--date", "2024-01-01"}, false, "cannot open the station folder"},
+      {{"predict", std::string(241, 'x'), "--station", "0", "--date", "2024-01-01"}, false, "longer than 240 characters"},
+  };
+  for (const auto& c : cases) {
+    const ToolRun run = RunTool(c.args);
+    CHECK_MESSAGE(run.status == 1, c.message);
+    CHECK_MESSAGE((c.onOut ? run.out : run.err).find(c.message) != std::string::npos, c.message);
+  }
 }
 
 TEST_CASE("predict prints a day in metres with its extremes and sun events") {
   TemporaryFolder tmp;
-  const std::string folder = tmp.Str();
+  const std::string folder = tmp.str();
   REQUIRE(RunTool({"build", "-", folder}, kStations).status == 0);
 
   SUBCASE("a mean-level-only station is flat at its level") {
@@ -143,36 +139,24 @@ TEST_CASE("predict prints a day in metres with its extremes and sun events") {
     CHECK(day["name"] == "Level");
     REQUIRE(day["heights"].size() == 25);
     for (const Json& h : day["heights"]) CHECK(h.get<double>() == doctest::Approx(1.234).epsilon(1e-6));
-    CHECK(day["highest"]["index"] == 0);
-    CHECK(day["lowest"]["index"] == 0);
+    CHECK((day["highest"]["index"] == 0 && day["lowest"]["index"] == 0));
   }
   SUBCASE("the step sets the sample count") {
-    CHECK(PredictJson(folder, {"--station", "0", "--date", "2024-06-01", "--step", "0.25"})["heights"].size() == 97);
-    CHECK(PredictJson(folder, {"--station", "0", "--date", "2024-06-01", "--step", "30"})["heights"].size() == 2);
-    CHECK(PredictJson(folder, {"--station", "0", "--date", "2024-06-01", "--step", "48"})["heights"].size() == 1);
+    for (const auto& [step, count] : {std::pair<const char*, std::size_t>{"0.25", 97}, {"30", 2}, {"48", 1}})
+      CHECK(PredictJson(folder, {"--station", "0", "--date", "2024-06-01", "--step", step})["heights"].size() == count);
   }
-  SUBCASE("the worked M2 day of 1996-01-01") {
+  SUBCASE("the worked M2 day of 1996-01-01, in metres (the engine suite checks its every value)") {
     const Json day = PredictJson(folder, {"--station", "1", "--date", "1996-01-01"});
-    const Json& h = day["heights"];
-    // M2 of 1 m at Greenwich, phase 0: V(M2) = 117.86 degrees at 00:00 UT, f about 1.0386.
-    CHECK(h[0].get<double>() == doctest::Approx(-0.4984).epsilon(2e-3));
-    CHECK(h[1].get<double>() == doctest::Approx(-0.8775).epsilon(2e-3));
-    CHECK(day["lowest"]["index"] == 2);
-    CHECK(day["highest"]["index"] == 21);
+    CHECK(day["heights"][0].get<double>() == doctest::Approx(-0.4984).epsilon(2e-3));
+    CHECK((day["lowest"]["index"] == 2 && day["highest"]["index"] == 21));
     CHECK(day["highest"]["height"].get<double>() == doctest::Approx(1.0301).epsilon(2e-3));
-    // Latitude 0, longitude 0, zone 0 in early January: sunrise close to 06:00.
-    const int sunrise = day["sun"]["sunrise"]["hour"].get<int>() * 60 + day["sun"]["sunrise"]["minute"].get<int>();
-    CHECK(sunrise >= 5 * 60 + 50);
-    CHECK(sunrise <= 6 * 60 + 10);
   }
   SUBCASE("a station found by position, with its zone time sun events") {
     const Json day = PredictJson(folder, {"--at", "-10.5", "-5.25", "--date", "2024-03-01", "--step", "6"});
-    CHECK(day["name"] == "South");
+    CHECK((day["name"] == "South" && day["zone"] == -1));
     CHECK(day["latitude"].get<double>() == doctest::Approx(-10.5));
-    CHECK(day["zone"] == -1);
     const int sunrise = day["sun"]["sunrise"]["hour"].get<int>() * 60 + day["sun"]["sunrise"]["minute"].get<int>();
-    CHECK(sunrise > 6 * 60);   // about 06:24 UT at 5 15'W, shown an hour later
-    CHECK(sunrise < 8 * 60);
+    CHECK((sunrise > 6 * 60 && sunrise < 8 * 60));  // about 06:24 UT at 5 15'W, shown an hour later
   }
   SUBCASE("a UTC-5 computer's day is the UTC day from 05:00") {
     const Json utc = PredictJson(folder, {"--station", "2", "--date", "2024-03-01"});
@@ -183,22 +167,18 @@ TEST_CASE("predict prints a day in metres with its extremes and sun events") {
   SUBCASE("the table form") {
     const ToolRun run = RunTool({"predict", folder, "--station", "1", "--date", "1996-01-01"});
     CHECK(run.status == 0);
-    CHECK(run.out.find("Semidiurnal") != std::string::npos);
-    CHECK(run.out.find("     2  02:00    -1.037") != std::string::npos);
-    CHECK(run.out.find("lowest:  index 2 (02:00) -1.037 m") != std::string::npos);
-    CHECK(run.out.find("sun (zone time): twilight begin") != std::string::npos);
+    for (const char* line : {"Semidiurnal", "     2  02:00    -1.037", "lowest:  index 2 (02:00) -1.037 m",
+                             "sun (zone time): twilight begin"})
+      CHECK_MESSAGE(run.out.find(line) != std::string::npos, line);
   }
   SUBCASE("no such station") {
     const ToolRun number = RunTool({"predict", folder, "--station", "3", "--date", "2024-01-01"});
-    CHECK(number.status == 1);
-    CHECK(number.err.find("no station number 3 (the folder has 3 stations") != std::string::npos);
+    CHECK((number.status == 1 && number.err.find("no station number 3 (the folder has 3 stations") != std::string::npos));
     const ToolRun position = RunTool({"predict", folder, "--at", "1", "1", "--date", "2024-01-01"});
-    CHECK(position.status == 1);
-    CHECK(position.err.find("no station at latitude 60', longitude 60'") != std::string::npos);
+    CHECK((position.status == 1 && position.err.find("no station at latitude 60', longitude 60'") != std::string::npos));
   }
   SUBCASE("a step too small for a day") {
     const ToolRun run = RunTool({"predict", folder, "--station", "0", "--date", "2024-01-01", "--step", "0.00001"});
-    CHECK(run.status == 1);
-    CHECK(run.err.find("at most 1000000 samples") != std::string::npos);
+    CHECK((run.status == 1 && run.err.find("at most 1000000 samples") != std::string::npos));
   }
 }

@@ -19,6 +19,10 @@ int RowOf(const std::string& name) {
   return match ? match->row : -1;
 }
 
+void CheckRows(std::initializer_list<std::pair<const char*, int>> rows) {
+  for (const auto& [name, row] : rows) CHECK_MESSAGE(RowOf(name) == row, name);
+}
+
 bool ViaDoodson(const std::string& name) {
   const auto match = MatchConstituentName(name);
   return match && match->via == ConstituentMatch::Via::DoodsonNumbers;
@@ -27,97 +31,44 @@ bool ViaDoodson(const std::string& name) {
 }  // namespace
 
 TEST_CASE("usual names map to their rows, whatever the letter case") {
-  CHECK(RowOf("Z0") == 0);
-  CHECK(RowOf("Sa") == 1);
-  CHECK(RowOf("SA") == 1);
-  CHECK(RowOf("ssa") == 2);
-  CHECK(RowOf("MSF") == 4);
-  CHECK(RowOf("Mf") == 5);
-  CHECK(RowOf("O1") == 8);
-  CHECK(RowOf("k1") == 15);
-  CHECK(RowOf("2N2") == 21);
-  CHECK(RowOf("M2") == 29);
-  CHECK(RowOf("S2") == 36);
-  CHECK(RowOf("K2") == 38);
-  CHECK(RowOf("MO3") == 40);
-  CHECK(RowOf("M3") == 42);
-  CHECK(RowOf("MK3") == 45);
-  CHECK(RowOf("2MS6") == 67);
-  CHECK(RowOf("2mk6") == 68);
+  CheckRows({{"Z0", 0}, {"Sa", 1}, {"SA", 1}, {"ssa", 2}, {"MSF", 4}, {"Mf", 5}, {"O1", 8}, {"k1", 15}, {"2N2", 21},
+             {"M2", 29}, {"S2", 36}, {"K2", 38}, {"MO3", 40}, {"M3", 42}, {"MK3", 45}, {"2MS6", 67}, {"2mk6", 68}});
   CHECK_FALSE(ViaDoodson("M2"));
   // Every row that has a usual name is found again by it.
   for (int row = 0; row < br::tides::kConstituentCount; ++row) {
     const std::string name(UsualConstituentName(row));
     if (!name.empty()) CHECK_MESSAGE(RowOf(name) == row, name);
   }
-  CHECK(UsualConstituentName(20).empty());
-  CHECK(UsualConstituentName(69).empty());
-  CHECK(UsualConstituentName(-1).empty());
+  for (int row : {20, 69, -1}) CHECK(UsualConstituentName(row).empty());
 }
 
 TEST_CASE("common spellings of the Greek-letter constituents") {
-  CHECK(RowOf("RHO") == 7);
-  CHECK(RowOf("RHO1") == 7);
-  CHECK(RowOf("rho1") == 7);
-  CHECK(RowOf("LAM2") == 32);
-  CHECK(RowOf("LAMBDA2") == 32);
-  CHECK(RowOf("LDA2") == 32);
-  CHECK(RowOf("THE1") == 18);
-  CHECK(RowOf("THETA1") == 18);
-  CHECK(RowOf("NU2") == 26);
-  CHECK(RowOf("MU2") == 22);
-  CHECK(RowOf("TAU1") == 9);
-  CHECK(RowOf("PHI1") == 17);
-  CHECK(RowOf("\xCE\xBD" "2") == 26);  // ν2
-  CHECK(RowOf("\xCF\x81" "1") == 7);   // ρ1
+  CheckRows({{"RHO", 7}, {"RHO1", 7}, {"rho1", 7}, {"LAM2", 32}, {"LAMBDA2", 32}, {"LDA2", 32}, {"THE1", 18},
+             {"THETA1", 18}, {"NU2", 26}, {"MU2", 22}, {"TAU1", 9}, {"PHI1", 17},
+             {"\xCE\xBD" "2", 26}, {"\xCF\x81" "1", 7}});  // ν2, ρ1
 }
 
 TEST_CASE("compound names get their Doodson numbers from their components") {
-  const auto mks2 = DoodsonNumbersOfName("MKS2");  // M2 + K2 - S2
-  REQUIRE(mks2);
-  CHECK(mks2->multipliers == std::array<int, 6>{2, 0, 2, 0, 0, 0});
-  CHECK(mks2->quarterTurns == 0);
-  const auto twoMK3 = DoodsonNumbersOfName("2MK3");  // 2 M2 - K1
-  REQUIRE(twoMK3);
-  CHECK(twoMK3->multipliers == std::array<int, 6>{3, -1, 0, 0, 0, 0});
-  CHECK(twoMK3->quarterTurns == -1);
-  const auto op2 = DoodsonNumbersOfName("OP2");  // O1 + P1: two -90 degree phases
-  REQUIRE(op2);
-  CHECK(op2->multipliers == std::array<int, 6>{2, 0, -2, 0, 0, 0});
-  CHECK(op2->quarterTurns == -2);
-  const auto m8 = DoodsonNumbersOfName("M8");  // overtide: 4 M2
-  REQUIRE(m8);
-  CHECK(m8->multipliers == std::array<int, 6>{8, 0, 0, 0, 0, 0});
-  const auto sk3 = DoodsonNumbersOfName("SK3");  // S2 + K1
-  REQUIRE(sk3);
-  CHECK(sk3->multipliers == std::array<int, 6>{3, 3, -2, 0, 0, 0});
-  CHECK(sk3->quarterTurns == 1);
+  // MKS2 = M2 + K2 - S2, 2MK3 = 2 M2 - K1, OP2 = O1 + P1 (two -90 degree phases), M8 = 4 M2, SK3 = S2 + K1.
+  const DoodsonNumbers expected[] = {{{2, 0, 2, 0, 0, 0}, 0}, {{3, -1, 0, 0, 0, 0}, -1}, {{2, 0, -2, 0, 0, 0}, -2},
+                                     {{8, 0, 0, 0, 0, 0}, 0}, {{3, 3, -2, 0, 0, 0}, 1}};
+  const char* names[] = {"MKS2", "2MK3", "OP2", "M8", "SK3"};
+  for (int i = 0; i < 5; ++i) {
+    CAPTURE(names[i]);
+    const auto numbers = DoodsonNumbersOfName(names[i]);
+    REQUIRE(numbers);
+    CHECK(numbers->multipliers == expected[i].multipliers);
+    CHECK(numbers->quarterTurns == expected[i].quarterTurns);
+  }
   // No sign pattern reaches the species, or letters that are no component.
-  CHECK_FALSE(DoodsonNumbersOfName("3N2"));
-  CHECK_FALSE(DoodsonNumbersOfName("OO1"));
-  CHECK_FALSE(DoodsonNumbersOfName("M(KS)2"));
-  CHECK_FALSE(DoodsonNumbersOfName("SA_KV"));
-  CHECK_FALSE(DoodsonNumbersOfName("MSQM"));
-  CHECK_FALSE(DoodsonNumbersOfName("M0"));
-  CHECK_FALSE(DoodsonNumbersOfName("2"));
+  for (const char* name : {"3N2", "OO1", "M(KS)2", "SA_KV", "MSQM", "M0", "2"}) CHECK_FALSE(DoodsonNumbersOfName(name));
 }
 
 TEST_CASE("names whose Doodson numbers equal a row's map to that row") {
-  CHECK(RowOf("2MK3") == 40);  // the MO3 row
-  CHECK(ViaDoodson("2MK3"));
-  CHECK(RowOf("OP2") == 27);
-  CHECK(RowOf("MKS2") == 31);
-  CHECK(RowOf("SO3") == 43);  // rows 43 and 44 are the same: the first
-  CHECK(RowOf("SN4") == 54);
-  CHECK(RowOf("MA2") == 28);
-  CHECK(RowOf("MB2") == 30);
-  CHECK(RowOf("NO3") == 39);
-  CHECK(RowOf("MSN6") == 65);
-  CHECK(RowOf("3MS4") == 48);
-  CHECK(RowOf("2MK2") == 20);
-  CHECK(RowOf("TK1") == 12);  // T2 - K1: the pi1 row
-  CHECK(RowOf("MP1") == 9);   // M2 - P1: the tau1 row
-  CHECK(ViaDoodson("MA2"));
+  // 2MK3 in the MO3 row; SO3 in the first of the equal rows 43 and 44; TK1 = T2 - K1 (pi1); MP1 = M2 - P1 (tau1).
+  CheckRows({{"2MK3", 40}, {"OP2", 27}, {"MKS2", 31}, {"SO3", 43}, {"SN4", 54}, {"MA2", 28}, {"MB2", 30}, {"NO3", 39},
+             {"MSN6", 65}, {"3MS4", 48}, {"2MK2", 20}, {"TK1", 12}, {"MP1", 9}});
+  CHECK((ViaDoodson("2MK3") && ViaDoodson("MA2")));
 }
 
 TEST_CASE("names with no row are not matched") {

@@ -16,24 +16,20 @@ using namespace br::tidefiles::test;
 namespace bt = br::tides;
 
 TEST_CASE("fields are rounded to whole minutes, millimetres and tenths of a degree") {
-  CHECK(WholeMinutes(50.103) == 3006);
-  CHECK(WholeMinutes(-10.5) == -630);
-  CHECK(WholeMinutes(-5.25) == -315);
+  CHECK((WholeMinutes(50.103) == 3006 && WholeMinutes(-10.5) == -630 && WholeMinutes(-5.25) == -315));
   CHECK(WholeMinutes(180.0) == 10800);
-  bool clipped = false;
-  CHECK(AmplitudeField(1.7116, clipped) == 1712);
-  CHECK_FALSE(clipped);
-  CHECK(AmplitudeField(65.535, clipped) == 65535);
-  CHECK_FALSE(clipped);
-  CHECK(AmplitudeField(65.536, clipped) == 65535);
-  CHECK(clipped);
-  CHECK(AmplitudeField(1e300, clipped) == 65535);
-  CHECK(clipped);
-  CHECK(PhaseField(133.71) == 1337);
-  CHECK(PhaseField(-5.0) == 3550);
-  CHECK(PhaseField(359.96) == 0);
-  CHECK(PhaseField(720.04) == 0);
-  CHECK(PhaseField(-0.04) == 0);
+  const struct {
+    double metres;
+    int field;
+    bool clipped;
+  } amplitudes[] = {{1.7116, 1712, false}, {65.535, 65535, false}, {65.536, 65535, true}, {1e300, 65535, true}};
+  for (const auto& a : amplitudes) {
+    bool clipped = !a.clipped;
+    CHECK(AmplitudeField(a.metres, clipped) == a.field);
+    CHECK(clipped == a.clipped);
+  }
+  const std::pair<double, int> phases[] = {{133.71, 1337}, {-5.0, 3550}, {359.96, 0}, {720.04, 0}, {-0.04, 0}};
+  for (const auto& [degrees, field] : phases) CHECK(PhaseField(degrees) == field);
   CHECK(PhaseField(1e18) < 3600);
 }
 
@@ -45,33 +41,22 @@ TEST_CASE("a station block: mean level first, then the constituents in order") {
     {"name": "None", "latitude": 2, "longitude": 2, "zone": 0, "constituents": []}])");
   const auto index = IndexRecords(image.stationIndex);
   REQUIRE(index.size() == 3);
-  CHECK(index[0].offset == 0);
-  CHECK(index[1].offset == 46 + 3 * 6);
+  CHECK((index[0].offset == 0 && index[1].offset == 46 + 3 * 6));
   const bt::StationHeader h = HeaderAt(image, 0);
   CHECK(bt::StationName(h) == "Port");
-  CHECK(h.latitude == 3006);
-  CHECK(h.longitude == -333);
-  CHECK(h.zone == -1);
-  CHECK(h.constituentCount == 3);
+  CHECK((h.latitude == 3006 && h.longitude == -333 && h.zone == -1 && h.constituentCount == 3));
   const auto records = RecordsAt(image, 0);
-  CHECK(records[0].number == 0);
-  CHECK(records[0].amplitude == 3265);
-  CHECK(records[0].phase == 0);
-  CHECK(records[1].number == 29);
-  CHECK(records[1].amplitude == 1712);
-  CHECK(records[1].phase == 1337);
-  CHECK(records[2].number == 36);
-  CHECK(records[2].phase == 1778);
+  const int expected[3][3] = {{0, 3265, 0}, {29, 1712, 1337}, {36, 572, 1778}};  // number, amplitude, phase
+  for (int k = 0; k < 3; ++k)
+    CHECK((records[k].number == expected[k][0] && records[k].amplitude == expected[k][1] && records[k].phase == expected[k][2]));
   // A level below chart datum is stored as its size half a turn round.
   const auto below = RecordsAt(image, index[1].offset);
   REQUIRE(below.size() == 1);
-  CHECK(below[0].amplitude == 106);
-  CHECK(below[0].phase == 1800);
+  CHECK((below[0].amplitude == 106 && below[0].phase == 1800));
   // Without a mean level the station still starts with a zero constituent 0.
   const auto none = RecordsAt(image, index[2].offset);
   REQUIRE(none.size() == 1);
-  CHECK(none[0].number == 0);
-  CHECK(none[0].amplitude == 0);
+  CHECK((none[0].number == 0 && none[0].amplitude == 0));
   CHECK(CheckFolderImage(image).empty());
 }
 
@@ -86,22 +71,12 @@ TEST_CASE("td_crd.ntx is sorted by the unsigned key: negative positions sort las
   const auto sorted = IndexRecords(image.coordinateIndex);
   REQUIRE(sorted.size() == 5);
   // td_num.ntx keeps the given order.
-  CHECK(numbered[0].latitude == -630);
-  CHECK(numbered[0].longitude == -315);
-  const std::uint32_t key = bt::StationKey(numbered[0]);
-  CHECK((key >> 16) == 65221u);
-  CHECK((key & 0xFFFFu) == 64906u);
+  CHECK((numbered[0].latitude == -630 && numbered[0].longitude == -315));
   for (std::size_t k = 1; k < sorted.size(); ++k) CHECK(bt::StationKey(sorted[k - 1]) < bt::StationKey(sorted[k]));
   // Non-negative longitudes first (origin, north-east, south-east), then the negative ones.
-  CHECK(sorted[0].latitude == 0);
-  CHECK(sorted[1].latitude == 630);
-  CHECK(sorted[2].latitude == -630);
-  CHECK(sorted[2].longitude == 10794);
-  // Longitude -315' reads 65221 and -6' reads 65530: the station at 10 30'S 5 15'W comes
-  // after every non-negative longitude and before the one at 0 06'W.
-  CHECK(sorted[3].latitude == -630);
-  CHECK(sorted[3].longitude == -315);
-  CHECK(sorted[4].longitude == -6);
+  // Longitude -315' reads 65221 and -6' reads 65530: 10 30'S 5 15'W comes before 0 06'W.
+  const int positions[5][2] = {{0, 0}, {630, 315}, {-630, 10794}, {-630, -315}, {60, -6}};
+  for (int k = 0; k < 5; ++k) CHECK((sorted[k].latitude == positions[k][0] && sorted[k].longitude == positions[k][1]));
 }
 
 TEST_CASE("stations whose positions round to the same whole minutes: the first is kept") {
@@ -145,8 +120,7 @@ TEST_CASE("oversized amplitudes are clipped with a warning") {
      "constituents": [{"name": "M2", "amplitude": 66, "phase": 0}]}])",
                                           d);
   const auto records = RecordsAt(image, 0);
-  CHECK(records[0].amplitude == 65535);
-  CHECK(records[1].amplitude == 65535);
+  CHECK((records[0].amplitude == 65535 && records[1].amplitude == 65535));
   CHECK(Mentions(d, Severity::Warning, "mean level does not fit in 65.535 m; clipped"));
   CHECK(Mentions(d, Severity::Warning, "M2 amplitude 66 m clipped to 65.535 m"));
 }
@@ -186,9 +160,7 @@ TEST_CASE("build then dump gives the same JSON, and building that gives the same
   const std::vector<StationEntry> dumped = DumpFolderImage(first, dumpDiagnostics);
   CHECK(dumpDiagnostics.All().empty());
   REQUIRE(dumped.size() == 5);
-  CHECK(dumped[0].name == "Ålesund");
-  CHECK(dumped[0].tag == 513);
-  CHECK(dumped[0].meanLevel == 1.2);
+  CHECK((dumped[0].name == "Ålesund" && dumped[0].tag == 513 && dumped[0].meanLevel == 1.2));
   CHECK(dumped[1].meanLevel == -0.05);
   CHECK_FALSE(dumped[2].meanLevel.has_value());  // a level with phase 90 stays a constituent
   REQUIRE(dumped[2].constituents.size() == 1);
@@ -202,18 +174,15 @@ TEST_CASE("build then dump gives the same JSON, and building that gives the same
   CHECK(text.find("\"phase\": 0.0") != std::string::npos);     // 359.99 rounds to a full turn
 
   const FolderImage second = BuildFromJson(text);
-  CHECK(second.stationIndex == first.stationIndex);
-  CHECK(second.coordinateIndex == first.coordinateIndex);
-  CHECK(second.stationData == first.stationData);
+  CHECK((second.stationIndex == first.stationIndex && second.coordinateIndex == first.coordinateIndex &&
+         second.stationData == first.stationData));
   Diagnostics again;
   CHECK(WriteStationsJson(DumpFolderImage(second, again)) == text);
 }
 
 TEST_CASE("an empty array makes an empty folder") {
   const FolderImage image = BuildFromJson("[]");
-  CHECK(image.stationIndex.empty());
-  CHECK(image.coordinateIndex.empty());
-  CHECK(image.stationData.empty());
+  CHECK((image.stationIndex.empty() && image.coordinateIndex.empty() && image.stationData.empty()));
   CHECK(CheckFolderImage(image).empty());
   Diagnostics d;
   CHECK(WriteStationsJson(DumpFolderImage(image, d)) == "[]\n");

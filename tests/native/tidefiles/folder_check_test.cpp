@@ -32,6 +32,16 @@ bt::StationIndexRecord IndexAt(const std::vector<std::uint8_t>& file, std::size_
   return bt::DecodeStationIndexRecord(&file[record * 10]);
 }
 
+// Rewrites one index record through change.
+void Patch(std::vector<std::uint8_t>& file, std::size_t record, const std::function<void(bt::StationIndexRecord&)>& change) {
+  auto r = IndexAt(file, record);
+  change(r);
+  SetIndex(file, record, r);
+}
+
+void MoveTo60(bt::StationIndexRecord& r) { r.latitude = 60, r.longitude = 60; }
+void MoveSouth(bt::StationIndexRecord& r) { r.latitude = -631; }
+
 // Station A's block starts at 0: header at 0, records at 46, 52, 58.
 void PutI16(FolderImage& image, std::size_t at, int value) {
   bt::PutU16(&image.stationData[at], static_cast<std::uint16_t>(value));
@@ -69,52 +79,22 @@ TEST_CASE("each fault gives its own clear line") {
        },
        "td_crd.ntx: record 1: key 0 follows 3932220: not sorted by ascending StationKey"},
       {"duplicate key in both indexes",
-       [](FolderImage& f) {
-         auto b = IndexAt(f.stationIndex, 1);
-         b.latitude = 60, b.longitude = 60;
-         SetIndex(f.stationIndex, 1, b);
-         auto crdB = IndexAt(f.coordinateIndex, 0);
-         crdB.latitude = 60, crdB.longitude = 60;
-         SetIndex(f.coordinateIndex, 0, crdB);
-       },
+       [](FolderImage& f) { Patch(f.stationIndex, 1, MoveTo60), Patch(f.coordinateIndex, 0, MoveTo60); },
        "td_num.ntx: station 1: duplicate key: same position (latitude 60', longitude 60') as station 0"},
-      {"duplicate key in td_crd.ntx",
-       [](FolderImage& f) {
-         auto crdB = IndexAt(f.coordinateIndex, 0);
-         crdB.latitude = 60, crdB.longitude = 60;
-         SetIndex(f.coordinateIndex, 0, crdB);
-       },
+      {"duplicate key in td_crd.ntx", [](FolderImage& f) { Patch(f.coordinateIndex, 0, MoveTo60); },
        "td_crd.ntx: record 1: duplicate key: same position (latitude 60', longitude 60') as record 0"},
       {"index copies with different offsets",
-       [](FolderImage& f) {
-         auto r = IndexAt(f.coordinateIndex, 1);
-         r.offset += 6;
-         SetIndex(f.coordinateIndex, 1, r);
-       },
+       [](FolderImage& f) { Patch(f.coordinateIndex, 1, [](bt::StationIndexRecord& r) { r.offset += 6; }); },
        "td_crd.ntx: station 0: record 1 differs from the td_num.ntx copy (offset 6 vs 0"},
-      {"a station missing from td_crd.ntx",
-       [](FolderImage& f) {
-         auto r = IndexAt(f.coordinateIndex, 2);
-         r.latitude = -631;
-         SetIndex(f.coordinateIndex, 2, r);
-       },
+      {"a station missing from td_crd.ntx", [](FolderImage& f) { Patch(f.coordinateIndex, 2, MoveSouth); },
        "td_crd.ntx: station 2: no record for its position (latitude -630', longitude -315')"},
-      {"a td_crd.ntx record of no station",
-       [](FolderImage& f) {
-         auto r = IndexAt(f.coordinateIndex, 2);
-         r.latitude = -631;
-         SetIndex(f.coordinateIndex, 2, r);
-       },
+      {"a td_crd.ntx record of no station", [](FolderImage& f) { Patch(f.coordinateIndex, 2, MoveSouth); },
        "td_crd.ntx: record 2: position (latitude -631', longitude -315') belongs to no station of td_num.ntx"},
       {"an offset beyond td_pnt.dat",
        [](FolderImage& f) {
-         for (auto* file : {&f.stationIndex, &f.coordinateIndex}) {
-           for (std::size_t k = 0; k < 3; ++k) {
-             auto r = IndexAt(*file, k);
-             if (r.latitude == 0) r.offset = 100000;
-             SetIndex(*file, k, r);
-           }
-         }
+         for (auto* file : {&f.stationIndex, &f.coordinateIndex})
+           for (std::size_t k = 0; k < 3; ++k)
+             Patch(*file, k, [](bt::StationIndexRecord& r) { r.offset = r.latitude == 0 ? 100000 : r.offset; });
        },
        "td_pnt.dat: station 1: block offset 100000 leaves no room for the 46-byte header (file has 174 bytes)"},
       {"td_pnt.dat cut short", [](FolderImage& f) { f.stationData.resize(f.stationData.size() - 1); },
@@ -136,18 +116,10 @@ TEST_CASE("each fault gives its own clear line") {
       {"a zone description out of range", [](FolderImage& f) { f.stationData[44] = 20; },
        "td_pnt.dat: station 0: zone description 20 is outside -14..14 hours"},
       {"a latitude beyond the pole",
-       [](FolderImage& f) {
-         auto r = IndexAt(f.stationIndex, 1);
-         r.latitude = 5401;
-         SetIndex(f.stationIndex, 1, r);
-       },
+       [](FolderImage& f) { Patch(f.stationIndex, 1, [](bt::StationIndexRecord& r) { r.latitude = 5401; }); },
        "td_num.ntx: station 1: latitude 5401' is outside -5400..5400 minutes"},
       {"a longitude beyond the date line",
-       [](FolderImage& f) {
-         auto r = IndexAt(f.stationIndex, 1);
-         r.longitude = -10801;
-         SetIndex(f.stationIndex, 1, r);
-       },
+       [](FolderImage& f) { Patch(f.stationIndex, 1, [](bt::StationIndexRecord& r) { r.longitude = -10801; }); },
        "td_num.ntx: station 1: longitude -10801' is outside -10800..10800 minutes"},
   };
   for (const Fault& fault : faults) {

@@ -34,16 +34,10 @@ TEST_CASE("a complete station reads with its values") {
   REQUIRE(stations.size() == 1);
   CHECK(d.All().empty());
   const StationEntry& s = stations[0];
-  CHECK(s.name == "Port");
-  CHECK(s.latitude == 50.5);
-  CHECK(s.longitude == -4.25);
-  CHECK(s.meanLevel == 3.265);
-  CHECK(s.tag == 7);
+  CHECK((s.name == "Port" && s.latitude == 50.5 && s.longitude == -4.25 && s.meanLevel == 3.265 && s.tag == 7));
   REQUIRE(s.constituents.size() == 2);
-  CHECK(s.constituents[0].row == 29);
-  CHECK(s.constituents[0].amplitude == 1.7116);
-  CHECK(s.constituents[1].row == 36);
-  CHECK(s.constituents[1].phase == -10);
+  CHECK((s.constituents[0].row == 29 && s.constituents[0].amplitude == 1.7116 && s.constituents[0].phase == 133.71));
+  CHECK((s.constituents[1].row == 36 && s.constituents[1].amplitude == 0.5 && s.constituents[1].phase == -10));
 }
 
 TEST_CASE("malformed input is an error with a clear message") {
@@ -125,8 +119,7 @@ TEST_CASE("two constituents of one row: a repeat is dropped, an equal-speed cons
   CHECK(c[0].row == 40);
   CHECK(c[0].amplitude == doctest::Approx(0.02 * std::sqrt(2.0)));
   CHECK(c[0].phase == doctest::Approx(45.0));
-  CHECK(c[1].row == 7);
-  CHECK(c[1].amplitude == 0.3);
+  CHECK((c[1].row == 7 && c[1].amplitude == 0.3));
   CHECK(Mentions(d, Severity::Warning, "rho1 repeats RHO (table row 7); dropped"));
   CHECK(Mentions(d, Severity::Note, "2MK3 has the Doodson numbers of MO3"));
 }
@@ -138,9 +131,8 @@ TEST_CASE("values that cannot be stored: negative amplitude dropped, longitude b
            "constituents": [{"name": "M2", "amplitude": -1, "phase": 0, "kind": "x"}]}])",
       d);
   REQUIRE(stations.size() == 1);
-  CHECK(stations[0].longitude == -10.0);
-  CHECK(stations[0].constituents.empty());
-  CHECK(Mentions(d, Severity::Warning, "M2: negative amplitude cannot be stored; dropped"));
-  CHECK(Mentions(d, Severity::Warning, "unknown field \"mystery\" ignored"));
-  CHECK(Mentions(d, Severity::Warning, "unknown field \"kind\" ignored"));
+  CHECK((stations[0].longitude == -10.0 && stations[0].constituents.empty()));
+  for (const char* warning : {"M2: negative amplitude cannot be stored; dropped", "unknown field \"mystery\" ignored",
+                              "unknown field \"kind\" ignored"})
+    CHECK_MESSAGE(Mentions(d, Severity::Warning, warning), warning);
 }

@@ -2,8 +2,6 @@
 
 #include <doctest/doctest.h>
 
-#include <atomic>
-#include <random>
 #include <sstream>
 
 #include "tools/tidefiles/command_line.h"
@@ -11,19 +9,6 @@
 #include "tools/tidefiles/station_json.h"
 
 namespace br::tidefiles::test {
-
-TemporaryFolder::TemporaryFolder() {
-  static std::atomic<int> counter{0};
-  std::random_device random;
-  path_ = std::filesystem::temp_directory_path() /
-          ("tidefiles-test-" + std::to_string(random()) + "-" + std::to_string(counter++));
-  std::filesystem::create_directories(path_);
-}
-
-TemporaryFolder::~TemporaryFolder() {
-  std::error_code ignored;
-  std::filesystem::remove_all(path_, ignored);
-}
 
 FolderImage BuildFromJson(const std::string& json, Diagnostics& diagnostics) {
   const std::vector<StationEntry> stations = ReadStationsJson(json, diagnostics);

@@ -1,30 +1,19 @@
-// Helpers shared by the tidefiles suites: station folders made from JSON text, temporary
-// folders, and the tool run in-process.
+// Helpers shared by the tidefiles suites: folder images made from JSON text and the tool run in-process.
 #pragma once
 
 #include <filesystem>
 #include <string>
 #include <vector>
 
+#include "tests/native/engine/station_folder.h"
 #include "tides/engine/station_files.h"
 #include "tools/tidefiles/diagnostics.h"
 #include "tools/tidefiles/folder_image.h"
 
 namespace br::tidefiles::test {
 
-// A folder under the system's temporary directory, removed with everything in it.
-class TemporaryFolder {
- public:
-  TemporaryFolder();
-  ~TemporaryFolder();
-  TemporaryFolder(const TemporaryFolder&) = delete;
-  TemporaryFolder& operator=(const TemporaryFolder&) = delete;
-  const std::filesystem::path& Path() const { return path_; }
-  std::string Str() const { return path_.string(); }
-
- private:
-  std::filesystem::path path_;
-};
+// A temporary folder removed with everything in it (the engine suites' helper).
+using TemporaryFolder = br::tides::testing::TempFolder;
 
 // JSON text -> folder image; fails the test when the build refuses it.
 FolderImage BuildFromJson(const std::string& json, Diagnostics& diagnostics);
