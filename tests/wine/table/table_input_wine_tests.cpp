@@ -30,13 +30,11 @@ std::vector<Notification> notifications(const RecordingPanel& panel, const Table
 
 // A station-like table of names shown by name, row data = insertion index.
 struct Mounted {
-  HostWindow host{300, 200};
-  RecordingPanel panel;
+  wtest::MountedPanel panel;
   Table table;
 
   explicit Mounted(bool editable = false) {
     panel.add(&table, "table");
-    wtest::mount(panel, host);
     table.setBounds(0, 0, 300, 200, true, true);
     table.addColumn("name", "Name", 1, 0, nullptr, editable);
     const char* names[] = {"Le Havre", "Anvers", "Brest", "Zeebrugge"};

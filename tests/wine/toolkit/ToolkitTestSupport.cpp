@@ -2,7 +2,6 @@
 
 #include <cstdio>
 
-#include "toolkit/base/ClassRecords.h"
 #include "toolkit/layout/BorderLayout.h"
 
 namespace tktest {
@@ -102,8 +101,6 @@ int ProbePanel::dispatchEvent(ToolkitEvent& event) {
   seen.push_back(record(event));
   return Container::dispatchEvent(event);
 }
-
-const ClassRecord* FakeChoice::getClassRecord() const { return &records::Choice; }
 
 const char* nativeClassName() {
   registerOnce("ToolkitTestNative", nativeProc);

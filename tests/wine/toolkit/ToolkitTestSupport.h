@@ -38,7 +38,6 @@ public:
   std::vector<Seen> seen;
   int answer = 0;             // what the handlers below answer
   bool markHandled = false;   // whether they mark the event handled
-  int destroyedCount = 0;
   int* deletions = nullptr;   // counts destructor runs when set
   bool deleteSelfOnKey = false;
 
@@ -68,16 +67,6 @@ public:
   int dispatchEvent(toolkit::ToolkitEvent& event) override;
   int onAction(toolkit::ToolkitEvent&) override { return answer; }
   int onKeyDown(toolkit::ToolkitEvent&, int) override { return answer; }
-};
-
-// Stands in for the drop-down list widget: a Choice by its record, whose own
-// height (that of the opened list) is `listHeight`.
-class FakeChoice : public toolkit::cXComponent {
-public:
-  int listHeight = 150;
-  const toolkit::ClassRecord* getClassRecord() const override;
-  SIZE getPreferredSize() override { return SIZE{60, 22}; }
-  SIZE getPreferredSizeIn(const RECT&) override { return SIZE{60, listHeight}; }
 };
 
 // A window class whose procedure records the messages it receives: stands for a

@@ -3,6 +3,8 @@
 #include <doctest/doctest.h>
 
 #include <algorithm>
+#include <utility>
+#include <vector>
 
 #include "ToolkitTestSupport.h"
 #include "toolkit/core/Panel.h"
@@ -53,60 +55,47 @@ TEST_CASE("every message of the table becomes its event with its parameters") {
   NMHDR nm{h, 7, 0};
   const LPARAM nmAt = reinterpret_cast<LPARAM>(&nm);
   const auto hAt = reinterpret_cast<std::intptr_t>(h);
-  // message, wParam, lParam, then the event and one of its parameters (index -1: none).
-  struct Row { UINT m; WPARAM w; LPARAM l; int id, index; std::intptr_t value; };
+  // message, wParam, lParam, then the event and (index, value) pairs of its parameters.
+  using P = std::vector<std::pair<int, std::intptr_t>>;
+  struct Row { UINT m; WPARAM w; LPARAM l; int id; P params; };
   const Row rows[] = {
-      {WM_COMMAND, MAKEWPARAM(1001, 5), 0x1234, kEventCommand, 0, 5},
-      {WM_COMMAND, MAKEWPARAM(1001, 5), 0x1234, kEventCommand, 1, 1001},
-      {WM_COMMAND, MAKEWPARAM(1001, 5), 0x1234, kEventCommand, 2, 0x1234},
-      {WM_NOTIFY, 7, nmAt, kEventNotify, 0, 1},
-      {WM_NOTIFY, 7, nmAt, kEventNotify, 1, WM_NOTIFY},
-      {WM_NOTIFY, 7, nmAt, kEventNotify, 3, nmAt},  // a full-width pointer
-      {WM_DRAWITEM, 0, 0, kEventNotify, 0, 2},
-      {WM_MEASUREITEM, 0, 0, kEventNotify, 0, 3},
-      {WM_KEYDOWN, VK_LEFT, 0x10001, kEventKeyDown, 0, VK_LEFT},
-      {WM_KEYDOWN, VK_LEFT, 0x10001, kEventKeyDown, 1, 0x10001},
-      {WM_KEYUP, 'A', 0, kEventKeyUp, 0, 'A'},
-      {WM_CHAR, 0x1B0, 0, kEventChar, 0, 0xB0},  // one byte of the character
-      {WM_RBUTTONDBLCLK, MK_RBUTTON, MAKELPARAM(7, 9), kEventMouseDown, 0, 7},
-      {WM_RBUTTONDBLCLK, MK_RBUTTON, MAKELPARAM(7, 9), kEventMouseDown, 1, 9},
-      {WM_RBUTTONDBLCLK, MK_RBUTTON, MAKELPARAM(7, 9), kEventMouseDown, 2, 1},
-      {WM_RBUTTONDBLCLK, MK_RBUTTON, MAKELPARAM(7, 9), kEventMouseDown, 3, MK_RBUTTON},
-      {WM_RBUTTONDBLCLK, MK_RBUTTON, MAKELPARAM(7, 9), kEventMouseDown, 4, 1},
-      {WM_LBUTTONDOWN, MK_LBUTTON, MAKELPARAM(3, 4), kEventMouseDown, 2, 0},
-      {WM_LBUTTONDOWN, MK_LBUTTON, MAKELPARAM(3, 4), kEventMouseDown, 4, 0},
-      {WM_MOUSEMOVE, MK_LBUTTON, MAKELPARAM(11, 12), kEventMouseDrag, -1, 0},
-      {WM_MOUSEMOVE, MK_SHIFT, MAKELPARAM(13, 14), kEventMouseMove, 0, 13},
-      {WM_MOUSEMOVE, MK_SHIFT, MAKELPARAM(13, 14), kEventMouseMove, 2, MK_SHIFT},
-      {WM_RBUTTONUP, 0, MAKELPARAM(1, 2), kEventMouseUp, 2, 1},
-      {WM_MOUSEWHEEL, MAKEWPARAM(0, 120), MAKELPARAM(300, 200), kEventMouseWheel, 0, 300},
-      {WM_VSCROLL, MAKEWPARAM(SB_THUMBTRACK, 33), 0, kEventScrollThumb, 0, 33},
-      {WM_VSCROLL, MAKEWPARAM(SB_THUMBTRACK, 33), 0, kEventScrollThumb, 1, 0},
-      {WM_HSCROLL, SB_LINEDOWN, 0, kEventScrollLineDown, 0, 1},
-      {WM_VSCROLL, SB_LINEUP, 0, kEventScrollLineUp, -1, 0},
-      {WM_VSCROLL, SB_PAGEDOWN, 0, kEventScrollPageDown, -1, 0},
-      {WM_VSCROLL, SB_PAGEUP, 0, kEventScrollPageUp, -1, 0},
-      {WM_SIZE, SIZE_MAXIMIZED, MAKELPARAM(640, 480), kEventMaximized, 0, 640},
-      {WM_SIZE, SIZE_MAXIMIZED, MAKELPARAM(640, 480), kEventMaximized, 1, 480},
-      {WM_SIZE, SIZE_MINIMIZED, 0, kEventMinimized, -1, 0},
-      {WM_SIZE, SIZE_RESTORED, MAKELPARAM(5, 6), kEventResized, 1, 6},
-      {WM_MOVE, 0, 0, kEventMoved, -1, 0},
-      {WM_ACTIVATE, WA_CLICKACTIVE, 0, kEventActivated, -1, 0},
-      {WM_ACTIVATE, WA_INACTIVE, 0, kEventDeactivated, -1, 0},
-      {WM_TIMER, 5, 0, kEventTimer, 0, 5},
-      {WM_SETCURSOR, static_cast<WPARAM>(hAt), MAKELPARAM(HTCLIENT, WM_MOUSEMOVE), kEventSetCursor, 0, hAt},
-      {WM_SETFOCUS, 0, 0, kEventFocusGained, -1, 0},
-      {WM_KILLFOCUS, 0, 0, kEventFocusLost, -1, 0},
+      {WM_COMMAND, MAKEWPARAM(1001, 5), 0x1234, kEventCommand, {{0, 5}, {1, 1001}, {2, 0x1234}}},
+      {WM_NOTIFY, 7, nmAt, kEventNotify, {{0, 1}, {1, WM_NOTIFY}, {3, nmAt}}},  // a full-width pointer
+      {WM_DRAWITEM, 0, 0, kEventNotify, {{0, 2}}},
+      {WM_MEASUREITEM, 0, 0, kEventNotify, {{0, 3}}},
+      {WM_KEYDOWN, VK_LEFT, 0x10001, kEventKeyDown, {{0, VK_LEFT}, {1, 0x10001}}},
+      {WM_KEYUP, 'A', 0, kEventKeyUp, {{0, 'A'}}},
+      {WM_CHAR, 0x1B0, 0, kEventChar, {{0, 0xB0}}},  // one byte of the character
+      {WM_RBUTTONDBLCLK, MK_RBUTTON, MAKELPARAM(7, 9), kEventMouseDown, {{0, 7}, {1, 9}, {2, 1}, {3, MK_RBUTTON}, {4, 1}}},
+      {WM_LBUTTONDOWN, MK_LBUTTON, MAKELPARAM(3, 4), kEventMouseDown, {{2, 0}, {4, 0}}},
+      {WM_MOUSEMOVE, MK_LBUTTON, MAKELPARAM(11, 12), kEventMouseDrag, {}},
+      {WM_MOUSEMOVE, MK_SHIFT, MAKELPARAM(13, 14), kEventMouseMove, {{0, 13}, {2, MK_SHIFT}}},
+      {WM_RBUTTONUP, 0, MAKELPARAM(1, 2), kEventMouseUp, {{2, 1}}},
+      {WM_MOUSEWHEEL, MAKEWPARAM(0, 120), MAKELPARAM(300, 200), kEventMouseWheel, {{0, 300}}},
+      {WM_VSCROLL, MAKEWPARAM(SB_THUMBTRACK, 33), 0, kEventScrollThumb, {{0, 33}, {1, 0}}},
+      {WM_HSCROLL, SB_LINEDOWN, 0, kEventScrollLineDown, {{0, 1}}},
+      {WM_VSCROLL, SB_LINEUP, 0, kEventScrollLineUp, {}},
+      {WM_VSCROLL, SB_PAGEDOWN, 0, kEventScrollPageDown, {}},
+      {WM_VSCROLL, SB_PAGEUP, 0, kEventScrollPageUp, {}},
+      {WM_SIZE, SIZE_MAXIMIZED, MAKELPARAM(640, 480), kEventMaximized, {{0, 640}, {1, 480}}},
+      {WM_SIZE, SIZE_MINIMIZED, 0, kEventMinimized, {}},
+      {WM_SIZE, SIZE_RESTORED, MAKELPARAM(5, 6), kEventResized, {{1, 6}}},
+      {WM_MOVE, 0, 0, kEventMoved, {}},
+      {WM_ACTIVATE, WA_CLICKACTIVE, 0, kEventActivated, {}},
+      {WM_ACTIVATE, WA_INACTIVE, 0, kEventDeactivated, {}},
+      {WM_TIMER, 5, 0, kEventTimer, {{0, 5}}},
+      {WM_SETCURSOR, static_cast<WPARAM>(hAt), MAKELPARAM(HTCLIENT, WM_MOUSEMOVE), kEventSetCursor, {{0, hAt}}},
+      {WM_SETFOCUS, 0, 0, kEventFocusGained, {}},
+      {WM_KILLFOCUS, 0, 0, kEventFocusLost, {}},
   };
   for (const Row& row : rows) {
     CAPTURE(row.m);
-    CAPTURE(row.index);
     send(row.m, row.w, row.l);
     const Seen* s = p.last(row.id);
     REQUIRE(s);
     CHECK(s->source == &p);
     CHECK(s->hwnd == h);
-    if (row.index >= 0) CHECK(s->params[row.index] == row.value);
+    for (const auto& [index, value] : row.params) CHECK(s->params[index] == value);
   }
   send(WM_RBUTTONDBLCLK, MK_RBUTTON, MAKELPARAM(7, 9));
   CHECK(p.last(kEventMouseDown)->keyState == MK_RBUTTON);

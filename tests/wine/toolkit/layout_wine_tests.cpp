@@ -108,18 +108,6 @@ TEST_CASE("insets shrink the area; nested visible containers are laid out in the
   t.root.removeComponent(hiddenBox, true);
 }
 
-TEST_CASE("a drop-down list keeps its own height wherever a layout gives one") {
-  Tree t(std::make_unique<GridLayout>(2, 1, 0, 0, nullptr, 68), 200, 100);
-  FakeChoice list;
-  list.listHeight = 160;
-  t.root.add(&list);
-  Probe& other = t.add(10, 10);
-  t.root.doLayout();
-  CHECK_PLACED(list, 0, 0, 200, 160);
-  CHECK_PLACED(other, 0, 50, 200, 50);
-  t.root.removeComponent(&list, false);
-}
-
 TEST_CASE("nothing is laid out without a layout, children or a client area") {
   Tree t(std::make_unique<GridLayout>(1, 1), 100, 100);
   Probe& a = t.add(10, 10);

@@ -22,24 +22,25 @@ int waitFor(Probe& p, int id, int limitMs) {
   return p.last(id) ? static_cast<int>(GetTickCount() - start) : -1;
 }
 
-bool cursorMoves() {
-  SetCursorPos(7, 9);
-  POINT at{};
-  GetCursorPos(&at);
-  return at.x == 7 && at.y == 9;
-}
+// A 100 x 100 probe in the host's corner (the host is at (100, 100) on the screen) and the
+// cursor at (150, 150) over it, before any mouse message.
+struct Hovered {
+  HostWindow host;
+  Probe p;
+  Hovered() {
+    REQUIRE(wtest::cursorMoves());
+    REQUIRE(p.create(host.hwnd()));
+    p.setBounds(0, 0, 100, 100, true, true);
+    p.seen.clear();
+    SetCursorPos(150, 150);
+  }
+};
 
 }  // namespace
 
 TEST_CASE("entering yields event 10 before the first 12; leaving yields 11 within about 20 ms") {
-  REQUIRE(cursorMoves());
-  HostWindow host;  // at (100, 100) on the screen
-  Probe p;
-  REQUIRE(p.create(host.hwnd()));
-  p.setBounds(0, 0, 100, 100, true, true);
-  p.seen.clear();
-
-  SetCursorPos(150, 150);
+  Hovered h;
+  Probe& p = h.p;
   SendMessageA(p.getHandle(), WM_MOUSEMOVE, 0, MAKELPARAM(50, 50));
   std::vector<int> ids = p.ids();
   REQUIRE(ids.size() == 2);
@@ -78,12 +79,8 @@ TEST_CASE("entering yields event 10 before the first 12; leaving yields 11 withi
 }
 
 TEST_CASE("no exit while the window holds the mouse capture") {
-  REQUIRE(cursorMoves());
-  HostWindow host;
-  Probe p;
-  REQUIRE(p.create(host.hwnd()));
-  p.setBounds(0, 0, 100, 100, true, true);
-  SetCursorPos(150, 150);
+  Hovered h;
+  Probe& p = h.p;
   SendMessageA(p.getHandle(), WM_MOUSEMOVE, 0, MAKELPARAM(50, 50));
   REQUIRE(p.last(kEventMouseEnter));
 
@@ -99,12 +96,8 @@ TEST_CASE("no exit while the window holds the mouse capture") {
 }
 
 TEST_CASE("destroying the window ends the tracking") {
-  REQUIRE(cursorMoves());
-  HostWindow host;
-  Probe p;
-  REQUIRE(p.create(host.hwnd()));
-  p.setBounds(0, 0, 100, 100, true, true);
-  SetCursorPos(150, 150);
+  Hovered h;
+  Probe& p = h.p;
   SendMessageA(p.getHandle(), WM_MOUSEMOVE, 0, 0);
   REQUIRE(p.peer()->trackingTimer() != 0);
   p.destroyWindow();

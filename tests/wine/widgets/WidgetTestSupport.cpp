@@ -150,4 +150,24 @@ std::string windowClass(HWND hwnd) {
   return name;
 }
 
+Metrics metricsOf(const char* text, UINT flags) {
+  Metrics m;
+  HDC dc = GetDC(nullptr);
+  HGDIOBJ old = SelectObject(dc, GetStockObject(DEFAULT_GUI_FONT));
+  GetTextMetricsA(dc, &m.tm);
+  RECT box{0, 0, 0, 0};
+  DrawTextA(dc, text, -1, &box, DT_CALCRECT | flags);
+  m.measured = SIZE{box.right, box.bottom};
+  SelectObject(dc, old);
+  ReleaseDC(nullptr, dc);
+  return m;
+}
+
+bool cursorMoves() {
+  SetCursorPos(7, 9);
+  POINT at{};
+  GetCursorPos(&at);
+  return at.x == 7 && at.y == 9;
+}
+
 }  // namespace wtest

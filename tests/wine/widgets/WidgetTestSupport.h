@@ -84,4 +84,14 @@ private:
 
 std::string windowClass(HWND hwnd);
 
+// The default GUI font's metrics and the extent DrawText gives `text` in it.
+struct Metrics {
+  TEXTMETRICA tm{};
+  SIZE measured{};
+};
+Metrics metricsOf(const char* text, UINT flags = DT_NOPREFIX);
+
+// Moves the shared cursor to a test point: false where the platform keeps it still.
+bool cursorMoves();
+
 }  // namespace wtest

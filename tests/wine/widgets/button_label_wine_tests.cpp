@@ -15,25 +15,6 @@ using namespace wtest;
 
 namespace {
 
-struct Metrics {
-  TEXTMETRICA tm{};
-  SIZE measured{};
-};
-
-// What the default GUI font measures for `text`, independently of the widgets.
-Metrics metricsOf(const char* text) {
-  Metrics m;
-  HDC dc = GetDC(nullptr);
-  HGDIOBJ old = SelectObject(dc, GetStockObject(DEFAULT_GUI_FONT));
-  GetTextMetricsA(dc, &m.tm);
-  RECT box{0, 0, 0, 0};
-  DrawTextA(dc, text, -1, &box, DT_CALCRECT | DT_NOPREFIX);
-  m.measured = SIZE{box.right, box.bottom};
-  SelectObject(dc, old);
-  ReleaseDC(nullptr, dc);
-  return m;
-}
-
 int actionsFrom(const RecordingPanel& panel, const cXComponent* source) {
   int n = 0;
   for (const Seen& s : panel.seen) n += s.id == kEventAction && s.source == source;

@@ -40,16 +40,6 @@ LRESULT notifyFrom(HWND to, HWND from, UINT code) {
   return SendMessageA(to, WM_NOTIFY, header.idFrom, reinterpret_cast<LPARAM>(&header));
 }
 
-TEXTMETRICA guiMetrics() {
-  TEXTMETRICA tm{};
-  HDC dc = GetDC(nullptr);
-  HGDIOBJ old = SelectObject(dc, GetStockObject(DEFAULT_GUI_FONT));
-  GetTextMetricsA(dc, &tm);
-  SelectObject(dc, old);
-  ReleaseDC(nullptr, dc);
-  return tm;
-}
-
 }  // namespace
 
 TEST_CASE("tree view: native child, style, font of the parent, filling the component") {
@@ -201,7 +191,7 @@ TEST_CASE("choice events: selection changes bubble as commands, its own keys sta
 }
 
 TEST_CASE("choice sizes") {
-  const TEXTMETRICA tm = guiMetrics();
+  const TEXTMETRICA tm = metricsOf("A").tm;
   const int scroll = GetSystemMetrics(SM_CXVSCROLL);
   Choice narrow(0, 0, false), wide(0, 100, false);
   SIZE in = narrow.getPreferredSizeIn(RECT{0, 0, 500, 500});
@@ -215,13 +205,7 @@ TEST_CASE("choice sizes") {
 
   Choice field;
   const SIZE closed = field.getPreferredSize();
-  HDC dc = GetDC(nullptr);
-  HGDIOBJ old = SelectObject(dc, GetStockObject(DEFAULT_GUI_FONT));
-  RECT a{0, 0, 0, 0};
-  DrawTextA(dc, "A", 1, &a, DT_CALCRECT | DT_SINGLELINE);
-  SelectObject(dc, old);
-  ReleaseDC(nullptr, dc);
-  CHECK(closed.cy == 2 * tm.tmDescent + a.bottom + 2 * GetSystemMetrics(SM_CYEDGE));
+  CHECK(closed.cy == 2 * tm.tmDescent + metricsOf("A", DT_SINGLELINE).measured.cy + 2 * GetSystemMetrics(SM_CYEDGE));
   CHECK(closed.cx == field.getPreferredSizeIn(RECT{}).cx);
 
   MeasuringDC::simulateNoScreen(true);
@@ -318,14 +302,13 @@ TEST_CASE("tab container: selectPage rules and the tab strip's own selection cha
   CHECK(page.right == display.right);
   CHECK(page.bottom == display.bottom);
 
-  // The user picks tab B: the strip reports TCN_SELCHANGE.
+  // The strip's own TCN_SELCHANGE (one notification) selects and is passed on to the owners.
   panel.seen.clear();
   SendMessageA(tabs.tabStrip(), TCM_SETCURSEL, 1, 0);
   notifyFrom(tabs.peer()->hwnd(), tabs.tabStrip(), TCN_SELCHANGE);
   CHECK(tabs.getSelectedPage() == 1);
   CHECK(IsWindowVisible(pages[1].getHandle()));
-  CHECK_FALSE(IsWindowVisible(pages[2].getHandle()));
-  CHECK(panel.count(kEventNotify) == 1);  // owners learn of it
+  CHECK(panel.count(kEventNotify) == 1);
 
   CHECK(tabs.selectPage(-1, true));
   CHECK(tabs.getSelectedPage() == -1);

@@ -31,13 +31,6 @@ public:
   }
 };
 
-bool cursorMoves() {
-  SetCursorPos(7, 9);
-  POINT at{};
-  GetCursorPos(&at);
-  return at.x == 7 && at.y == 9;
-}
-
 std::string clipboardText() {
   std::string text;
   if (!OpenClipboard(nullptr)) return text;
