@@ -12,8 +12,7 @@ TEST_CASE("setEditType refuses the types the edit does not have") {
   for (int t : {0, 4, 5, 9, -1}) {
     CAPTURE(t);
     CHECK_FALSE(edit.setEditType(t, "99"));
-    CHECK(edit.type() == kEditText);
-    CHECK(edit.text() == "keep");
+    CHECK((edit.type() == kEditText && edit.text() == "keep"));
   }
 }
 
@@ -22,31 +21,24 @@ TEST_CASE("setText switches to text, keeps a mask of the same length, cuts to th
   REQUIRE(edit.setEditType(kEditMonth, ""));
   CHECK(edit.noPaste());
   edit.setText("abcdef");
-  CHECK(edit.type() == kEditText);
-  CHECK_FALSE(edit.noPaste());
-  CHECK(edit.text() == "abcd");
+  CHECK((edit.type() == kEditText && !edit.noPaste() && edit.text() == "abcd"));
 
   REQUIRE(edit.setEditType(kEditText, "99-99"));
   CHECK(edit.text() == "00-00");  // a text of another length gives way to the mask's
   edit.setText("12-34");
-  CHECK(edit.mask() == "99-99");
-  CHECK(edit.isMasked());
+  CHECK((edit.mask() == "99-99" && edit.isMasked()));
   edit.setText("123456");
-  CHECK(edit.mask().empty());
-  CHECK(edit.text() == "1234");
+  CHECK((edit.mask().empty() && edit.text() == "1234"));
 }
 
 TEST_CASE("setMaxLength and setSelectionLength") {
   EditModel edit;
   edit.setText("abcdef");
   CHECK_FALSE(edit.setMaxLength(-1));
-  CHECK(edit.setMaxLength(3));
-  CHECK(edit.text() == "abc");
+  CHECK((edit.setMaxLength(3) && edit.text() == "abc"));
   edit.setCaret(1, 0);
-  CHECK(edit.setSelectionLength(10));
-  CHECK(edit.selectionLength() == 2);
-  CHECK(edit.setSelectionLength(-10));
-  CHECK(edit.selectionLength() == -1);
+  CHECK((edit.setSelectionLength(10) && edit.selectionLength() == 2));
+  CHECK((edit.setSelectionLength(-10) && edit.selectionLength() == -1));
 }
 
 TEST_CASE("caret keys with and without Shift") {
@@ -54,23 +46,18 @@ TEST_CASE("caret keys with and without Shift") {
   EditModel edit;
   edit.setText("hello");
   edit.setCaret(2, 0);
-  CHECK(edit.pressKey(EditKey::Right, true, false, clip));
-  CHECK(edit.pressKey(EditKey::Right, true, false, clip));
-  CHECK(edit.caret() == 4);
-  CHECK(edit.selectionLength() == -2);  // extends to the left of the caret
-  CHECK(edit.selectionStart() == 2);
-  CHECK(edit.pressKey(EditKey::Home, true, false, clip));
-  CHECK(edit.caret() == 0);
-  CHECK(edit.selectionLength() == 2);
-  CHECK(edit.pressKey(EditKey::End, true, false, clip));
-  CHECK(edit.caret() == 5);
-  CHECK(edit.selectionLength() == -3);
-  CHECK(edit.pressKey(EditKey::Left, false, false, clip));
-  CHECK(edit.caret() == 4);
-  CHECK(edit.selectionLength() == 0);
-  CHECK(edit.pressKey(EditKey::Right, false, false, clip));
-  CHECK(edit.pressKey(EditKey::Right, false, false, clip));
-  CHECK(edit.caret() == 5);
+  const struct {
+    EditKey key;
+    bool shift;
+    int caret, selection, start;  // start -1: not checked
+  } steps[] = {{EditKey::Right, true, 3, -1, 2}, {EditKey::Right, true, 4, -2, 2},  // extends left of the caret
+               {EditKey::Home, true, 0, 2, 0},   {EditKey::End, true, 5, -3, 2},    {EditKey::Left, false, 4, 0, -1},
+               {EditKey::Right, false, 5, 0, -1}, {EditKey::Right, false, 5, 0, -1}};
+  for (const auto& s : steps) {
+    CHECK(edit.pressKey(s.key, s.shift, false, clip));
+    CHECK((edit.caret() == s.caret && edit.selectionLength() == s.selection));
+    if (s.start >= 0) CHECK(edit.selectionStart() == s.start);
+  }
   CHECK_FALSE(edit.pressKey(EditKey::Other, false, false, clip));
   CHECK_FALSE(edit.pressKey(EditKey::LetterA, false, false, clip));  // without Ctrl: typing
 }
@@ -80,27 +67,20 @@ TEST_CASE("clipboard: copy, cut and paste as plain text") {
   EditModel edit;
   edit.setText("one two");
   CHECK(edit.pressKey(EditKey::LetterA, false, true, clip));
-  CHECK(edit.selectionStart() == 0);
-  CHECK(edit.selectionEnd() == 7);
-  CHECK(edit.pressKey(EditKey::LetterC, false, true, clip));
-  CHECK(clip.held == "one two");
+  CHECK((edit.selectionStart() == 0 && edit.selectionEnd() == 7));
+  CHECK((edit.pressKey(EditKey::LetterC, false, true, clip) && clip.held == "one two"));
   edit.setCaret(4, 3);
   CHECK(edit.pressKey(EditKey::Delete, true, false, clip));  // Shift+Delete cuts
-  CHECK(clip.held == "two");
-  CHECK(edit.text() == "one ");
-  CHECK(edit.pressKey(EditKey::Insert, true, false, clip));  // Shift+Insert pastes
-  CHECK(edit.text() == "one two");
+  CHECK((clip.held == "two" && edit.text() == "one "));
+  CHECK((edit.pressKey(EditKey::Insert, true, false, clip) && edit.text() == "one two"));  // Shift+Insert pastes
   edit.setCaret(0, 3);
-  CHECK(edit.pressKey(EditKey::Insert, false, true, clip));  // Ctrl+Insert copies
-  CHECK(clip.held == "one");
+  CHECK((edit.pressKey(EditKey::Insert, false, true, clip) && clip.held == "one"));  // Ctrl+Insert copies
   SUBCASE("without a selection copy takes the whole text, cut nothing") {
     edit.setCaret(2, 0);
-    CHECK(edit.pressKey(EditKey::LetterC, false, true, clip));
-    CHECK(clip.held == "one two");
+    CHECK((edit.pressKey(EditKey::LetterC, false, true, clip) && clip.held == "one two"));
     clip.held = "x";
     CHECK(edit.pressKey(EditKey::LetterX, false, true, clip));
-    CHECK(clip.held == "x");
-    CHECK(edit.text() == "one two");
+    CHECK((clip.held == "x" && edit.text() == "one two"));
   }
   SUBCASE("paste keeps only what the type accepts and stops at the limit") {
     REQUIRE(edit.setEditType(kEditDecimal, ""));
@@ -110,8 +90,7 @@ TEST_CASE("clipboard: copy, cut and paste as plain text") {
     CHECK(edit.pressKey(EditKey::LetterV, false, true, clip));
     CHECK(edit.text() == "7.591");  // letters, a second '.' and the tab refused
     clip.held = "12345";
-    CHECK(edit.pressKey(EditKey::LetterV, false, true, clip));
-    CHECK(edit.text().size() == 6);
+    CHECK((edit.pressKey(EditKey::LetterV, false, true, clip) && edit.text().size() == 6));
   }
 }
 
@@ -120,12 +99,9 @@ TEST_CASE("clicks and drags place the caret and select") {
   edit.setText("abcdef");
   edit.placeCaret(2, false);
   edit.placeCaret(5, true);
-  CHECK(edit.caret() == 5);
-  CHECK(edit.selectionStart() == 2);
-  CHECK(edit.selectionEnd() == 5);
+  CHECK((edit.caret() == 5 && edit.selectionStart() == 2 && edit.selectionEnd() == 5));
   edit.placeCaret(99, false);
-  CHECK(edit.caret() == 6);
-  CHECK(edit.selectionLength() == 0);
+  CHECK((edit.caret() == 6 && edit.selectionLength() == 0));
 
   SUBCASE("restricted fields snap to the nearest place and never drag-select") {
     REQUIRE(edit.setEditType(kEditLatitude, ""));
