@@ -7,6 +7,7 @@
 #include "frame/com/module.h"
 #include "tests/wine/common/dll_under_test.h"
 #include "tests/wine/common/event_sink.h"
+#include "tests/wine/common/not_a_port.h"
 
 #include <doctest/doctest.h>
 
@@ -47,20 +48,6 @@ void FireWith(FrameTestObject* object, long id) {
   v.lVal = id;
   object->SetPortList(v);
 }
-
-// A sink that is not a dispatch interface at all.
-struct PlainUnknown final : IUnknown {
-  STDMETHODIMP QueryInterface(REFIID riid, void** out) override {
-    if (IsEqualIID(riid, IID_IUnknown)) {
-      *out = this;
-      return S_OK;
-    }
-    *out = nullptr;
-    return E_NOINTERFACE;
-  }
-  STDMETHODIMP_(ULONG) AddRef() override { return 2; }
-  STDMETHODIMP_(ULONG) Release() override { return 1; }
-};
 
 }  // namespace
 
@@ -160,7 +147,7 @@ TEST_CASE("connection point container, point and enumerators") {
   DWORD cookie = 99;
   CHECK(point->Advise(nullptr, &cookie) == E_POINTER);
   CHECK(cookie == 0);
-  PlainUnknown plain;
+  br::test::NotAPort plain;  // a sink that is no dispatch interface
   CHECK(point->Advise(&plain, &cookie) == CONNECT_E_CANNOTCONNECT);
   REQUIRE(first.Connect(object));
   REQUIRE(second.Connect(object));

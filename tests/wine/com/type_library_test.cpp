@@ -123,7 +123,6 @@ TEST_CASE("the type library's identity") {
   wchar_t text[40] = {};
   StringFromGUID2(attributes->guid, text, 40);
   CHECK(std::string(text, text + wcslen(text)) == "{C897A920-C7AA-4BD6-9C77-19756FD456F4}");
-  CHECK(IsEqualGUID(attributes->guid, LIBID_BR_INFOLib));
   CHECK(attributes->wMajorVerNum == 1);
   CHECK(attributes->wMinorVerNum == 0);
   CHECK(attributes->lcid == 0x0409);
@@ -137,7 +136,8 @@ TEST_CASE("the type library's identity") {
   SysFreeString(doc);
 }
 
-TEST_CASE("eight creatable classes with their dual and default source interfaces") {
+TEST_CASE("eight creatable classes; dual interfaces with every member in order after the seven IDispatch slots; "
+          "event dispinterfaces") {
   TypeLibrary tl;
   for (const ClassInfo& c : Classes()) {
     INFO("class ", std::string(c.name, c.name + wcslen(c.name)));
@@ -149,92 +149,56 @@ TEST_CASE("eight creatable classes with their dual and default source interfaces
     CHECK((attributes->wTypeFlags & TYPEFLAG_FCANCREATE) != 0);
     const UINT implemented = attributes->cImplTypes;
     coclass->ReleaseTypeAttr(attributes);
-    CHECK(implemented == (c.events ? 2u : 1u));
-
-    bool sawDual = false, sawEvents = false;
+    REQUIRE(implemented == (c.events ? 2u : 1u));
+    // Every implemented interface is a default: the dual one, and the events as the source.
+    int sources = 0;
     for (UINT i = 0; i < implemented; ++i) {
       INT flags = 0;
       coclass->GetImplTypeFlags(i, &flags);
       HREFTYPE ref = 0;
       coclass->GetRefTypeOfImplType(i, &ref);
-      ITypeInfo* implementedInfo = nullptr;
-      REQUIRE(coclass->GetRefTypeInfo(ref, &implementedInfo) == S_OK);
-      TYPEATTR* a = nullptr;
-      implementedInfo->GetTypeAttr(&a);
+      ITypeInfo* face = nullptr;
+      REQUIRE(coclass->GetRefTypeInfo(ref, &face) == S_OK);
+      REQUIRE(face->GetTypeAttr(&attributes) == S_OK);
       CHECK((flags & IMPLTYPEFLAG_FDEFAULT) != 0);
-      if (flags & IMPLTYPEFLAG_FSOURCE) {
-        CHECK(IsEqualIID(a->guid, *c.events));
-        sawEvents = true;
+      const bool source = (flags & IMPLTYPEFLAG_FSOURCE) != 0;
+      sources += source ? 1 : 0;
+      CHECK(IsEqualIID(attributes->guid, source ? *c.events : *c.dual));
+      CHECK(attributes->typekind == TKIND_DISPATCH);
+      CHECK(((attributes->wTypeFlags & TYPEFLAG_FDUAL) != 0) == !source);
+      face->ReleaseTypeAttr(attributes);
+      CHECK(NameOf(face) == (source ? c.eventsName : c.dualName));
+      if (source) {
+        CheckMembers(face, c.eventMembers, 0);
       } else {
-        CHECK(IsEqualIID(a->guid, *c.dual));
-        sawDual = true;
+        // The vtable view of the dual interface.
+        REQUIRE(face->GetRefTypeOfImplType(-1, &ref) == S_OK);
+        ITypeInfo* vtableView = nullptr;
+        REQUIRE(face->GetRefTypeInfo(ref, &vtableView) == S_OK);
+        REQUIRE(vtableView->GetTypeAttr(&attributes) == S_OK);
+        CHECK(attributes->typekind == TKIND_INTERFACE);
+        CHECK((attributes->wTypeFlags & TYPEFLAG_FOLEAUTOMATION) != 0);
+        vtableView->ReleaseTypeAttr(attributes);
+        CheckMembers(vtableView, c.members, 7);
+        vtableView->Release();
       }
-      implementedInfo->ReleaseTypeAttr(a);
-      implementedInfo->Release();
+      face->Release();
     }
-    CHECK(sawDual);
-    CHECK(sawEvents == (c.events != nullptr));
+    CHECK(sources == (c.events ? 1 : 0));
     coclass->Release();
   }
-}
-
-TEST_CASE("dual interfaces: every member in dispatch-id order after the seven IDispatch slots") {
-  TypeLibrary tl;
-  for (const ClassInfo& c : Classes()) {
-    INFO("interface ", std::string(c.dualName, c.dualName + wcslen(c.dualName)));
-    ITypeInfo* dispatchView = tl.Info(*c.dual);
-    TYPEATTR* attributes = nullptr;
-    REQUIRE(dispatchView->GetTypeAttr(&attributes) == S_OK);
-    CHECK(attributes->typekind == TKIND_DISPATCH);
-    CHECK((attributes->wTypeFlags & TYPEFLAG_FDUAL) != 0);
-    dispatchView->ReleaseTypeAttr(attributes);
-    CHECK(NameOf(dispatchView) == c.dualName);
-
-    // The vtable view of the dual interface.
-    HREFTYPE ref = 0;
-    REQUIRE(dispatchView->GetRefTypeOfImplType(-1, &ref) == S_OK);
-    ITypeInfo* vtableView = nullptr;
-    REQUIRE(dispatchView->GetRefTypeInfo(ref, &vtableView) == S_OK);
-    REQUIRE(vtableView->GetTypeAttr(&attributes) == S_OK);
-    CHECK(attributes->typekind == TKIND_INTERFACE);
-    CHECK((attributes->wTypeFlags & TYPEFLAG_FOLEAUTOMATION) != 0);
-    vtableView->ReleaseTypeAttr(attributes);
-    CheckMembers(vtableView, c.members, 7);
-    vtableView->Release();
-    dispatchView->Release();
-  }
-}
-
-TEST_CASE("event interfaces are dispinterfaces with their members") {
-  TypeLibrary tl;
-  for (const ClassInfo& c : Classes()) {
-    if (!c.events) continue;
-    INFO("events ", std::string(c.eventsName, c.eventsName + wcslen(c.eventsName)));
-    ITypeInfo* info = tl.Info(*c.events);
-    TYPEATTR* attributes = nullptr;
-    REQUIRE(info->GetTypeAttr(&attributes) == S_OK);
-    CHECK(attributes->typekind == TKIND_DISPATCH);
-    CHECK((attributes->wTypeFlags & TYPEFLAG_FDUAL) == 0);
-    info->ReleaseTypeAttr(attributes);
-    CHECK(NameOf(info) == c.eventsName);
-    CheckMembers(info, c.eventMembers, 0);
+  // MouseAction carries two doubles; SelectChanged one IDispatch.
+  const std::pair<const IID*, std::vector<VARTYPE>> parameters[] = {{&DIID__ITidesWindowEvents, {VT_R8, VT_R8}},
+                                                                    {&DIID__ITidesPortListEvents, {VT_DISPATCH}}};
+  for (const auto& [events, types] : parameters) {
+    ITypeInfo* info = tl.Info(*events);
+    FUNCDESC* f = nullptr;
+    REQUIRE(info->GetFuncDesc(0, &f) == S_OK);
+    REQUIRE(f->cParams == static_cast<SHORT>(types.size()));
+    for (std::size_t i = 0; i < types.size(); ++i) CHECK(f->lprgelemdescParam[i].tdesc.vt == types[i]);
+    info->ReleaseFuncDesc(f);
     info->Release();
   }
-  // MouseAction carries two doubles; SelectChanged one IDispatch.
-  ITypeInfo* window = tl.Info(DIID__ITidesWindowEvents);
-  FUNCDESC* f = nullptr;
-  REQUIRE(window->GetFuncDesc(0, &f) == S_OK);
-  REQUIRE(f->cParams == 2);
-  CHECK(f->lprgelemdescParam[0].tdesc.vt == VT_R8);
-  CHECK(f->lprgelemdescParam[1].tdesc.vt == VT_R8);
-  window->ReleaseFuncDesc(f);
-  window->Release();
-  ITypeInfo* list = tl.Info(DIID__ITidesPortListEvents);
-  REQUIRE(list->GetFuncDesc(0, &f) == S_OK);
-  REQUIRE(f->cParams == 1);
-  CHECK(f->lprgelemdescParam[0].tdesc.vt == VT_DISPATCH);
-  list->ReleaseFuncDesc(f);
-  list->Release();
 }
 
 TEST_CASE("the enumerations tagTW_PROPERTY and tagPRV_PROPERTY") {

@@ -74,13 +74,7 @@ TEST_CASE("brtide day --png writes the TidesWindow picture of the day") {
 
   // The same day drawn by the control directly.
   DllUnderTest dll;
-  ITidesDatabase* database = nullptr;
-  REQUIRE(dll.Create(CLSID_TidesDatabase, &database) == S_OK);
-  BSTR path = SysAllocString(folder.Path().c_str());
-  REQUIRE(database->Initialize(path) == S_OK);
-  SysFreeString(path);
-  IUnknown* port = nullptr;
-  REQUIRE(database->GetPort(0, &port) == S_OK);
+  IUnknown* port = FirstPort(dll, folder.Path());
   GraphControl graph(dll);
   REQUIRE(graph->SetPort(port) == S_OK);
   REQUIRE(graph->Calculate(1.0, 45098.0) == S_OK);  // 2023-06-21
@@ -96,7 +90,6 @@ TEST_CASE("brtide day --png writes the TidesWindow picture of the day") {
 
   graph.Release();
   port->Release();
-  database->Release();
   CHECK(dll.CanUnloadNow() == S_OK);
   DeleteFileW(png.c_str());
 }

@@ -26,13 +26,7 @@ TEST_CASE("a calculated day of a real port: sun bands where the port's times say
   // A station at 48.4 N 4.5 W with a mean level of 4 and a 2-unit M2 tide.
   StationFolder folder({{"Harbour", 2903, -270, 0, {{0, 4000, 0}, {29, 2000, 1100}}}});
   DllUnderTest dll;
-  ITidesDatabase* database = nullptr;
-  REQUIRE(dll.Create(CLSID_TidesDatabase, &database) == S_OK);
-  BSTR path = SysAllocString(folder.Path().c_str());
-  REQUIRE(database->Initialize(path) == S_OK);
-  SysFreeString(path);
-  IUnknown* unknown = nullptr;
-  REQUIRE(database->GetPort(0, &unknown) == S_OK);
+  IUnknown* unknown = FirstPort(dll, folder.Path());
   ITidesPort* port = nullptr;
   REQUIRE(unknown->QueryInterface(IID_ITidesPort, reinterpret_cast<void**>(&port)) == S_OK);
 
@@ -83,6 +77,5 @@ TEST_CASE("a calculated day of a real port: sun bands where the port's times say
   graph.Release();
   port->Release();
   unknown->Release();
-  database->Release();
   CHECK(dll.CanUnloadNow() == S_OK);
 }

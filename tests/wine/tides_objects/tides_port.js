@@ -1,5 +1,5 @@
-// A day of tides as a JScript client computes it: ports from GetPort, Calculate with a
-// step and a day-count date, then the points, extremes and sun times.
+// TidesPort as a JScript client sees it: null for no port, a day-count date, the extremes
+// by index, and refusals as exceptions. (Sun times and whole days: tides_example_check.js.)
 var failures = 0;
 function check(condition, what) {
   if (!condition) {
@@ -25,13 +25,9 @@ check(port.NumPoints == 0, "a new port has no points");
 port.Calculate(1, 36526.75);  // 2000-01-01, the fraction is dropped
 check(port.NumPoints == 25, "25 points for a step of one hour, got " + port.NumPoints);
 check(port.PredictionDate == 36526, "the whole day, got " + port.PredictionDate);
-check(port.Step == 1, "step read back");
 var max = port.MaxValue, min = port.MinValue;
-check(max > min, "a tide rises and falls: " + min + " .. " + max);
 check(port.WavePoint(port.MaxValueIndex) == max, "the highest point is at MaxValueIndex");
 check(port.WavePoint(port.MinValueIndex) == min, "the lowest point is at MinValueIndex");
-check(Math.floor(port.SunRise) == 36526, "sunrise on the day");
-check(port.SunRise <= port.SunSet, "sunrise before sunset");
 
 try {
   port.WavePoint(25);
