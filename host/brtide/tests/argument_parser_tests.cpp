@@ -16,14 +16,10 @@ TEST_CASE("a full day command line is split into its options") {
   const ParseOutcome r = ParseLine({"day", "--folder", "data/world", "--near", "-33.86", "151.2", "--date",
                                     "2024-05-01", "--step=0.5", "--csv"});
   REQUIRE(r.ok);
-  CHECK(r.parsed.command == "day");
-  CHECK_FALSE(r.parsed.help);
-  CHECK(r.parsed.Value("--folder") == "data/world");
+  CHECK((r.parsed.command == "day" && !r.parsed.help));
+  CHECK((r.parsed.Value("--folder") == "data/world" && r.parsed.Value("--step") == "0.5"));
   CHECK(r.parsed.Values("--near") == std::vector<std::string>{"-33.86", "151.2"});
-  CHECK(r.parsed.Value("--step") == "0.5");
-  CHECK(r.parsed.Has("--csv"));
-  CHECK(r.parsed.Values("--csv").empty());
-  CHECK_FALSE(r.parsed.Has("--port"));
+  CHECK((r.parsed.Has("--csv") && r.parsed.Values("--csv").empty() && !r.parsed.Has("--port")));
 }
 
 TEST_CASE("help is found anywhere and names the command it is about") {
@@ -75,8 +71,7 @@ TEST_CASE("an extra output's option joins the day command only") {
 
   std::ostringstream help;
   WriteUsage(parser.Commands(), parser.Find("day"), help);
-  CHECK(help.str().find("[--png FILE]") != std::string::npos);
-  CHECK(help.str().find("picture of the curve") != std::string::npos);
+  CHECK((help.str().find("[--png FILE]") != std::string::npos && help.str().find("picture of the curve") != std::string::npos));
 }
 
 TEST_CASE("the general help lists both commands with their synopsis") {

@@ -3,6 +3,7 @@
 #include "host/brtide/clock_text.h"
 #include "host/brtide/day_report.h"
 
+#include <algorithm>
 #include <sstream>
 
 using namespace br::brtide;
@@ -21,10 +22,11 @@ std::vector<std::string> Lines(const std::string& text) {
 }
 
 bool HasLine(const std::vector<std::string>& lines, const std::string& wanted) {
-  for (const std::string& line : lines) {
-    if (line == wanted) return true;
-  }
-  return false;
+  return std::find(lines.begin(), lines.end(), wanted) != lines.end();
+}
+
+void CheckLines(const std::vector<std::string>& lines, std::initializer_list<std::string> wanted) {
+  for (const std::string& line : wanted) CHECK_MESSAGE(HasLine(lines, line), line);
 }
 
 // A six-hourly day: low 0.5 m at 06:00, high 4.25 m at 12:00 (first of two equal highs).
@@ -56,18 +58,12 @@ TEST_CASE("the day text shows station, zone, sun, extremes and every height") {
   CHECK(lines.at(1) == "Position  48\xC2\xB0 23'.000 N  004\xC2\xB0 30'.000 W");
   CHECK(lines.at(2) == "Zone      -1 (station time UTC+01:00)");
   CHECK(lines.at(3) == "Date      2024-05-01");
-  CHECK(HasLine(lines, "  twilight begins  06:02"));
-  CHECK(HasLine(lines, "  sunrise          06:41"));
-  CHECK(HasLine(lines, "  sunset           21:27"));
-  CHECK(HasLine(lines, "  twilight ends    22:06"));
-  CHECK(HasLine(lines, "Highest   4.250 m at 12:00"));
-  CHECK(HasLine(lines, "Lowest    0.500 m at 06:00"));
-  CHECK(HasLine(lines, "Heights   metres, every 6 hours, times in this computer's standard time UTC+00:00"));
   // Bars run from nothing at the lowest point to 40 marks at the highest.
-  CHECK(HasLine(lines, "  00:00     2.000  ################"));
-  CHECK(HasLine(lines, "  06:00     0.500    low"));
-  CHECK(HasLine(lines, "  12:00     4.250  " + std::string(40, '#') + "  high"));
-  CHECK(HasLine(lines, "  24:00     4.250  " + std::string(40, '#')));
+  CheckLines(lines, {"  twilight begins  06:02", "  sunrise          06:41", "  sunset           21:27",
+                     "  twilight ends    22:06", "Highest   4.250 m at 12:00", "Lowest    0.500 m at 06:00",
+                     "Heights   metres, every 6 hours, times in this computer's standard time UTC+00:00",
+                     "  00:00     2.000  ################", "  06:00     0.500    low",
+                     "  12:00     4.250  " + std::string(40, '#') + "  high", "  24:00     4.250  " + std::string(40, '#')});
   CHECK(lines.size() == 17);
 }
 
@@ -90,9 +86,8 @@ TEST_CASE("the day text tells polar days and missing twilight") {
   std::ostringstream light;
   WriteDayText(day, light);
   const std::vector<std::string> lines = Lines(light.str());
-  CHECK(HasLine(lines, "  twilight begins  --:--  (the sun stays above -12\xC2\xB0)"));
-  CHECK(HasLine(lines, "  sunrise          02:35"));
-  CHECK(HasLine(lines, "  twilight ends    --:--  (the sun stays above -12\xC2\xB0)"));
+  CheckLines(lines, {"  twilight begins  --:--  (the sun stays above -12\xC2\xB0)", "  sunrise          02:35",
+                     "  twilight ends    --:--  (the sun stays above -12\xC2\xB0)"});
 }
 
 TEST_CASE("sun day kinds and twilight follow the published patterns") {
@@ -100,11 +95,9 @@ TEST_CASE("sun day kinds and twilight follow the published patterns") {
   CHECK(ClassifySunDay({At(0, 0), At(0, 0), At(23, 59), At(23, 59)}) == SunDayKind::PolarDay);
   CHECK(ClassifySunDay({At(0, 0), At(0, 0), At(0, 0), At(0, 0)}) == SunDayKind::PolarNight);
   const SunTimes ordinary{At(5, 19), At(6, 3), At(18, 10), At(18, 55)};
-  CHECK(HasMorningTwilight(ordinary));
-  CHECK(HasEveningTwilight(ordinary));
+  CHECK((HasMorningTwilight(ordinary) && HasEveningTwilight(ordinary)));
   const SunTimes noEvening{At(4, 1), At(4, 40), At(21, 0), At(21, 0)};
-  CHECK(HasMorningTwilight(noEvening));
-  CHECK_FALSE(HasEveningTwilight(noEvening));
+  CHECK((HasMorningTwilight(noEvening) && !HasEveningTwilight(noEvening)));
 }
 
 TEST_CASE("the nearest-station line gives the distance from the asked position") {
@@ -127,9 +120,7 @@ TEST_CASE("steps that are not whole minutes print seconds") {
   std::ostringstream out;
   WriteDayText(day, out);
   const std::vector<std::string> lines = Lines(out.str());
-  CHECK(HasLine(lines, "Highest   2.000 m at 01:00:00"));
-  CHECK(HasLine(lines, "  00:00:36     1.000"));
-  CHECK(HasLine(lines, "  24:00:00     1.000"));
+  CheckLines(lines, {"Highest   2.000 m at 01:00:00", "  00:00:36     1.000", "  24:00:00     1.000"});
   CHECK(PointSeconds(day, 2400) == 86400);
 }
 

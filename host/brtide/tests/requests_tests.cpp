@@ -19,10 +19,7 @@ TEST_CASE("a ports request carries the box as given") {
   std::string error;
   REQUIRE(BuildPortsRequest(Parsed({"ports", "--folder", "w", "--box", "49N", "5W", "47.5", "-3"}), request, error));
   CHECK(request.folder == "w");
-  CHECK(request.box.latMin == 49.0);
-  CHECK(request.box.lonMin == -5.0);
-  CHECK(request.box.latMax == 47.5);
-  CHECK(request.box.lonMax == -3.0);
+  CHECK((request.box.latMin == 49.0 && request.box.lonMin == -5.0 && request.box.latMax == 47.5 && request.box.lonMax == -3.0));
 
   CHECK_FALSE(BuildPortsRequest(Parsed({"ports", "--folder", "w", "--box", "91", "0", "1", "1"}), request, error));
   CHECK(error == "bad LATMIN \"91\" (degrees -90..90, or 48.5N)");
@@ -36,23 +33,15 @@ TEST_CASE("a day request needs exactly one way to choose the station") {
   DayRequest request;
   std::string error;
   REQUIRE(BuildDayRequest(Parsed({"day", "--folder", "w", "--port", "12", "--date", "2024-05-01"}), request, error));
-  CHECK(*request.port == 12);
-  CHECK_FALSE(request.nearTo);
-  CHECK(request.step == 1.0);
-  CHECK_FALSE(request.csv);
-  CHECK(request.date.year == 2024);
-  CHECK(request.date.month == 5);
-  CHECK(request.date.day == 1);
+  CHECK((*request.port == 12 && !request.nearTo && request.step == 1.0 && !request.csv));
+  CHECK((request.date.year == 2024 && request.date.month == 5 && request.date.day == 1));
 
   request = DayRequest();
   REQUIRE(BuildDayRequest(Parsed({"day", "--folder", "w", "--near", "48.4", "4.5W", "--date", "2024-05-01", "--step",
                                   "0.25", "--csv"}),
                           request, error));
-  CHECK_FALSE(request.port);
-  CHECK(request.nearTo->latitude == 48.4);
-  CHECK(request.nearTo->longitude == -4.5);
-  CHECK(request.step == 0.25);
-  CHECK(request.csv);
+  CHECK((!request.port && request.nearTo->latitude == 48.4 && request.nearTo->longitude == -4.5));
+  CHECK((request.step == 0.25 && request.csv));
 
   CHECK_FALSE(BuildDayRequest(Parsed({"day", "--folder", "w", "--date", "2024-05-01"}), request, error));
   CHECK(error == "day needs either --port N or --near LAT LON");

@@ -19,8 +19,7 @@ TEST_CASE("distances on the sphere") {
 
 TEST_CASE("the nearest station is the first of the nearest") {
   const std::vector<Position> stations = {{10, 10}, {48.4, -4.5}, {48.4, -4.5}, {50.4, -4.2}};
-  CHECK(NearestStation(stations, {48.0, -4.0}) == 1);
-  CHECK(NearestStation(stations, {51, -4}) == 3);
+  CHECK((NearestStation(stations, {48.0, -4.0}) == 1 && NearestStation(stations, {51, -4}) == 3));
   CHECK(NearestStation({}, {0, 0}) == -1);
 }
 
@@ -47,8 +46,6 @@ TEST_CASE("positions print in the library's degree-minute format as UTF-8") {
 }
 
 TEST_CASE("columns count characters, not bytes") {
-  CHECK(Utf8Width("Br\xC3\xA9hat") == 6);
-  CHECK(PadRight("Br\xC3\xA9hat", 8) == "Br\xC3\xA9hat  ");
-  CHECK(PadLeft("12", 5) == "   12");
-  CHECK(PadRight("longer", 3) == "longer");
+  CHECK((Utf8Width("Br\xC3\xA9hat") == 6 && PadRight("Br\xC3\xA9hat", 8) == "Br\xC3\xA9hat  "));
+  CHECK((PadLeft("12", 5) == "   12" && PadRight("longer", 3) == "longer"));
 }
