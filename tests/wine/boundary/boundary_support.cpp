@@ -4,180 +4,35 @@
 
 namespace br::test::boundary {
 
-Variant& Variant::operator=(Variant&& other) noexcept {
-  if (this != &other) {
-    VariantClear(&v_);
-    v_ = other.v_;
-    VariantInit(&other.v_);
-  }
-  return *this;
+namespace {
+
+SAFEARRAY* Checked(SAFEARRAY* array) {
+  if (!array) throw std::runtime_error("SAFEARRAY not made");
+  return array;
 }
 
-Variant Variant::Empty() { return Variant(); }
+}  // namespace
 
-Variant Variant::Null() {
-  Variant v;
-  v.v_.vt = VT_NULL;
-  return v;
-}
-
-Variant Variant::I2(SHORT value) {
-  Variant v;
-  v.v_.vt = VT_I2;
-  v.v_.iVal = value;
-  return v;
-}
-
-Variant Variant::I4(LONG value) {
-  Variant v;
-  v.v_.vt = VT_I4;
-  v.v_.lVal = value;
-  return v;
-}
-
-Variant Variant::UI1(BYTE value) {
-  Variant v;
-  v.v_.vt = VT_UI1;
-  v.v_.bVal = value;
-  return v;
-}
-
-Variant Variant::R4(float value) {
-  Variant v;
-  v.v_.vt = VT_R4;
-  v.v_.fltVal = value;
-  return v;
-}
-
-Variant Variant::R8(double value) {
-  Variant v;
-  v.v_.vt = VT_R8;
-  v.v_.dblVal = value;
-  return v;
-}
-
-Variant Variant::Date(double value) {
-  Variant v;
-  v.v_.vt = VT_DATE;
-  v.v_.date = value;
-  return v;
-}
-
-Variant Variant::Bool(bool value) {
-  Variant v;
-  v.v_.vt = VT_BOOL;
-  v.v_.boolVal = value ? VARIANT_TRUE : VARIANT_FALSE;
-  return v;
-}
-
-Variant Variant::Error(SCODE value) {
-  Variant v;
-  v.v_.vt = VT_ERROR;
-  v.v_.scode = value;
-  return v;
-}
-
-Variant Variant::Bstr(const std::wstring& text) {
-  Variant v;
-  v.v_.vt = VT_BSTR;
-  v.v_.bstrVal = SysAllocStringLen(text.data(), static_cast<UINT>(text.size()));
-  if (!v.v_.bstrVal) throw std::bad_alloc();
-  return v;
-}
-
-Variant Variant::NullBstr() {
-  Variant v;
-  v.v_.vt = VT_BSTR;
-  v.v_.bstrVal = nullptr;
-  return v;
-}
-
-Variant Variant::Unknown(IUnknown* object) {
-  Variant v;
-  v.v_.vt = VT_UNKNOWN;
-  v.v_.punkVal = object;
-  if (object) object->AddRef();
-  return v;
-}
-
-Variant Variant::Dispatch(IDispatch* object) {
-  Variant v;
-  v.v_.vt = VT_DISPATCH;
-  v.v_.pdispVal = object;
-  if (object) object->AddRef();
-  return v;
-}
-
-Variant Variant::Array(VARTYPE arrayType, SAFEARRAY* array) {
-  Variant v;
-  v.v_.vt = static_cast<VARTYPE>(VT_ARRAY | arrayType);
-  v.v_.parray = array;
-  return v;
-}
-
-Variant Variant::RefVariant(VARIANT* target) {
-  Variant v;
-  v.v_.vt = VT_BYREF | VT_VARIANT;
-  v.v_.pvarVal = target;
-  return v;
-}
-
-Variant Variant::RefI4(LONG* target) {
-  Variant v;
-  v.v_.vt = VT_BYREF | VT_I4;
-  v.v_.plVal = target;
-  return v;
-}
-
-Variant Variant::RefR8(double* target) {
-  Variant v;
-  v.v_.vt = VT_BYREF | VT_R8;
-  v.v_.pdblVal = target;
-  return v;
-}
-
-Variant Variant::RefBstr(BSTR* target) {
-  Variant v;
-  v.v_.vt = VT_BYREF | VT_BSTR;
-  v.v_.pbstrVal = target;
-  return v;
-}
-
-Variant Variant::RefUnknown(IUnknown** target) {
-  Variant v;
-  v.v_.vt = VT_BYREF | VT_UNKNOWN;
-  v.v_.ppunkVal = target;
-  return v;
-}
-
-Variant Variant::RefArray(VARTYPE arrayType, SAFEARRAY** target) {
-  Variant v;
-  v.v_.vt = static_cast<VARTYPE>(VT_BYREF | VT_ARRAY | arrayType);
-  v.v_.pparray = target;
+Variant Variant::ZeroDimensions(VARTYPE type) {
+  static SAFEARRAY none = {0, FADF_STATIC | FADF_FIXEDSIZE, 4, 0, nullptr, {{0, 0}}};
+  Variant v = Array(type, &none);
+  v.borrowed_ = true;
   return v;
 }
 
 SAFEARRAY* MakeArray(VARTYPE type, std::initializer_list<SAFEARRAYBOUND> bounds) {
   std::vector<SAFEARRAYBOUND> b(bounds);
-  SAFEARRAY* array = SafeArrayCreate(type, static_cast<UINT>(b.size()), b.data());
-  if (!array) throw std::runtime_error("SafeArrayCreate failed");
-  return array;
+  return Checked(SafeArrayCreate(type, static_cast<UINT>(b.size()), b.data()));
 }
 
 SAFEARRAY* MakeLongArray(const std::vector<LONG>& values, LONG lower) {
-  SAFEARRAY* array = SafeArrayCreateVector(VT_I4, lower, static_cast<ULONG>(values.size()));
-  if (!array) throw std::runtime_error("SafeArrayCreateVector failed");
-  for (std::size_t i = 0; i < values.size(); ++i) {
-    LONG index = lower + static_cast<LONG>(i);
-    LONG value = values[i];
-    SafeArrayPutElement(array, &index, &value);
-  }
+  SAFEARRAY* array = Checked(SafeArrayCreateVector(VT_I4, lower, static_cast<ULONG>(values.size())));
+  for (std::size_t i = 0; i < values.size(); ++i) static_cast<LONG*>(array->pvData)[i] = values[i];
   return array;
 }
 
 SAFEARRAY* MakeUnknownArray(const std::vector<IUnknown*>& objects, LONG lower) {
-  SAFEARRAY* array = SafeArrayCreateVector(VT_UNKNOWN, lower, static_cast<ULONG>(objects.size()));
-  if (!array) throw std::runtime_error("SafeArrayCreateVector failed");
+  SAFEARRAY* array = Checked(SafeArrayCreateVector(VT_UNKNOWN, lower, static_cast<ULONG>(objects.size())));
   for (std::size_t i = 0; i < objects.size(); ++i) {
     LONG index = lower + static_cast<LONG>(i);
     SafeArrayPutElement(array, &index, objects[i]);  // takes its own reference
@@ -189,12 +44,8 @@ SAFEARRAY* MakeRawArray(ULONG elementSize, ULONG count) {
   SAFEARRAY* array = nullptr;
   if (FAILED(SafeArrayAllocDescriptor(1, &array))) throw std::runtime_error("SafeArrayAllocDescriptor failed");
   array->cbElements = elementSize;
-  array->rgsabound[0].cElements = count;
-  array->rgsabound[0].lLbound = 0;
-  if (FAILED(SafeArrayAllocData(array))) {
-    SafeArrayDestroyDescriptor(array);
-    throw std::runtime_error("SafeArrayAllocData failed");
-  }
+  array->rgsabound[0] = SAFEARRAYBOUND{count, 0};
+  if (FAILED(SafeArrayAllocData(array))) throw std::runtime_error("SafeArrayAllocData failed");
   return array;
 }
 
@@ -209,9 +60,19 @@ SAFEARRAY* MakeEmptyTwoDimensionArray(IUnknown** data, ULONG claimed, bool empty
   return array;
 }
 
-SAFEARRAY* ZeroDimensionArray() {
-  static SAFEARRAY none = {0, FADF_STATIC | FADF_FIXEDSIZE, 4, 0, nullptr, {{0, 0}}};
-  return &none;
+void Outs::Reset() {
+  value = second = kUntouchedDouble;
+  number = kUntouchedLong;
+  name = marker;
+  unknown = kUntouchedUnknown;
+  VariantInit(&variant);
+  variant.vt = VT_I2;
+  variant.iVal = -3;
+}
+
+bool Outs::Untouched() const {
+  return value == kUntouchedDouble && second == kUntouchedDouble && number == kUntouchedLong && name == marker &&
+         unknown == kUntouchedUnknown && variant.vt == VT_I2 && variant.iVal == -3;
 }
 
 LateCall::LateCall(IDispatch* target, DISPID id, WORD flags) : target_(target), id_(id), flags_(flags) {
@@ -225,24 +86,8 @@ LateCall::~LateCall() {
   SysFreeString(exception.bstrHelpFile);
 }
 
-LateCall& LateCall::Arg(Variant value) {
-  args_.push_back(std::move(value));
-  return *this;
-}
-
-LateCall& LateCall::Interface(const IID& riid) {
-  iid_ = riid;
-  return *this;
-}
-
-LateCall& LateCall::NoParams() {
-  noParams_ = true;
-  return *this;
-}
-
 HRESULT LateCall::Run() {
-  // DISPPARAMS holds the arguments last first; the copies are shallow, the Variants keep
-  // ownership (a callee may change a by-reference target, never the VARIANT itself).
+  // DISPPARAMS holds the arguments last first; shallow copies, the Variants keep ownership.
   std::vector<VARIANT> reversed;
   for (auto it = args_.rbegin(); it != args_.rend(); ++it) reversed.push_back(it->get());
   DISPID namedPut = DISPID_PROPERTYPUT;
@@ -252,12 +97,97 @@ HRESULT LateCall::Run() {
     params.cNamedArgs = 1;
   }
   VariantClear(&result);
-  return target_->Invoke(id_, iid_, LOCALE_USER_DEFAULT, flags_, noParams_ ? nullptr : &params, &result,
-                         &exception, &argumentError);
+  UINT argumentError = 0;
+  return target_->Invoke(id_, iid_, LOCALE_USER_DEFAULT, flags_, &params, &result, &exception, &argumentError);
 }
 
-HRESULT LateResult(HRESULT hr, const EXCEPINFO& exception) {
-  return hr == DISP_E_EXCEPTION ? exception.scode : hr;
+std::vector<TestStation> ThreeStations() {
+  return {{"Charlie", 600, 600, 0, {{0, 1000, 0}, {29, 500, 100}}},
+          {"Alpha", 610, 610, 0, {{0, 1000, 0}, {36, 300, 900}}},
+          {"Bravo", 620, 620, 0, {{0, 1000, 0}}}};
+}
+
+OpenTides::OpenTides(const std::vector<TestStation>& stations) : folder(stations) {
+  REQUIRE(dll.Create(CLSID_TidesDatabase, &db) == S_OK);
+  Variant path = Variant::Bstr(folder.Path());
+  REQUIRE(db->Initialize(path.get().bstrVal) == S_OK);
+}
+
+IUnknown* OpenTides::Unknown(long index) const {
+  IUnknown* port = nullptr;
+  REQUIRE(db->GetPort(index, &port) == S_OK);
+  REQUIRE(port != nullptr);
+  return port;
+}
+
+ITidesPort* OpenTides::Port(long index) const {
+  IUnknown* unknown = Unknown(index);
+  ITidesPort* port = nullptr;
+  REQUIRE(unknown->QueryInterface(IID_ITidesPort, reinterpret_cast<void**>(&port)) == S_OK);
+  unknown->Release();
+  return port;
+}
+
+std::vector<IUnknown*> OpenTides::Ports(long count) const {
+  std::vector<IUnknown*> ports;
+  for (long i = 0; i < count; ++i) ports.push_back(Unknown(i));
+  return ports;
+}
+
+std::wstring NameOf(IUnknown* port) {
+  if (!port) return L"<none>";
+  ITidesPort* typed = nullptr;
+  if (FAILED(port->QueryInterface(IID_ITidesPort, reinterpret_cast<void**>(&typed)))) return L"<not a port>";
+  BSTR name = nullptr;
+  typed->get_PortName(&name);
+  std::wstring text = name ? name : L"";
+  SysFreeString(name);
+  typed->Release();
+  return text;
+}
+
+std::wstring SelectedName(ITidesPortList* list) {
+  IUnknown* port = kUntouchedUnknown;
+  REQUIRE(list->get_Selected(&port) == S_OK);
+  REQUIRE(port != kUntouchedUnknown);
+  const std::wstring name = NameOf(port);
+  if (port) port->Release();
+  return name;
+}
+
+std::vector<ULONG> RefCounts(const std::vector<IUnknown*>& objects) {
+  std::vector<ULONG> counts;
+  for (IUnknown* p : objects) counts.push_back(RefCount(p));
+  return counts;
+}
+
+void AdviseOnly(IUnknown* source, const IID& events, EventSink& sink) {
+  IConnectionPointContainer* container = nullptr;
+  REQUIRE(source->QueryInterface(IID_IConnectionPointContainer, reinterpret_cast<void**>(&container)) == S_OK);
+  IConnectionPoint* point = nullptr;
+  REQUIRE(container->FindConnectionPoint(events, &point) == S_OK);
+  container->Release();
+  DWORD cookie = 0;
+  REQUIRE(point->Advise(static_cast<IDispatch*>(&sink), &cookie) == S_OK);
+  point->Release();
+}
+
+HostedControl::HostedControl(const DllUnderTest& dll, const CLSID& clsid, int width, int height) {
+  atl_.WinInit();
+  REQUIRE(dll.Create(clsid, IID_IUnknown, reinterpret_cast<void**>(&control_)) == S_OK);
+  REQUIRE((host_ = AtlHost::MakeWindow(width, height)) != nullptr);
+  REQUIRE(atl_.Attach(control_, host_, &site_) == S_OK);
+  IOleWindow* window = Query<IOleWindow>();
+  window->GetWindow(&window_);
+  window->Release();
+  REQUIRE(window_ != nullptr);
+}
+
+void HostedControl::Close() {
+  if (host_) DestroyWindow(host_);
+  host_ = window_ = nullptr;
+  ReleaseAndNull(site_);
+  ReleaseAndNull(control_);
 }
 
 }  // namespace br::test::boundary

@@ -1,14 +1,26 @@
-// Building blocks of the boundary matrices: VARIANTs and SAFEARRAYs of every awkward form,
-// late-bound calls made the way script hosts make them, and marker values that a call
-// which fails must leave where they were.
+// What the boundary, leak and re-entrancy suites share: VARIANTs and SAFEARRAYs of every
+// awkward form, late-bound calls made as script hosts make them, table runners that check a
+// result and an unchanged state per row, an open station database, and a hosted control.
 #pragma once
+
+#include "tests/wine/common/dll_under_test.h"
+#include "tests/wine/common/event_sink.h"
+#include "tests/wine/common/station_folder.h"
+#include "tests/wine/controls/atl_host.h"
+#include "tests/wine/controls/canvas.h"
+
+#include "BR_Info.h"
 
 #include <windows.h>
 #include <oaidl.h>
 #include <oleauto.h>
 
+#include <doctest/doctest.h>
+
+#include <functional>
 #include <initializer_list>
 #include <limits>
+#include <new>
 #include <string>
 #include <vector>
 
@@ -22,98 +34,228 @@ inline const double kSmallestDenormal = std::numeric_limits<double>::denorm_min(
 // Written into out-parameters before a call that must not write them.
 inline constexpr double kUntouchedDouble = -12345.678;
 inline constexpr long kUntouchedLong = -777;
-// An interface pointer value that no call may use, release or overwrite with a valid one.
 inline IUnknown* const kUntouchedUnknown = reinterpret_cast<IUnknown*>(static_cast<UINT_PTR>(0x0BADF00D));
 
-// One owned VARIANT. The factories below build the forms the matrices need.
+// One owned VARIANT; by-reference forms borrow their target.
 class Variant {
 public:
   Variant() { VariantInit(&v_); }
-  ~Variant() { VariantClear(&v_); }
-  Variant(Variant&& other) noexcept : v_(other.v_) { VariantInit(&other.v_); }
-  Variant& operator=(Variant&& other) noexcept;
+  ~Variant() {
+    if (!borrowed_) VariantClear(&v_);
+  }
+  Variant(Variant&& other) noexcept : v_(other.v_), borrowed_(other.borrowed_) { VariantInit(&other.v_); }
+  Variant& operator=(Variant&& other) noexcept {
+    if (!borrowed_) VariantClear(&v_);
+    v_ = other.v_;
+    borrowed_ = other.borrowed_;
+    VariantInit(&other.v_);
+    return *this;
+  }
   Variant(const Variant&) = delete;
-  Variant& operator=(const Variant&) = delete;
 
-  static Variant Empty();
-  static Variant Null();
-  static Variant I2(SHORT value);
-  static Variant I4(LONG value);
-  static Variant UI1(BYTE value);
-  static Variant R4(float value);
-  static Variant R8(double value);
-  static Variant Date(double value);
-  static Variant Bool(bool value);
-  static Variant Error(SCODE value);
-  static Variant Bstr(const std::wstring& text);  // embedded zeros kept
-  static Variant NullBstr();                       // VT_BSTR holding a null BSTR
-  static Variant Unknown(IUnknown* object);        // takes its own reference; null allowed
-  static Variant Dispatch(IDispatch* object);      // takes its own reference; null allowed
-  static Variant Array(VARTYPE arrayType, SAFEARRAY* array);  // VT_ARRAY | arrayType, owns array
-  // By-reference forms: the target is borrowed and must outlive the Variant.
-  static Variant RefVariant(VARIANT* target);      // VT_BYREF | VT_VARIANT
-  static Variant RefI4(LONG* target);
-  static Variant RefR8(double* target);
-  static Variant RefBstr(BSTR* target);
-  static Variant RefUnknown(IUnknown** target);
-  static Variant RefArray(VARTYPE arrayType, SAFEARRAY** target);  // VT_BYREF | VT_ARRAY | type
+  template <class F>
+  static Variant Make(VARTYPE vt, F set) {
+    Variant v;
+    v.v_.vt = vt;
+    set(v.v_);
+    return v;
+  }
+  static Variant Empty() { return Variant(); }
+  static Variant Null() { return Make(VT_NULL, [](VARIANT&) {}); }
+  static Variant I2(SHORT x) { return Make(VT_I2, [=](VARIANT& v) { v.iVal = x; }); }
+  static Variant I4(LONG x) { return Make(VT_I4, [=](VARIANT& v) { v.lVal = x; }); }
+  static Variant R4(float x) { return Make(VT_R4, [=](VARIANT& v) { v.fltVal = x; }); }
+  static Variant R8(double x) { return Make(VT_R8, [=](VARIANT& v) { v.dblVal = x; }); }
+  static Variant Date(double x) { return Make(VT_DATE, [=](VARIANT& v) { v.date = x; }); }
+  static Variant Bool(bool x) { return Make(VT_BOOL, [=](VARIANT& v) { v.boolVal = x ? VARIANT_TRUE : VARIANT_FALSE; }); }
+  static Variant Error(SCODE x) { return Make(VT_ERROR, [=](VARIANT& v) { v.scode = x; }); }
+  static Variant NullBstr() { return Make(VT_BSTR, [](VARIANT& v) { v.bstrVal = nullptr; }); }
+  static Variant Bstr(const std::wstring& text) {  // embedded zeros kept
+    return Make(VT_BSTR, [&](VARIANT& v) {
+      if (!(v.bstrVal = SysAllocStringLen(text.data(), static_cast<UINT>(text.size())))) throw std::bad_alloc();
+    });
+  }
+  static Variant Unknown(IUnknown* x) {
+    return Make(VT_UNKNOWN, [=](VARIANT& v) { if ((v.punkVal = x)) x->AddRef(); });
+  }
+  static Variant Dispatch(IDispatch* x) {
+    return Make(VT_DISPATCH, [=](VARIANT& v) { if ((v.pdispVal = x)) x->AddRef(); });
+  }
+  static Variant Array(VARTYPE type, SAFEARRAY* a) {  // owns the array
+    return Make(VT_ARRAY | type, [=](VARIANT& v) { v.parray = a; });
+  }
+  static Variant RefVariant(VARIANT* x) { return Make(VT_BYREF | VT_VARIANT, [=](VARIANT& v) { v.pvarVal = x; }); }
+  static Variant RefI4(LONG* x) { return Make(VT_BYREF | VT_I4, [=](VARIANT& v) { v.plVal = x; }); }
+  static Variant RefR8(double* x) { return Make(VT_BYREF | VT_R8, [=](VARIANT& v) { v.pdblVal = x; }); }
+  static Variant RefBstr(BSTR* x) { return Make(VT_BYREF | VT_BSTR, [=](VARIANT& v) { v.pbstrVal = x; }); }
+  static Variant RefArray(VARTYPE type, SAFEARRAY** x) {
+    return Make(VT_BYREF | VT_ARRAY | type, [=](VARIANT& v) { v.pparray = x; });
+  }
+  // The static descriptor with no dimensions, which the Variant never frees.
+  static Variant ZeroDimensions(VARTYPE type);
 
   VARIANT& get() { return v_; }
-  const VARIANT& get() const { return v_; }
   VARTYPE vt() const { return v_.vt; }
 
 private:
   VARIANT v_;
+  bool borrowed_ = false;
 };
 
-// A SAFEARRAY of the element type with the given bounds (one SAFEARRAYBOUND per
-// dimension, as SafeArrayCreate takes them), every element zero.
+// A SAFEARRAY with one SAFEARRAYBOUND per dimension, every element zero.
 SAFEARRAY* MakeArray(VARTYPE type, std::initializer_list<SAFEARRAYBOUND> bounds);
-// A one-dimensional VT_I4 array holding values, lower bound lower.
+// One-dimensional arrays from lower: VT_I4 values, or interface pointers (each referenced).
 SAFEARRAY* MakeLongArray(const std::vector<LONG>& values, LONG lower = 0);
-// A one-dimensional array of count interface pointers (each with its own reference).
 SAFEARRAY* MakeUnknownArray(const std::vector<IUnknown*>& objects, LONG lower = 0);
-// A one-dimensional array of count elements of elementSize bytes and no element type,
-// as a client that builds its descriptor by hand makes it.
+// count elements of elementSize bytes and no element type, as a hand-built descriptor.
 SAFEARRAY* MakeRawArray(ULONG elementSize, ULONG count);
-
-// A two-dimensional descriptor of interface pointers with no elements at all (one
-// dimension is empty) whose other dimension claims `claimed` elements, over `data`, which
-// it neither owns nor frees: an array that holds nothing however long a dimension says it is.
+// Two dimensions, one empty, the other claiming `claimed` elements over data it neither
+// owns nor frees: an array that holds nothing however long a dimension says it is.
 SAFEARRAY* MakeEmptyTwoDimensionArray(IUnknown** data, ULONG claimed, bool emptyFirst);
 
-// A descriptor with no dimensions at all: the automation functions refuse to make one, so
-// it lives in static storage; never destroy it or clear a VARIANT that holds it.
-SAFEARRAY* ZeroDimensionArray();
+// Out-parameters of the rows, holding markers until a call writes them.
+struct Outs {
+  double value, second;
+  long number;
+  BSTR name;
+  IUnknown* unknown;
+  VARIANT variant;
+  const BSTR marker = SysAllocString(L"marker");
+  Outs() { Reset(); }
+  ~Outs() { SysFreeString(marker); }
+  void Reset();
+  bool Untouched() const;
+};
 
-// One late-bound call through IDispatch::Invoke, arguments given in call order.
+// One direct call: its result, and a check of what it wrote (else: nothing written).
+struct Row {
+  std::string what;
+  std::function<HRESULT()> call;
+  HRESULT expected;
+  std::function<bool()> check = nullptr;
+};
+
+// Runs each row; snapshot() must read the same before and after it.
+template <class Snapshot>
+void RunRows(const std::vector<Row>& rows, Snapshot snapshot, Outs* outs = nullptr) {
+  for (const Row& row : rows) {
+    INFO(row.what);
+    if (outs) outs->Reset();
+    const auto before = snapshot();
+    CHECK(row.call() == row.expected);
+    if (row.check) CHECK(row.check());
+    else if (outs) CHECK(outs->Untouched());
+    CHECK(snapshot() == before);
+  }
+}
+
+// One late-bound call through IDispatch::Invoke, arguments in call order.
 class LateCall {
 public:
   LateCall(IDispatch* target, DISPID id, WORD flags = DISPATCH_METHOD);
   ~LateCall();
   LateCall(const LateCall&) = delete;
-  LateCall& operator=(const LateCall&) = delete;
-
-  LateCall& Arg(Variant value);
-  LateCall& Interface(const IID& riid);  // instead of IID_NULL
-  LateCall& NoParams();                  // a null DISPPARAMS pointer
+  LateCall& Arg(Variant value) {
+    args_.push_back(std::move(value));
+    return *this;
+  }
+  LateCall& Interface(const IID& riid) {  // instead of IID_NULL
+    iid_ = riid;
+    return *this;
+  }
   HRESULT Run();
+  HRESULT Result() {  // for DISP_E_EXCEPTION, the exception's scode
+    const HRESULT hr = Run();
+    return hr == DISP_E_EXCEPTION ? exception.scode : hr;
+  }
 
-  VARIANT result;         // cleared by the destructor
-  EXCEPINFO exception{};  // strings freed by the destructor
-  UINT argumentError = 0xFFFFFFFF;
+  VARIANT result;
+  EXCEPINFO exception{};
 
 private:
   IDispatch* target_;
   DISPID id_;
   WORD flags_;
   IID iid_ = IID_NULL;
-  bool noParams_ = false;
   std::vector<Variant> args_;
 };
 
-// The scode of a late-bound failure: the exception's scode for DISP_E_EXCEPTION, else the
-// result itself.
-HRESULT LateResult(HRESULT hr, const EXCEPINFO& exception);
+struct LateRow {
+  std::string what;
+  DISPID id;
+  WORD flags;
+  std::function<void(LateCall&)> build;
+  HRESULT expected;
+  HRESULT onWine = E_UNEXPECTED;  // where Wine's type-library dispatch answers otherwise
+};
+
+template <class Snapshot>
+void RunLate(IDispatch* target, const std::vector<LateRow>& rows, Snapshot snapshot) {
+  for (const LateRow& row : rows) {
+    INFO(row.what);
+    const auto before = snapshot();
+    LateCall call(target, row.id, row.flags);
+    if (row.build) row.build(call);
+    const HRESULT result = call.Result();
+    CAPTURE(result);
+    CHECK((result == row.expected || result == row.onWine));
+    CHECK(snapshot() == before);
+  }
+}
+
+// Three stations whose name order (Alpha, Bravo, Charlie) is not their file order.
+std::vector<TestStation> ThreeStations();
+inline const TestStation kHarbour = {"Harbour", 1200, -300, -1, {{0, 2000, 0}, {36, 1000, 900}, {29, 700, 100}}};
+
+// A station folder, the DLL, and a database open on the folder (which outlives the DLL).
+struct OpenTides {
+  StationFolder folder;
+  DllUnderTest dll;
+  ITidesDatabase* db = nullptr;
+  explicit OpenTides(const std::vector<TestStation>& stations);
+  ~OpenTides() { ReleaseAndNull(db); }
+  IUnknown* Unknown(long index) const;  // GetPort, REQUIREd to give a port
+  ITidesPort* Port(long index) const;
+  std::vector<IUnknown*> Ports(long count) const;
+  HRESULT Finish() {
+    ReleaseAndNull(db);
+    return dll.CanUnloadNow();
+  }
+};
+
+std::wstring NameOf(IUnknown* port);  // "<none>" for null, "<not a port>"
+std::wstring SelectedName(ITidesPortList* list);
+std::vector<ULONG> RefCounts(const std::vector<IUnknown*>& objects);
+// Connects sink without keeping the connection point, which would hold the source.
+void AdviseOnly(IUnknown* source, const IID& events, EventSink& sink);
+
+// A control from the DLL, in-place active in Wine's ATL host inside a top-level window.
+class HostedControl {
+public:
+  HostedControl(const DllUnderTest& dll, const CLSID& clsid, int width = 300, int height = 200);
+  ~HostedControl() { Close(); }
+  HostedControl(const HostedControl&) = delete;
+
+  IUnknown* Control() const { return control_; }  // null after Close
+  HWND Window() const { return window_; }          // the control's own window
+  template <class I>
+  I* Query() const {  // a new reference, REQUIREd
+    I* out = nullptr;
+    REQUIRE(control_ != nullptr);
+    REQUIRE(control_->QueryInterface(__uuidof(I), reinterpret_cast<void**>(&out)) == S_OK);
+    return out;
+  }
+  void Paint() const { RedrawWindow(window_, nullptr, nullptr, RDW_INVALIDATE | RDW_UPDATENOW | RDW_ALLCHILDREN); }
+  void MouseMove(int x, int y = 50) const { SendMessageW(window_, WM_MOUSEMOVE, 0, MAKELPARAM(x, y)); }
+  // Destroys the host window and releases the test's references. Idempotent.
+  void Close();
+
+private:
+  AtlHost atl_;
+  HWND host_ = nullptr;
+  HWND window_ = nullptr;
+  IUnknown* control_ = nullptr;
+  IUnknown* site_ = nullptr;
+};
 
 }  // namespace br::test::boundary

@@ -1,6 +1,5 @@
-// A TidesPort of another make: an ITidesPort written here, with every answer settable
-// (NaN and infinite heights and times, absurd point counts, failing getters) and a hook
-// that runs inside each getter, for hosts of ports to be tried against. It lives on the
+// A TidesPort of another make: every answer settable (NaN and infinite values, absurd
+// counts, failing getters) and a hook that runs last inside each getter. It lives on the
 // heap and deletes itself at its last Release, as a real object does.
 #pragma once
 
@@ -15,38 +14,51 @@ class ForeignPort final : public ITidesPort {
 public:
   static ForeignPort* Create() { return new ForeignPort(); }  // one reference, the caller's
 
-  // What the getters answer; a failing result leaves the out-parameter alone.
-  long points = 25;            // NumPoints
-  double height = 1.0;         // every WavePoint
+  long points = 25;
+  double height = 1.0;          // every WavePoint
   std::vector<double> heights;  // when not empty: WavePoint(k), else height
   double maxValue = 2.0, minValue = 0.0;
   double predictionDate = 45000.0;
   double sunRise = 45000.25, sunSet = 45000.75, twilightBegin = 45000.2, twilightEnd = 45000.8;
   HRESULT result = S_OK;        // of every getter
-  std::function<void()> onGet;  // runs at the end of every getter, after the answer
-  long getterCalls = 0;
+  std::function<void()> onGet;  // may end the object
 
   ULONG References() const { return refs_; }
   static long Alive() { return alive_; }
 
-  // IUnknown
-  STDMETHODIMP QueryInterface(REFIID riid, void** out) override;
+  STDMETHODIMP QueryInterface(REFIID riid, void** out) override {
+    if (!out) return E_POINTER;
+    *out = nullptr;
+    if (!IsEqualIID(riid, IID_IUnknown) && !IsEqualIID(riid, IID_IDispatch) && !IsEqualIID(riid, IID_ITidesPort))
+      return E_NOINTERFACE;
+    *out = static_cast<ITidesPort*>(this);
+    AddRef();
+    return S_OK;
+  }
   STDMETHODIMP_(ULONG) AddRef() override { return ++refs_; }
-  STDMETHODIMP_(ULONG) Release() override;
+  STDMETHODIMP_(ULONG) Release() override {
+    const ULONG left = --refs_;
+    if (left == 0) delete this;
+    return left;
+  }
   // IDispatch: not offered to late binding
-  STDMETHODIMP GetTypeInfoCount(UINT* count) override;
-  STDMETHODIMP GetTypeInfo(UINT, LCID, ITypeInfo** out) override;
+  STDMETHODIMP GetTypeInfoCount(UINT* count) override { return count ? (*count = 0, S_OK) : E_POINTER; }
+  STDMETHODIMP GetTypeInfo(UINT, LCID, ITypeInfo** out) override { return out ? (*out = nullptr, E_NOTIMPL) : E_POINTER; }
   STDMETHODIMP GetIDsOfNames(REFIID, LPOLESTR*, UINT, LCID, DISPID*) override { return E_NOTIMPL; }
   STDMETHODIMP Invoke(DISPID, REFIID, LCID, WORD, DISPPARAMS*, VARIANT*, EXCEPINFO*, UINT*) override {
     return E_NOTIMPL;
   }
-  // ITidesPort
-  STDMETHODIMP get_PortName(BSTR* name) override;
-  STDMETHODIMP GetPortPos(double* latitude, double* longitude) override;
-  STDMETHODIMP Calculate(double, double) override;
+  STDMETHODIMP get_PortName(BSTR* v) override { return Answer(v, [&] { *v = SysAllocString(L"Foreign"); }); }
+  STDMETHODIMP GetPortPos(double* latitude, double* longitude) override {
+    return Answer(latitude && longitude, [&] { *latitude = 50.0, *longitude = -4.0; });
+  }
+  STDMETHODIMP Calculate(double, double) override { return S_OK; }
   STDMETHODIMP get_PredictionDate(double* v) override { return Get(predictionDate, v); }
   STDMETHODIMP get_NumPoints(long* v) override { return Get(points, v); }
-  STDMETHODIMP get_WavePoint(long index, double* v) override;
+  STDMETHODIMP get_WavePoint(long k, double* v) override {
+    if (v && SUCCEEDED(result) && (k < 0 || k >= points)) return Answer(true, [] {}, E_INVALIDARG);
+    return Get(heights.empty() ? height : heights[static_cast<std::size_t>(k) % heights.size()], v);
+  }
   STDMETHODIMP get_MaxValueIndex(long* v) override { return Get(0L, v); }
   STDMETHODIMP get_MinValueIndex(long* v) override { return Get(0L, v); }
   STDMETHODIMP get_MaxValue(double* v) override { return Get(maxValue, v); }
@@ -63,17 +75,14 @@ private:
   ~ForeignPort() { --alive_; }
   template <class T>
   HRESULT Get(T value, T* out) {
-    HRESULT hr = E_POINTER;
-    if (out) {
-      hr = result;
-      if (SUCCEEDED(hr)) *out = value;
-    }
-    return Leave(hr);
+    return Answer(out != nullptr, [&] { *out = value; });
   }
-  // Runs the hook last, on a copy, touching nothing of the object afterwards: the hook
-  // may end the object.
-  HRESULT Leave(HRESULT hr) {
-    ++getterCalls;
+  // E_POINTER for a missing pointer, else the set result (written only on success); then
+  // the hook, on a copy, touching nothing of the object afterwards.
+  template <class F>
+  HRESULT Answer(bool pointers, F write, HRESULT refusal = S_OK) {
+    const HRESULT hr = !pointers ? E_POINTER : FAILED(refusal) ? refusal : result;
+    if (pointers && SUCCEEDED(hr)) write();
     if (onGet) {
       const std::function<void()> hook = onGet;
       hook();
