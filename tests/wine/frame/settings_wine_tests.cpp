@@ -113,10 +113,8 @@ TEST_CASE("string settings are read whole; other types and missing values give t
 
   unnamed.SetString("D:\\Vol\\");
   CHECK(settings.ReadString(scratch.Name(), nullptr, "") == "D:\\Vol\\");
-}
 
-TEST_CASE("string values stored without a terminator are read whole") {
-  const ScratchSubkey scratch(HKEY_LOCAL_MACHINE);
+  // A string value stored without its terminator is read whole.
   HKEY key = nullptr;
   REQUIRE(RegCreateKeyExA(HKEY_LOCAL_MACHINE, scratch.FullPath().c_str(), 0, nullptr, 0,
                           KEY_SET_VALUE, nullptr, &key, nullptr) == ERROR_SUCCESS);
@@ -131,20 +129,16 @@ TEST_CASE("the simple key reader throws 0xE0030002 without a key and limits stri
   CHECK_FALSE(missing.IsOpen());
   DWORD number = 0;
   std::string text;
-  bool threw = false;
-  try {
-    missing.ReadDword("LogBRCL", number);
-  } catch (const cErr& error) {
-    threw = error.code() == 0xE0030002u;
-  }
-  CHECK(threw);
-  threw = false;
-  try {
-    missing.ReadString("LogFileBRCL", text, 520);
-  } catch (const cErr& error) {
-    threw = error.code() == 0xE0030002u;
-  }
-  CHECK(threw);
+  const auto codeOf = [](auto read) {
+    try {
+      read();
+    } catch (const cErr& error) {
+      return error.code();
+    }
+    return 0u;
+  };
+  CHECK(codeOf([&] { missing.ReadDword("LogBRCL", number); }) == 0xE0030002u);
+  CHECK(codeOf([&] { missing.ReadString("LogFileBRCL", text, 520); }) == 0xE0030002u);
 
   const ScratchSubkey scratch(HKEY_LOCAL_MACHINE);
   SavedRegistryValue value(HKEY_LOCAL_MACHINE, scratch.FullPath(), "Text");

@@ -1,7 +1,5 @@
 #include "ToolkitTestSupport.h"
 
-#include <cstdio>
-
 #include "toolkit/layout/BorderLayout.h"
 
 namespace tktest {
@@ -45,16 +43,6 @@ RECT placed(HWND hwnd) {
 }
 
 RECT placed(const cXComponent& component) { return placed(component.getHandle()); }
-
-RECT xywh(int x, int y, int w, int h) { return RECT{x, y, x + w, y + h}; }
-
-std::string str(const RECT& r) {
-  char buffer[96];
-  std::snprintf(buffer, sizeof(buffer), "(%ld,%ld %ldx%ld)", static_cast<long>(r.left),
-                static_cast<long>(r.top), static_cast<long>(r.right - r.left),
-                static_cast<long>(r.bottom - r.top));
-  return buffer;
-}
 
 Probe::~Probe() {
   if (deletions) ++*deletions;

@@ -19,8 +19,8 @@ using wtest::pump;
 // The window's rectangle in its parent's client coordinates.
 RECT placed(HWND hwnd);
 RECT placed(const toolkit::cXComponent& component);
-RECT xywh(int x, int y, int w, int h);
-std::string str(const RECT& r);
+using wtest::str;
+using wtest::xywh;
 
 struct Seen {
   int id;

@@ -91,8 +91,7 @@ TEST_CASE("insets shrink the area; nested visible containers are laid out in the
   t.root.doLayout();
   // West region: as wide as the side panel prefers (grid: 1 * (0 + 80) + insets 10).
   SIZE sidePref = side->getPreferredSize();
-  CHECK(sidePref.cx == 90);
-  CHECK(sidePref.cy == 20 + 10);
+  CHECK(str(sidePref) == "90x30");
   CHECK_PLACED(*side, 10, 20, 90, 240);
   CHECK_PLACED(top, 5, 5, 80, 115);
   CHECK_PLACED(bottom, 5, 120, 80, 115);
@@ -101,8 +100,7 @@ TEST_CASE("insets shrink the area; nested visible containers are laid out in the
 
   // The container's preferred size in a rectangle works inside it less the insets.
   SIZE in = t.root.getPreferredSizeIn(RECT{0, 0, 400, 300});
-  CHECK(in.cx == 10 + 30 + (0 + 90) + 0 + 0 + (0 + 270));
-  CHECK(in.cy == 20 + 40 + 0 + 0 + 240);
+  CHECK(str(in) == str(SIZE{10 + 30 + 90 + 270, 20 + 40 + 240}));
 
   t.root.removeComponent(side, true);
   t.root.removeComponent(hiddenBox, true);
@@ -125,8 +123,7 @@ TEST_CASE("nothing is laid out without a layout, children or a client area") {
   Panel empty;
   empty.setInsets(4, 4, 4, 4);
   SIZE none = empty.getPreferredSize();
-  CHECK(none.cx == 0);
-  CHECK(none.cy == 0);
+  CHECK(str(none) == "0x0");
   empty.doLayout();
 }
 
@@ -150,14 +147,12 @@ TEST_CASE("the layout slots can be driven directly; a null batch moves at once")
   Probe& n = t.add(10, 30, "North");
   HDWP none = nullptr;
   SIZE used = t.root.layoutBorderRegion(RECT{0, 0, 300, 200}, kRegionNorth, true, none);
-  CHECK(used.cx == 300);
-  CHECK(used.cy == 30);
+  CHECK(str(used) == "300x30");
   CHECK_PLACED(n, 0, 0, 300, 30);
   used = t.root.layoutBorderRegion(RECT{0, 50, 300, 200}, kRegionNorth, false, none);
   CHECK_PLACED(n, 0, 0, 300, 30);
   used = t.root.layoutGrid(RECT{0, 0, 60, 40}, false, none);
-  CHECK(used.cx == 60);
-  CHECK(used.cy == 40);
+  CHECK(str(used) == "60x40");
   // The tab slot needs a TabLayout; with another layout it does nothing.
   used = t.root.layoutTabs(RECT{0, 0, 60, 40}, none);
   CHECK(used.cx == 0);

@@ -1,5 +1,7 @@
 #include "WidgetTestSupport.h"
 
+#include <cstdio>
+
 namespace wtest {
 
 namespace {
@@ -149,6 +151,19 @@ std::string windowClass(HWND hwnd) {
   GetClassNameA(hwnd, name, static_cast<int>(sizeof(name)));
   return name;
 }
+
+RECT xywh(int x, int y, int w, int h) { return RECT{x, y, x + w, y + h}; }
+
+std::string str(const RECT& r) {
+  char buffer[96];
+  std::snprintf(buffer, sizeof(buffer), "(%ld,%ld %ldx%ld)", static_cast<long>(r.left), static_cast<long>(r.top),
+                static_cast<long>(r.right - r.left), static_cast<long>(r.bottom - r.top));
+  return buffer;
+}
+
+std::string str(SIZE s) { return std::to_string(s.cx) + "x" + std::to_string(s.cy); }
+
+std::string str(POINT p) { return "(" + std::to_string(p.x) + "," + std::to_string(p.y) + ")"; }
 
 Metrics metricsOf(const char* text, UINT flags) {
   Metrics m;

@@ -84,6 +84,12 @@ private:
 
 std::string windowClass(HWND hwnd);
 
+// Rectangles, sizes and points as text, so that one check compares every field.
+RECT xywh(int x, int y, int w, int h);
+std::string str(const RECT& r);  // "(left,top wxh)"
+std::string str(SIZE s);         // "wxh"
+std::string str(POINT p);        // "(x,y)"
+
 // The default GUI font's metrics and the extent DrawText gives `text` in it.
 struct Metrics {
   TEXTMETRICA tm{};

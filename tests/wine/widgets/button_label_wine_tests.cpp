@@ -177,8 +177,7 @@ TEST_CASE("button faces: raised, pressed, disabled, colour overrides, images") {
   HIMAGELIST images = twoColourImages();
   Button pictured(images, 0, 1);
   CHECK(pictured.imageSize().cx == 16);
-  CHECK(pictured.getPreferredSize().cx == 20);
-  CHECK(pictured.getPreferredSize().cy == 20);
+  CHECK(str(pictured.getPreferredSize()) == "20x20");
   panel.add(&pictured);
   pictured.setBounds(0, 0, 30, 30, true, true);
   {
@@ -200,8 +199,7 @@ TEST_CASE("button and label sizes from the text extent") {
   const Metrics ok = metricsOf("OK");
   Button button("OK");
   SIZE size = button.getPreferredSize();
-  CHECK(size.cx == 2 * ok.tm.tmAveCharWidth + ok.measured.cx);
-  CHECK(size.cy == 3 * ok.tm.tmDescent + ok.measured.cy + 2);
+  CHECK(str(size) == str(SIZE{2 * ok.tm.tmAveCharWidth + ok.measured.cx, 3 * ok.tm.tmDescent + ok.measured.cy + 2}));
 
   const Metrics two = metricsOf("a\rb");
   Button twoLines("a\rb");
@@ -213,16 +211,14 @@ TEST_CASE("button and label sizes from the text extent") {
   SUBCASE("an empty label measures like \"AAAAA\"") {
     Label empty, five("AAAAA"), one("A");
     const SIZE e = empty.getPreferredSize(), f = five.getPreferredSize();
-    CHECK(e.cx == f.cx);
-    CHECK(e.cy == f.cy);
+    CHECK(str(e) == str(f));
     CHECK(one.getPreferredSize().cx < f.cx);
     CHECK(empty.getUserValue1() == 7);
     CHECK(empty.getUserValue2() == 0);
   }
   SUBCASE("without a screen DC: the fixed sizes") {
     MeasuringDC::simulateNoScreen(true);
-    CHECK(Button("OK").getPreferredSize().cx == 100);
-    CHECK(Button("OK").getPreferredSize().cy == 20);
+    CHECK(str(Button("OK").getPreferredSize()) == "100x20");
     CHECK(Label("x").getPreferredSize().cx == 100);
     MeasuringDC::simulateNoScreen(false);
   }

@@ -54,7 +54,7 @@ void setClipboardText(const char* text) {
 
 }  // namespace
 
-TEST_CASE("every component window gets a hidden popup of the tooltip class") {
+TEST_CASE("every component window gets a hidden popup of the tooltip class, drawn in the info colours") {
   HostWindow host;
   const size_t before = Tooltip::count();
   HWND popup = nullptr;
@@ -76,6 +76,19 @@ TEST_CASE("every component window gets a hidden popup of the tooltip class") {
     REQUIRE(GetClassInfoExA(GetModuleHandleA(nullptr), Tooltip::kClassName, &info));
     CHECK(info.style == (CS_HREDRAW | CS_VREDRAW));
     CHECK(info.hCursor == LoadCursor(nullptr, IDC_CROSS));
+
+    // The frame and the text in the info text colour over the info background.
+    tip->setFittedText("Wreck");
+    const SIZE size = tip->size();
+    const int in = Tooltip::kTextInset;
+    REQUIRE(size.cx > 2 * in);
+    Canvas canvas(size.cx, size.cy, RGB(255, 0, 255));
+    tip->draw(canvas.dc(), RECT{0, 0, size.cx, size.cy});
+    CHECK(canvas.at(0, 0) == GetSysColor(COLOR_INFOTEXT));
+    CHECK(canvas.at(size.cx - 1, size.cy - 1) == GetSysColor(COLOR_INFOTEXT));
+    CHECK(canvas.at(1, 1) == GetSysColor(COLOR_INFOBK));
+    CHECK(canvas.count(RGB(255, 0, 255)) == 0);
+    CHECK(canvas.countIn(GetSysColor(COLOR_INFOTEXT), RECT{in, in, size.cx - in, size.cy - in}) > 0);
   }
   CHECK_FALSE(IsWindow(popup));  // destroyed with its component
   CHECK(Tooltip::count() == before);
@@ -83,13 +96,9 @@ TEST_CASE("every component window gets a hidden popup of the tooltip class") {
 
 TEST_CASE("tooltip placement at the cursor") {
   const SIZE popup{100, 40};
-  POINT at = Tooltip::placement(POINT{200, 300}, popup, 1024, 768, 32);
-  CHECK(at.x == 200);
-  CHECK(at.y == 332);  // below the cursor
-  at = Tooltip::placement(POINT{1000, 300}, popup, 1024, 768, 32);
-  CHECK(at.x == 924);  // moved left to end inside the screen
-  at = Tooltip::placement(POINT{10, 740}, popup, 1024, 768, 32);
-  CHECK(at.y == 740 - 40 - 3);  // no room below: above the cursor
+  CHECK(str(Tooltip::placement(POINT{200, 300}, popup, 1024, 768, 32)) == "(200,332)");  // below the cursor
+  CHECK(str(Tooltip::placement(POINT{1000, 300}, popup, 1024, 768, 32)) == "(924,332)");  // kept on the screen
+  CHECK(str(Tooltip::placement(POINT{10, 740}, popup, 1024, 768, 32)) == "(10,697)");  // no room below: above
 }
 
 TEST_CASE("hovering a second shows the popup; leaving hides it") {
@@ -125,9 +134,7 @@ TEST_CASE("hovering a second shows the popup; leaving hides it") {
   GetWindowRect(tip->window(), &r);
   const POINT expected = Tooltip::placement(POINT{150, 150}, tip->size(), GetSystemMetrics(SM_CXSCREEN),
                                             GetSystemMetrics(SM_CYSCREEN), GetSystemMetrics(SM_CYCURSOR));
-  CHECK(r.left == expected.x);
-  CHECK(r.top == expected.y);
-  CHECK(r.right - r.left == tip->size().cx);
+  CHECK(str(r) == str(xywh(expected.x, expected.y, tip->size().cx, tip->size().cy)));
 
   pump(200);
   CHECK(owner.asked == 1);  // once per visit
@@ -165,24 +172,6 @@ TEST_CASE("nested components: the innermost one under the cursor gets the popup"
   SetCursorPos(5, 5);
   pump(100);
   CHECK_FALSE(IsWindowVisible(outerTip->window()));
-}
-
-TEST_CASE("the tooltip draws its frame, background and text") {
-  HostWindow host;
-  TipOwner owner;
-  REQUIRE(owner.create(host.hwnd()));
-  Tooltip* tip = Tooltip::of(owner);
-  tip->setFittedText("Wreck");
-  const SIZE size = tip->size();
-  REQUIRE(size.cx > 2 * Tooltip::kTextInset);
-  Canvas canvas(size.cx, size.cy, RGB(255, 0, 255));
-  tip->draw(canvas.dc(), RECT{0, 0, size.cx, size.cy});
-  CHECK(canvas.at(0, 0) == GetSysColor(COLOR_INFOTEXT));
-  CHECK(canvas.at(size.cx - 1, size.cy - 1) == GetSysColor(COLOR_INFOTEXT));
-  CHECK(canvas.at(1, 1) == GetSysColor(COLOR_INFOBK));
-  CHECK(canvas.count(RGB(255, 0, 255)) == 0);
-  CHECK(canvas.countIn(GetSysColor(COLOR_INFOTEXT), RECT{Tooltip::kTextInset, Tooltip::kTextInset,
-                                                          size.cx - Tooltip::kTextInset, size.cy - Tooltip::kTextInset}) > 0);
 }
 
 TEST_CASE("edit clipboard keys move plain ANSI text") {
