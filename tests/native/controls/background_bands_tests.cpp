@@ -20,9 +20,7 @@ SunEvents AllFour() {
 }
 
 void CheckBand(const Band& band, int left, int right, int colour) {
-  CHECK(band.left == left);
-  CHECK(band.right == right);
-  CHECK(band.colour == colour);
+  CHECK((band.left == left && band.right == right && band.colour == colour));
 }
 
 }  // namespace
@@ -60,27 +58,21 @@ TEST_CASE("no sun event: daylight all day in the polar summer, else night") {
   std::vector<Band> bands = BackgroundBands(e, Plain());
   REQUIRE(bands.size() == 1);
   CheckBand(bands[0], 8, 292, kDaylightColour);
-  e.month = 12;
-  CHECK(BackgroundBands(e, Plain()).empty());
-  e.latitude = -70.0;
-  REQUIRE(BackgroundBands(e, Plain()).size() == 1);
-  e.month = 7;
-  CHECK(BackgroundBands(e, Plain()).empty());
-  e.latitude = 0.0;
-  e.month = 12;
-  CHECK(BackgroundBands(e, Plain()).empty());
-  e.latitude = 78.2;
-  e.month.reset();  // the month could not be read
-  CHECK(BackgroundBands(e, Plain()).empty());
+  const std::pair<double, int> days[] = {{78.2, 12}, {-70.0, 12}, {-70.0, 7}, {0.0, 12}, {78.2, 0}};  // month 0: unread
+  const std::size_t bandCount[] = {0, 1, 0, 0, 0};
+  for (int i = 0; i < 5; ++i) {
+    e.latitude = days[i].first;
+    e.month = days[i].second;
+    if (!days[i].second) e.month.reset();
+    CHECK(BackgroundBands(e, Plain()).size() == bandCount[i]);
+  }
 }
 
 TEST_CASE("any other combination leaves the night") {
-  SunEvents e = AllFour();
-  e.sunset.reset();
-  CHECK(BackgroundBands(e, Plain()).empty());
-  e = AllFour();
-  e.twilightEnd.reset();
-  CHECK(BackgroundBands(e, Plain()).empty());
+  SunEvents noSunset = AllFour(), noTwilightEnd = AllFour();
+  noSunset.sunset.reset();
+  noTwilightEnd.twilightEnd.reset();
+  CHECK((BackgroundBands(noSunset, Plain()).empty() && BackgroundBands(noTwilightEnd, Plain()).empty()));
 }
 
 TEST_CASE("an interval over midnight is painted at both ends of the plot") {

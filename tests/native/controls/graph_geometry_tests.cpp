@@ -18,33 +18,21 @@ GraphGeometry Plain() { return GraphGeometry(Rect{0, 0, 300, 200}, 8, 8); }
 
 }  // namespace
 
-TEST_CASE("the plot lies inside the margins") {
+TEST_CASE("the plot lies inside the margins: labels widen the left and bottom ones only") {
   const GraphGeometry g = Plain();
-  CHECK(g.PlotLeft() == 8);
-  CHECK(g.PlotRight() == 292);
-  CHECK(g.PlotTop() == 8);
-  CHECK(g.PlotBottom() == 192);
-  CHECK(g.PlotWidth() == 284);
-  CHECK(g.PlotHeight() == 184);
+  CHECK((g.PlotLeft() == 8 && g.PlotRight() == 292 && g.PlotTop() == 8 && g.PlotBottom() == 192));
+  CHECK((g.PlotWidth() == 284 && g.PlotHeight() == 184));
   const GraphGeometry labelled(Rect{0, 0, 400, 250}, 37, 16);
-  CHECK(labelled.PlotLeft() == 37);
-  CHECK(labelled.PlotBottom() == 234);
-  CHECK(labelled.PlotWidth() == 355);
-  CHECK(labelled.PlotHeight() == 226);
+  CHECK((labelled.PlotLeft() == 37 && labelled.PlotBottom() == 234));
+  CHECK((labelled.PlotWidth() == 355 && labelled.PlotHeight() == 226));
 }
 
 TEST_CASE("times of day, hour lines and height lines") {
   const GraphGeometry g = Plain();
-  CHECK(g.XOfTime(0, 0) == 8);
-  CHECK(g.XOfTime(24, 0) == 292);
-  CHECK(g.XOfTime(12, 0) == 150);
-  CHECK(g.XOfTime(6, 30) == 84);  // 8 + trunc(390 * 284 / 1440 = 76.9)
-  CHECK(g.XOfHourLine(1) == 19);  // trunc(8 + 11.83)
-  CHECK(g.XOfHourLine(12) == 150);
-  CHECK(g.XOfHourLine(23) == 280);
-  CHECK(g.YOfHeightLine(0) == 192);
-  CHECK(g.YOfHeightLine(1) == 155);  // trunc(200 - 36.8 - 8)
-  CHECK(g.YOfHeightLine(5) == 8);
+  // 06:30 is 8 + trunc(76.9); hour line 1 is trunc(8 + 11.83); height line 1 is trunc(200 - 36.8 - 8).
+  CHECK((g.XOfTime(0, 0) == 8 && g.XOfTime(24, 0) == 292 && g.XOfTime(12, 0) == 150 && g.XOfTime(6, 30) == 84));
+  CHECK((g.XOfHourLine(1) == 19 && g.XOfHourLine(12) == 150 && g.XOfHourLine(23) == 280));
+  CHECK((g.YOfHeightLine(0) == 192 && g.YOfHeightLine(1) == 155 && g.YOfHeightLine(5) == 8));
   CHECK(g.YOfHeightLabel(1) == 147);
   CHECK(GraphGeometry::HeightOfLine(0, 3.0, -1.0) == -1.0);
   CHECK(GraphGeometry::HeightOfLine(5, 3.0, -1.0) == doctest::Approx(3.0));
@@ -57,14 +45,10 @@ TEST_CASE("the curve spans the plot from the lowest to the highest value") {
   for (int k = 0; k < 25; ++k) values[k] = std::sin(k * 0.5);
   const std::vector<Point> curve = g.Curve(values, 1.0, -1.0);
   REQUIRE(curve.size() == 25);
-  CHECK(curve.front().x == 8);
-  CHECK(curve.back().x == 292);
-  CHECK(curve[3].x == 43);  // trunc(8 + 3 * 284 / 24 = 43.5)
+  CHECK((curve.front().x == 8 && curve.back().x == 292 && curve[3].x == 43));  // trunc(8 + 3 * 284 / 24 = 43.5)
   CHECK(curve.front().y == 100);  // sin 0 = 0 at mid-scale: trunc(192 - 1 * 184 / 2)
   const std::vector<Point> ends = g.Curve({-1.0, 1.0, 0.25}, 1.0, -1.0);
-  CHECK(ends[0].y == 192);
-  CHECK(ends[1].y == 8);
-  CHECK(ends[2].y == 77);  // trunc(192 - 1.25 * 92 = 77)
+  CHECK((ends[0].y == 192 && ends[1].y == 8 && ends[2].y == 77));  // trunc(192 - 1.25 * 92 = 77)
 }
 
 TEST_CASE("a flat scale or a single point draws a flat line at mid-height") {
@@ -75,10 +59,7 @@ TEST_CASE("a flat scale or a single point draws a flat line at mid-height") {
   CHECK(flat[1].x == 150);
   const std::vector<Point> single = g.Curve({0.7}, 2.0, 0.0);
   REQUIRE(single.size() == 2);
-  CHECK(single[0].x == 8);
-  CHECK(single[1].x == 292);
-  CHECK(single[0].y == 100);
-  CHECK(single[1].y == 100);
+  CHECK((single[0].x == 8 && single[1].x == 292 && single[0].y == 100 && single[1].y == 100));
   const double nan = std::numeric_limits<double>::quiet_NaN();
   for (const Point& p : g.Curve({0.0, 1.0}, nan, 0.0)) CHECK(p.y == 100);
   CHECK(g.Curve({}, 1.0, 0.0).empty());
@@ -88,33 +69,21 @@ TEST_CASE("values far outside the scale stay in a safe pixel range") {
   const GraphGeometry g = Plain();
   const double inf = std::numeric_limits<double>::infinity();
   const std::vector<Point> wild = g.Curve({1e300, -1e300, inf, std::nan("")}, 1.0, 0.0);
-  CHECK(wild[0].y < -1000000);
-  CHECK(wild[1].y > 1000000);
-  CHECK(wild[3].y == 100);
+  CHECK((wild[0].y < -1000000 && wild[1].y > 1000000 && wild[3].y == 100));
   const std::vector<Point> tiny = g.Curve({1.0, 0.0}, 1e-300, 0.0);
   CHECK(tiny[0].y < 0);
 }
 
 TEST_CASE("the pointer reads the time and point under it") {
   const GraphGeometry g = Plain();
-  PointerReading r;
-  REQUIRE(g.ReadPointer(0, 25, r));  // left of the plot: 00:00 and the first point
-  CHECK(r.hour == 0);
-  CHECK(r.minute == 0);
-  CHECK(r.index == 0);
-  REQUIRE(g.ReadPointer(8, 25, r));
-  CHECK(r.index == 0);
-  REQUIRE(g.ReadPointer(9, 25, r));  // 1 pixel = 5.07 minutes
-  CHECK(r.hour == 0);
-  CHECK(r.minute == 5);
-  REQUIRE(g.ReadPointer(150, 25, r));  // the middle of the day
-  CHECK(r.hour == 12);
-  CHECK(r.minute == 0);
-  CHECK(r.index == 12);
-  REQUIRE(g.ReadPointer(291, 25, r));
-  CHECK(r.hour == 23);
-  CHECK(r.minute == 54);
-  CHECK(r.index == 24);
+  // Left of the plot reads 00:00 and the first point; 1 pixel is 5.07 minutes.
+  const int readings[][4] = {{0, 0, 0, 0}, {8, 0, 0, 0}, {9, 0, 5, 0}, {150, 12, 0, 12}, {291, 23, 54, 24}};
+  for (const auto& e : readings) {
+    CAPTURE(e[0]);
+    PointerReading r;
+    REQUIRE(g.ReadPointer(static_cast<unsigned>(e[0]), 25, r));
+    CHECK((r.hour == e[1] && r.minute == e[2] && r.index == e[3]));
+  }
 }
 
 TEST_CASE("no reading past the end of the day, without points or without a plot") {

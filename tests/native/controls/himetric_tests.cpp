@@ -9,14 +9,10 @@ using br::control::PixelsFromHimetric;
 using br::control::ScaleRounded;
 
 TEST_CASE("pixels and himetric convert with MulDiv's rounding") {
-  CHECK(HimetricFromPixels(300, 96) == 7938);  // 7937.5 rounds away from zero
-  CHECK(HimetricFromPixels(200, 96) == 5292);
-  CHECK(PixelsFromHimetric(7938, 96) == 300);
-  CHECK(PixelsFromHimetric(5292, 96) == 200);
-  CHECK(HimetricFromPixels(96, 96) == 2540);
-  CHECK(HimetricFromPixels(120, 120) == 2540);
-  CHECK(HimetricFromPixels(-300, 96) == -7938);
-  CHECK(HimetricFromPixels(0, 96) == 0);
+  CHECK((HimetricFromPixels(300, 96) == 7938 && HimetricFromPixels(-300, 96) == -7938));  // 7937.5 rounds away from 0
+  CHECK((HimetricFromPixels(200, 96) == 5292 && HimetricFromPixels(0, 96) == 0));
+  CHECK((PixelsFromHimetric(7938, 96) == 300 && PixelsFromHimetric(5292, 96) == 200));
+  CHECK((HimetricFromPixels(96, 96) == 2540 && HimetricFromPixels(120, 120) == 2540));
 }
 
 TEST_CASE("odd inputs do not divide by zero or overflow") {

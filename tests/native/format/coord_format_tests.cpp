@@ -26,16 +26,13 @@ TEST_CASE("zero takes north and east, negative zero too") {
   CHECK(FormatCoord("DD" DEG "MM.mmm'$", COORD_LATITUDE, 0.0) == "00" DEG "00.000'N");
   CHECK(FormatCoord("DDD" DEG "MM.mmm'$", COORD_LONGITUDE, 0.0) == "000" DEG "00.000'E");
   CHECK(FormatCoord("DDD" DEG "MM.mmm'$", COORD_LONGITUDE, -0.0) == "000" DEG "00.000'E");
-  CHECK(HemisphereLetter(COORD_LATITUDE, -1e-12) == 'S');
-  CHECK(HemisphereLetter(COORD_LONGITUDE, -1e-12) == 'W');
+  CHECK((HemisphereLetter(COORD_LATITUDE, -1e-12) == 'S' && HemisphereLetter(COORD_LONGITUDE, -1e-12) == 'W'));
   CHECK(HemisphereLetter(5, 1.0) == '\0');
 }
 
 TEST_CASE("no mask, an empty mask, an unknown kind or a non-finite value give empty text") {
-  CHECK(FormatCoord("DD" DEG "MM.mmm'$", 5, 12.5).empty());
-  CHECK(FormatCoord("DD" DEG "MM.mmm'$", 8, 12.5).empty());
-  CHECK(FormatCoord("", COORD_LATITUDE, 12.5).empty());
-  CHECK(FormatCoord(nullptr, COORD_LONGITUDE, 12.5).empty());
+  CHECK((FormatCoord("DD" DEG "MM.mmm'$", 5, 12.5).empty() && FormatCoord("DD" DEG "MM.mmm'$", 8, 12.5).empty()));
+  CHECK((FormatCoord("", COORD_LATITUDE, 12.5).empty() && FormatCoord(nullptr, COORD_LONGITUDE, 12.5).empty()));
   CHECK(FormatCoord("DD$", COORD_LATITUDE, std::nan("")).empty());
   CHECK(FormatCoord("DD$", COORD_LATITUDE, std::numeric_limits<double>::infinity()).empty());
 }
@@ -59,14 +56,16 @@ TEST_CASE("a preset mask in other letter case takes the general path") {
 }
 
 TEST_CASE("field widths: padding, leftmost cut for D, M and S, one hemisphere letter") {
-  CHECK(FormatCoord("DDDD", COORD_LATITUDE, 45.75) == "0045");
-  CHECK(FormatCoord("D", COORD_LATITUDE, 45.75) == "4");
-  CHECK(FormatCoord("M", COORD_LATITUDE, 45.75) == "4");
-  CHECK(FormatCoord("S", COORD_LATITUDE, 12.2583333) == "2");
-  CHECK(FormatCoord("$$$", COORD_LONGITUDE, 1.0) == "E");
-  CHECK(FormatCoord("d", COORD_LATITUDE, 0.96) == "9");
-  CHECK(FormatCoord("mmmmmm", COORD_LATITUDE, 0.5) == "000000");
-  CHECK(FormatCoord("x/D y", COORD_LATITUDE, 7.0) == "x/7 y");
+  const struct {
+    const char* mask;
+    int kind;
+    double value;
+    const char* text;
+  } rows[] = {{"DDDD", COORD_LATITUDE, 45.75, "0045"}, {"D", COORD_LATITUDE, 45.75, "4"},
+              {"M", COORD_LATITUDE, 45.75, "4"},       {"S", COORD_LATITUDE, 12.2583333, "2"},
+              {"$$$", COORD_LONGITUDE, 1.0, "E"},      {"d", COORD_LATITUDE, 0.96, "9"},
+              {"mmmmmm", COORD_LATITUDE, 0.5, "000000"}, {"x/D y", COORD_LATITUDE, 7.0, "x/7 y"}};
+  for (const auto& r : rows) CHECK_MESSAGE(FormatCoord(r.mask, r.kind, r.value) == r.text, r.mask);
 }
 
 TEST_CASE("the general path survives wide fields and far-away values") {
@@ -86,8 +85,7 @@ TEST_CASE("the general path survives wide fields and far-away values") {
 
 TEST_CASE("the preset path caps far-away values at 100 characters") {
   const std::string huge = FormatCoord("DD" DEG "MM.mmm'$", COORD_LATITUDE, NO_VALUE);
-  CHECK(huge.size() == 100);
-  CHECK(huge.substr(0, 4) == "1797");
+  CHECK((huge.size() == 100 && huge.substr(0, 4) == "1797"));
   // Beyond exact integer totals the whole degrees are split off first.
   CHECK(FormatCoord("DDD" DEG "MM'.mm $", COORD_LONGITUDE, 2e12 + 0.5) ==
         "2000000000000" DEG "30'.00 E");

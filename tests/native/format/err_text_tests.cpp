@@ -26,21 +26,14 @@ ErrReportContext SampleContext(const char* systemText) {
 }  // namespace
 
 TEST_CASE("source names keep only the file name and extension") {
-  std::string name, extension;
-  SplitSourceName("C:\\work\\legend\\XChartLegend.cpp", name, extension);
-  CHECK(name == "XChartLegend");
-  CHECK(extension == ".cpp");
-  SplitSourceName("/work/main/inspector/cP_SHPanel.tar.cpp", name, extension);
-  CHECK(name == "cP_SHPanel.tar");
-  CHECK(extension == ".cpp");
-  SplitSourceName("D:Makefile", name, extension);
-  CHECK(name == "Makefile");
-  CHECK(extension.empty());
-  SplitSourceName("dir.d\\noext", name, extension);
-  CHECK(name == "noext");
-  CHECK(extension.empty());
-  SplitSourceName(nullptr, name, extension);
-  CHECK(name.empty());
+  const char* rows[][3] = {{"C:\\work\\legend\\XChartLegend.cpp", "XChartLegend", ".cpp"},
+                           {"/work/main/inspector/cP_SHPanel.tar.cpp", "cP_SHPanel.tar", ".cpp"},
+                           {"D:Makefile", "Makefile", ""}, {"dir.d\\noext", "noext", ""}, {nullptr, "", ""}};
+  for (const auto& r : rows) {
+    std::string name = "x", extension = "y";
+    SplitSourceName(r[0], name, extension);
+    CHECK((name == r[1] && extension == r[2]));
+  }
 }
 
 TEST_CASE("the line offset counts from the operation's first line") {
@@ -53,10 +46,8 @@ TEST_CASE("the line offset counts from the operation's first line") {
 }
 
 TEST_CASE("system messages are cut at their first line break") {
-  CHECK(FirstLineOf("Unspecified error\r\n") == "Unspecified error");
-  CHECK(FirstLineOf("two\nlines") == "two");
-  CHECK(FirstLineOf("") == "");
-  CHECK(FirstLineOf(nullptr) == "");
+  CHECK((FirstLineOf("Unspecified error\r\n") == "Unspecified error" && FirstLineOf("two\nlines") == "two"));
+  CHECK((FirstLineOf("") == "" && FirstLineOf(nullptr) == ""));
 }
 
 TEST_CASE("the log line has every field in its place") {
@@ -96,6 +87,5 @@ TEST_CASE("the box text, with the record's text on a line of its own, at most 51
   const std::string longText(600, 'y');
   record.text = longText.c_str();
   const std::string box = FormatErrBoxText(record, SampleContext(nullptr));
-  CHECK(box.size() == ERR_BOX_TEXT_MAX);
-  CHECK(box.back() == 'y');
+  CHECK((box.size() == ERR_BOX_TEXT_MAX && box.back() == 'y'));
 }

@@ -94,10 +94,8 @@ TEST_CASE("no folder, no name or an unreadable folder finds nothing") {
   FakeTree tree;
   tree.folders[""] = {File("a.bmp")};
   std::string path;
-  CHECK_FALSE(SearchFolderTree(tree, "", "a.bmp", path));
-  CHECK_FALSE(SearchFolderTree(tree, "F:\\missing", "a.bmp", path));
   tree.folders["F:\\x"] = {File("")};
-  CHECK_FALSE(SearchFolderTree(tree, "F:\\x", "", path));
-  CHECK(JoinFolderPath("F:\\", "a") == "F:\\a");
-  CHECK(JoinFolderPath("F:", "a") == "F:\\a");
+  CHECK_FALSE((SearchFolderTree(tree, "", "a.bmp", path) || SearchFolderTree(tree, "F:\\missing", "a.bmp", path) ||
+               SearchFolderTree(tree, "F:\\x", "", path)));
+  CHECK((JoinFolderPath("F:\\", "a") == "F:\\a" && JoinFolderPath("F:", "a") == "F:\\a"));
 }

@@ -45,12 +45,8 @@ TEST_CASE("a body that succeeds runs once and reports nothing") {
   ErrRecord record;
   int runs = 0;
   CHECK(RunGuarded(handler, "CXChartLegend", PLACE, record, [&] { ++runs; }) == 0);
-  CHECK(runs == 1);
-  CHECK(handler.attempts == 1);
-  CHECK(handler.reports.empty());
-  CHECK_FALSE(record.failed());
-  CHECK(record.firstLine == 1240);
-  CHECK(std::string(record.function) == "SetLegendData");
+  CHECK((runs == 1 && handler.attempts == 1 && handler.reports.empty() && !record.failed()));
+  CHECK((record.firstLine == 1240 && std::string(record.function) == "SetLegendData"));
 }
 
 TEST_CASE("each kind of thrown value is turned into the record's line and result") {
@@ -61,14 +57,12 @@ TEST_CASE("each kind of thrown value is turned into the record's line and result
     CHECK(RunGuarded(handler, "C", PLACE, record, [] { throw cErr(BR_ERR_FILE_OPEN); }) ==
           static_cast<std::int32_t>(0xE0040001u));
     REQUIRE(handler.reports.size() == 1);
-    CHECK(handler.reports[0].line == -1);
-    CHECK(static_cast<std::uint32_t>(handler.reports[0].result) == 0xE0040001u);
+    CHECK((handler.reports[0].line == -1 && static_cast<std::uint32_t>(handler.reports[0].result) == 0xE0040001u));
   }
   SUBCASE("a source line: kept as the line, and the attempt fails") {
     CHECK(RunGuarded(handler, "C", PLACE, record, [] { throw 1265; }) == BR_RESULT_FAIL);
     REQUIRE(handler.reports.size() == 1);
-    CHECK(handler.reports[0].line == 1265);
-    CHECK(handler.reports[0].result == BR_RESULT_FAIL);
+    CHECK((handler.reports[0].line == 1265 && handler.reports[0].result == BR_RESULT_FAIL));
   }
   SUBCASE("the COM-support exception and anything else: E_FAIL") {
     CHECK(RunGuarded(handler, "C", PLACE, record, [] { throw cComError(-2147024809); }) ==
@@ -77,13 +71,9 @@ TEST_CASE("each kind of thrown value is turned into the record's line and result
           BR_RESULT_FAIL);
     CHECK(RunGuarded(handler, "C", PLACE, record, [] { throw 2.5; }) == BR_RESULT_FAIL);
     REQUIRE(handler.reports.size() == 3);
-    for (const ErrRecord& reported : handler.reports) {
-      CHECK(reported.line == -1);
-      CHECK(reported.result == BR_RESULT_FAIL);
-    }
+    for (const ErrRecord& reported : handler.reports) CHECK((reported.line == -1 && reported.result == BR_RESULT_FAIL));
   }
-  CHECK(handler.classNames.back() == "C");
-  CHECK(record.failed());
+  CHECK((handler.classNames.back() == "C" && record.failed()));
 }
 
 TEST_CASE("the check macros throw the line they stand on") {
@@ -115,21 +105,18 @@ TEST_CASE("retry runs the body again with the same arguments and a fresh record"
     });
   };
   CHECK(static_cast<std::uint32_t>(operation(42)) == 0xE0040003u);
-  CHECK(seen == std::vector<int>{42, 42, 42});
-  CHECK(handler.attempts == 3);
+  CHECK((seen == std::vector<int>{42, 42, 42} && handler.attempts == 3));
   REQUIRE(handler.reports.size() == 3);
   CHECK(handler.reports[0].line == 1300);
   // The second attempt starts from a clean record.
-  CHECK(handler.reports[1].line == -1);
-  CHECK(handler.reports[1].text == nullptr);
+  CHECK((handler.reports[1].line == -1 && handler.reports[1].text == nullptr));
 }
 
 TEST_CASE("ignore forgets the failure; going on keeps it") {
   ErrRecord record;
   ScriptedHandler ignoring({ScriptedHandler::Ignore});
   CHECK(RunGuarded(ignoring, "C", PLACE, record, [] { throw 7; }) == 0);
-  CHECK_FALSE(record.failed());
-  CHECK(record.line == 7);
+  CHECK((!record.failed() && record.line == 7));
 
   ScriptedHandler aborting({ScriptedHandler::GoOn});
   CHECK(RunGuarded(aborting, "C", PLACE, record, [] { throw 7; }) == BR_RESULT_FAIL);
@@ -143,7 +130,5 @@ TEST_CASE("a retry after success is never asked for") {
   RunGuarded(handler, "C", PLACE, record, [&] {
     if (++runs == 1) throw cErr(BR_ERR_OUT_OF_MEMORY);
   });
-  CHECK(runs == 2);
-  CHECK(handler.reports.size() == 1);
-  CHECK_FALSE(record.failed());
+  CHECK((runs == 2 && handler.reports.size() == 1 && !record.failed()));
 }

@@ -8,9 +8,7 @@ using namespace toolkit;
 using namespace toolkit::table;
 
 TEST_CASE("kinds outside 2..8 are text columns") {
-  CHECK(normalizeKind(0) == kCellText);
-  CHECK(normalizeKind(9) == kCellText);
-  CHECK(normalizeKind(-3) == kCellText);
+  for (int kind : {0, 9, -3}) CHECK(normalizeKind(kind) == kCellText);
   for (int kind = 2; kind <= 8; ++kind) CHECK(normalizeKind(kind) == kind);
 }
 
@@ -31,9 +29,7 @@ TEST_CASE("each kind's cell table has its named cell column and User data") {
     CAPTURE(e.kind);
     auto cells = makeCellTable(e.kind);
     REQUIRE(cells->columnCount() == 2);
-    CHECK(cells->columnName(0) == std::string(e.name));
-    CHECK(cells->columnType(0) == e.storage);
-    CHECK(cells->columnName(1) == "User data");
-    CHECK(cells->columnType(1) == ColumnType::Integer);
+    CHECK((cells->columnName(0) == std::string(e.name) && cells->columnType(0) == e.storage));
+    CHECK((cells->columnName(1) == "User data" && cells->columnType(1) == ColumnType::Integer));
   }
 }
