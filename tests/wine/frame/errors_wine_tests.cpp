@@ -131,37 +131,30 @@ TEST_CASE("the log mask counts only a DWORD, and 0xFFFFFFFF as 0") {
 
 TEST_CASE("the log file path: as it stands with drive and folder, else completed from KeyPath") {
   LogSettings settings;
-  settings.file.SetString("C:\\logs\\brcl.log");
-  settings.keyPath.SetString("D:\\Charts\\");
-  CHECK(cErrReporter::LogFilePath() == "C:\\logs\\brcl.log");
-
-  settings.file.SetString("error.log");
-  CHECK(cErrReporter::LogFilePath() == "D:\\Charts\\error.log");
-  settings.keyPath.SetString("D:\\Charts");  // a folder, closing backslash or not
-  CHECK(cErrReporter::LogFilePath() == "D:\\Charts\\error.log");
-  settings.file.SetString("E:error.log");
-  CHECK(cErrReporter::LogFilePath() == "E:\\Charts\\error.log");
-  settings.file.SetString("\\logs\\error.log");
-  CHECK(cErrReporter::LogFilePath() == "D:\\logs\\error.log");
-
-  settings.keyPath.SetString("");
-  CHECK(cErrReporter::LogFilePath().empty());
-  settings.keyPath.Delete();
-  CHECK(cErrReporter::LogFilePath().empty());
-
-  settings.keyPath.SetString("D:\\Charts\\");
-  settings.file.SetString("C:\\logs\\brcl.log", REG_EXPAND_SZ);
-  CHECK(cErrReporter::LogFilePath().empty());
-  settings.file.SetString("");
-  CHECK(cErrReporter::LogFilePath().empty());
-  settings.file.Delete();
-  CHECK(cErrReporter::LogFilePath().empty());
-  // Longer than the 520 bytes the value may take.
-  settings.file.SetString("C:\\" + std::string(530, 'a') + ".log");
-  CHECK(cErrReporter::LogFilePath().empty());
-  // Fits the value but not a path.
-  settings.file.SetString("C:\\" + std::string(300, 'a') + ".log");
-  CHECK(cErrReporter::LogFilePath().empty());
+  const std::string tooLong = "C:\\" + std::string(530, 'a') + ".log";  // beyond the value's 520 bytes
+  const std::string noPath = "C:\\" + std::string(300, 'a') + ".log";   // fits the value, not a path
+  // LogFileBRCL (null: none) and its type, KeyPath (null: none), the path used.
+  struct Row { const char* file; DWORD type; const char* keyPath; const char* path; };
+  const Row rows[] = {
+      {"C:\\logs\\brcl.log", REG_SZ, "D:\\Charts\\", "C:\\logs\\brcl.log"},
+      {"error.log", REG_SZ, "D:\\Charts\\", "D:\\Charts\\error.log"},
+      {"error.log", REG_SZ, "D:\\Charts", "D:\\Charts\\error.log"},  // closing backslash or not
+      {"E:error.log", REG_SZ, "D:\\Charts", "E:\\Charts\\error.log"},
+      {"\\logs\\error.log", REG_SZ, "D:\\Charts", "D:\\logs\\error.log"},
+      {"\\logs\\error.log", REG_SZ, "", ""},
+      {"\\logs\\error.log", REG_SZ, nullptr, ""},
+      {"C:\\logs\\brcl.log", REG_EXPAND_SZ, "D:\\Charts\\", ""},
+      {"", REG_SZ, "D:\\Charts\\", ""},
+      {nullptr, REG_SZ, "D:\\Charts\\", ""},
+      {tooLong.c_str(), REG_SZ, "D:\\Charts\\", ""},
+      {noPath.c_str(), REG_SZ, "D:\\Charts\\", ""},
+  };
+  for (const Row& row : rows) {
+    CAPTURE(&row - rows);
+    row.file ? settings.file.SetString(row.file, row.type) : settings.file.Delete();
+    row.keyPath ? settings.keyPath.SetString(row.keyPath) : settings.keyPath.Delete();
+    CHECK(cErrReporter::LogFilePath() == row.path);
+  }
 }
 
 TEST_CASE("a failure appends exactly one line with every field and shows nothing") {
