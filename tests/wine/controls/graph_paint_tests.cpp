@@ -135,41 +135,8 @@ TEST_CASE("draw text 0: no labels, 8-pixel margins, 23 hour lines and 6 height l
   CHECK(day.Finish() == S_OK);
 }
 
-TEST_CASE("the combinations of sun events") {
-  const Layout layout;
-  const int day0 = layout.XOfHours(6.0), day1 = layout.XOfHours(18.0);
-  const int tw0 = layout.XOfHours(5.5), tw1 = layout.XOfHours(18.5);
-  constexpr double kJune = 45092.0, kDecember = 45275.0;  // 2023-06-15, 2023-12-15
-  struct Row {
-    const char* what;
-    bool twilight, riseSet, sunset;  // which events the port has
-    double latitude, date;
-    int dayFrom, dayTo, twilightFrom, twilightTo;
-  };
-  const Row rows[] = {
-      {"rise and set without twilight: twilight all day around the daylight", false, true, true, 48, 45000, day0,
-       day1, 8, 292},
-      {"twilight without rise and set: only the twilight band", true, false, false, 48, 45000, 0, 0, tw0, tw1},
-      {"no event in a northern June: daylight all day", false, false, false, 78.2, kJune, 8, 292, 0, 0},
-      {"no event in a northern December: night all day", false, false, false, 78.2, kDecember, 0, 0, 0, 0},
-      {"no event in a southern June: night all day", false, false, false, -70, kJune, 0, 0, 0, 0},
-      {"no event in a southern December: daylight all day", false, false, false, -70, kDecember, 8, 292, 0, 0},
-      {"rise without set: the night stays", true, true, false, 48, 45000, 0, 0, 0, 0},
-  };
-  for (const Row& row : rows) {
-    INFO(row.what);
-    Day day;
-    if (!row.twilight) day.port.twilightBegin.reset(), day.port.twilightEnd.reset();
-    if (!row.riseSet) day.port.sunrise.reset();
-    if (!row.riseSet || !row.sunset) day.port.sunset.reset();
-    day.port.latitude = row.latitude;
-    day.port.predictionDate = row.date;
-    Canvas canvas(300, 200);
-    REQUIRE(DrawControl(day.graph.Get(), canvas) == S_OK);
-    CheckBandRow(canvas, layout, row.dayFrom, row.dayTo, row.twilightFrom, row.twilightTo);
-    CHECK(day.Finish() == S_OK);
-  }
-}
+// Which bands the other combinations of sun events give, and the flat line of a flat
+// scale or a one-point day, are worked out in the native graph suites.
 
 TEST_CASE("labels: margins from the font's measures, value labels left, hour labels at 3, 6, ..., 21") {
   Day day;
@@ -236,38 +203,6 @@ TEST_CASE("feet labels through IUnitsOption keep the margins and change the valu
     if (metres.At(x, kBandRow) != inFeet.At(x, kBandRow)) FAIL("plot differs at x = " << x);
   }
   CHECK(day.Finish() == S_OK);
-}
-
-TEST_CASE("a flat scale and a one-point day draw a flat line at mid-height") {
-  const Layout layout;
-  const int mid = 8 + 184 / 2;
-  SUBCASE("maximum equal to minimum") {
-    Day day;
-    REQUIRE(day.graph->SetScale(0.5, 0.5) == S_OK);
-    Canvas canvas(300, 200);
-    REQUIRE(DrawControl(day.graph.Get(), canvas) == S_OK);
-    for (int k = 0; k < 25; ++k) CHECK(canvas.At(8 + k * 284 / 24, mid) == kCurveColour);
-    CHECK(canvas.Count(kCurveColour, 0, 0, 300, mid - 2) == 0);
-    CHECK(canvas.Count(kCurveColour, 0, mid + 3, 300, 200) == 0);
-    CHECK(day.Finish() == S_OK);
-  }
-  SUBCASE("an automatic scale of a constant day") {
-    Day day(std::vector<double>(25, 1.25));
-    REQUIRE(day.graph->SetScale(0.0, -1.0) == S_OK);  // Max 0: automatic, Min ignored
-    Canvas canvas(300, 200);
-    REQUIRE(DrawControl(day.graph.Get(), canvas) == S_OK);
-    CHECK(canvas.At(150, mid) == kCurveColour);
-    CHECK(canvas.Count(kCurveColour, 0, 0, 300, mid - 2) == 0);
-    CHECK(day.Finish() == S_OK);
-  }
-  SUBCASE("one point") {
-    Day day(std::vector<double>{0.3});
-    Canvas canvas(300, 200);
-    REQUIRE(DrawControl(day.graph.Get(), canvas) == S_OK);
-    CHECK(canvas.Count(kCurveColour, 8, mid, 292, mid + 1) == 284);
-    CHECK(canvas.Count(kCurveColour, 0, 0, 300, mid - 2) == 0);
-    CHECK(day.Finish() == S_OK);
-  }
 }
 
 TEST_CASE("the automatic scale spans the day's lowest and highest heights") {
