@@ -2,6 +2,7 @@
 
 #include <doctest/doctest.h>
 
+#include <array>
 #include <vector>
 
 using namespace br::tides::graph;
@@ -25,30 +26,24 @@ void CheckBand(const Band& band, int left, int right, int colour) {
 
 }  // namespace
 
-TEST_CASE("all four sun events: twilight, then daylight over it") {
-  const std::vector<Band> bands = BackgroundBands(AllFour(), Plain());
-  REQUIRE(bands.size() == 2);
-  CheckBand(bands[0], 8 + 65, 8 + 218, kTwilightColour);  // 05:30 .. 18:30
-  CheckBand(bands[1], 8 + 71, 8 + 213, kDaylightColour);  // 06:00 .. 18:00
-}
-
-TEST_CASE("rise and set without twilight: twilight over the whole plot") {
-  SunEvents e = AllFour();
-  e.twilightBegin.reset();
-  e.twilightEnd.reset();
-  const std::vector<Band> bands = BackgroundBands(e, Plain());
-  REQUIRE(bands.size() == 2);
-  CheckBand(bands[0], 8, 292, kTwilightColour);
-  CheckBand(bands[1], 79, 221, kDaylightColour);
-}
-
-TEST_CASE("twilight without rise and set: only the twilight band") {
-  SunEvents e = AllFour();
-  e.sunrise.reset();
-  e.sunset.reset();
-  const std::vector<Band> bands = BackgroundBands(e, Plain());
-  REQUIRE(bands.size() == 1);
-  CheckBand(bands[0], 73, 226, kTwilightColour);
+TEST_CASE("twilight band, then daylight over it, each from the events there are") {
+  SunEvents noTwilight = AllFour(), noRiseSet = AllFour();
+  noTwilight.twilightBegin.reset();
+  noTwilight.twilightEnd.reset();
+  noRiseSet.sunrise.reset();
+  noRiseSet.sunset.reset();
+  // All four: 05:30 .. 18:30 and 06:00 .. 18:00. Without twilight: twilight over the whole plot.
+  const struct {
+    SunEvents events;
+    std::vector<std::array<int, 3>> bands;  // left, right, colour
+  } cases[] = {{AllFour(), {{8 + 65, 8 + 218, kTwilightColour}, {8 + 71, 8 + 213, kDaylightColour}}},
+               {noTwilight, {{8, 292, kTwilightColour}, {79, 221, kDaylightColour}}},
+               {noRiseSet, {{73, 226, kTwilightColour}}}};
+  for (const auto& c : cases) {
+    const std::vector<Band> bands = BackgroundBands(c.events, Plain());
+    REQUIRE(bands.size() == c.bands.size());
+    for (std::size_t i = 0; i < bands.size(); ++i) CheckBand(bands[i], c.bands[i][0], c.bands[i][1], c.bands[i][2]);
+  }
 }
 
 TEST_CASE("no sun event: daylight all day in the polar summer, else night") {

@@ -25,29 +25,13 @@ TEST_CASE("a mask without conversions prints itself, %% is a literal") {
 }
 
 TEST_CASE("masks that do not fit their kind show the plain value") {
-  // A conversion of another kind.
-  CHECK(formatDoubleCell("%s", 2.5) == "2.5");
-  CHECK(formatDoubleCell("%d", 2.5) == "2.5");
-  CHECK(formatLongCell("%f", 9) == "9");
-  CHECK(formatLongCell("%s", 9) == "9");
-  CHECK(formatTextCell("%d", "abc") == "abc");
-  CHECK(formatTextCell("%f", "abc") == "abc");
-  // More than one conversion, even of the right kind.
-  CHECK(formatTextCell("%s%s", "x") == "x");
-  CHECK(formatDoubleCell("%f %f", 1.0) == "1");
-  // Arguments printf would read that are not there, or a write through %n.
-  CHECK(formatLongCell("%*d", 4) == "4");
-  CHECK(formatDoubleCell("%.*f", 1.5) == "1.5");
-  CHECK(formatLongCell("%n", 1) == "1");
-  // Length modifiers that change the argument's size.
-  CHECK(formatLongCell("%lld", 5) == "5");
-  CHECK(formatLongCell("%ld", 5) == "5");
-  CHECK(formatDoubleCell("%Lf", 5.0) == "5");
-  CHECK(formatTextCell("%ls", "wide") == "wide");
-  // Damaged masks.
-  CHECK(formatLongCell("50%", 50) == "50");
-  CHECK(formatLongCell("%", 1) == "1");
-  CHECK(formatLongCell("%5", 1) == "1");
+  // Conversions of another kind, more than one conversion (even of the right kind), arguments printf
+  // would read that are not there, a write through %n, length modifiers that change the argument's
+  // size, damaged masks.
+  for (const char* mask : {"%s", "%d", "%f %f", "%.*f", "%Lf"}) CHECK_MESSAGE(formatDoubleCell(mask, 2.5) == "2.5", mask);
+  for (const char* mask : {"%f", "%s", "%*d", "%n", "%lld", "%ld", "50%", "%", "%5"})
+    CHECK_MESSAGE(formatLongCell(mask, 9) == "9", mask);
+  for (const char* mask : {"%d", "%f", "%s%s", "%ls"}) CHECK_MESSAGE(formatTextCell(mask, "abc") == "abc", mask);
 }
 
 TEST_CASE("field widths beyond any cell are refused") {
