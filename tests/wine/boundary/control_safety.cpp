@@ -1,7 +1,6 @@
-// No class of the library is marked safe for scripting or for initialisation: the
-// controls read local files and the registry, so a web page must not be able to drive
-// them unasked. Neither IObjectSafety nor the two component categories may appear,
-// whether asked of an instance, of the class keys, or of the component categories manager.
+// No class is marked safe for scripting or initialisation (the controls read local files and
+// the registry): no IObjectSafety on an instance, and neither category in the class keys,
+// the category keys or the component categories manager.
 #include "tests/wine/common/dll_under_test.h"
 
 #include "BR_Info.h"
@@ -18,11 +17,7 @@ using br::test::DllUnderTest;
 
 namespace {
 
-struct NamedClass {
-  const char* name;
-  const CLSID* clsid;
-};
-const NamedClass kClasses[] = {
+const std::pair<const char*, const CLSID*> kClasses[] = {
     {"XObjectInspector", &CLSID_XObjectInspector}, {"TidesDatabase", &CLSID_TidesDatabase},
     {"TidesPort", &CLSID_TidesPort},               {"TidesPortList", &CLSID_TidesPortList},
     {"TidesWindow", &CLSID_TidesWindow},           {"XChartLegend", &CLSID_XChartLegend},
@@ -78,10 +73,10 @@ bool Mentions(const std::vector<std::wstring>& texts, const std::wstring& clsid)
 TEST_CASE("no instance answers IObjectSafety") {
   DllUnderTest dll;
   int created = 0;
-  for (const NamedClass& c : kClasses) {
-    INFO(std::string(c.name));
+  for (const auto& [name, clsid] : kClasses) {
+    INFO(name);
     IUnknown* object = nullptr;
-    if (dll.Create(*c.clsid, IID_IUnknown, reinterpret_cast<void**>(&object)) != S_OK) continue;  // not built yet
+    if (dll.Create(*clsid, IID_IUnknown, reinterpret_cast<void**>(&object)) != S_OK) continue;  // not built yet
     ++created;
     IObjectSafety* safety = reinterpret_cast<IObjectSafety*>(object);  // overwritten by the answer
     CHECK(object->QueryInterface(IID_IObjectSafety, reinterpret_cast<void**>(&safety)) == E_NOINTERFACE);
@@ -100,22 +95,22 @@ TEST_CASE("registered classes carry no safety category, and the categories name 
   const bool haveManager = SUCCEEDED(CoCreateInstance(CLSID_StdComponentCategoriesMgr, nullptr, CLSCTX_INPROC_SERVER,
                                                       IID_ICatInformation, reinterpret_cast<void**>(&categories)));
   int registered = 0;
-  for (const NamedClass& c : kClasses) {
-    INFO(std::string(c.name));
-    const std::wstring clsid = Text(*c.clsid);
+  for (const auto& [name, id] : kClasses) {
+    INFO(name);
+    const std::wstring clsid = Text(*id);
     const std::wstring classKey = L"CLSID\\" + clsid;
     if (!KeyExists(classKey)) continue;
     ++registered;
     for (const CATID* category : kSafetyCategories) {
-      const std::wstring id = Text(*category);
-      CHECK_FALSE(KeyExists(classKey + L"\\Implemented Categories\\" + id));
-      CHECK_FALSE(KeyExists(classKey + L"\\Required Categories\\" + id));
+      const std::wstring catid = Text(*category);
+      CHECK_FALSE(KeyExists(classKey + L"\\Implemented Categories\\" + catid));
+      CHECK_FALSE(KeyExists(classKey + L"\\Required Categories\\" + catid));
       std::vector<std::wstring> texts;
-      CollectTexts(HKEY_CLASSES_ROOT, L"Component Categories\\" + id, texts);
+      CollectTexts(HKEY_CLASSES_ROOT, L"Component Categories\\" + catid, texts);
       CHECK_FALSE(Mentions(texts, clsid));
       if (haveManager) {
         CATID wanted = *category;
-        CHECK(categories->IsClassOfCategories(*c.clsid, 1, &wanted, static_cast<ULONG>(-1), nullptr) != S_OK);
+        CHECK(categories->IsClassOfCategories(*id, 1, &wanted, static_cast<ULONG>(-1), nullptr) != S_OK);
       }
     }
     std::vector<std::wstring> classTexts;

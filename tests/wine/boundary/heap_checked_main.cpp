@@ -1,8 +1,7 @@
-// A doctest main that runs the suite with the heap's free checking on: freed blocks are
-// filled with 0xFEEEFEEE, so a use after free (an object that goes on after its last
-// reference went inside its own call) reads garbage and fails instead of passing by luck.
-// The platform takes the switch from the program's GlobalFlag under Image File Execution
-// Options when a process starts: the first run sets it and runs the suite again as a child.
+// A doctest main with the heap's free checking on, so a use after free (an object going on
+// after its last reference went inside its own call) reads 0xFEEEFEEE and fails. The switch
+// is the program's GlobalFlag under Image File Execution Options, read at process start:
+// the first run sets it and runs the suite again as a child.
 #define DOCTEST_CONFIG_IMPLEMENT
 #include <doctest/doctest.h>
 
