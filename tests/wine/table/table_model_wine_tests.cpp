@@ -20,7 +20,6 @@ TEST_CASE("a table without owner columns shows the default column") {
   CHECK(table.columns().integer(Table::kColumnEditable, 0) == 0);
   CHECK(table.getCurrentRow() == 0);
   CHECK(table.getCurrentColumn() == 0);
-  CHECK(table.getTableStyle() == 0x40F);
   CHECK(table.columns().columnName(Table::kColumnVisible) == "Column visible");
 
   // Rows can go into the default column too.

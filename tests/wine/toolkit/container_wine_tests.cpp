@@ -250,7 +250,7 @@ TEST_CASE("setPalette takes one-dimensional arrays of 20 four-byte elements from
   Palette::reset();
 }
 
-TEST_CASE("a container lends its font to its children, who never delete it") {
+TEST_CASE("a container lends its font (own, lent or an OLE font) down the tree; children never delete it") {
   HostWindow host;
   Panel root;
   auto* inner = new Panel;
@@ -266,6 +266,20 @@ TEST_CASE("a container lends its font to its children, who never delete it") {
   CHECK(leaf.getFont() == lent);
   CHECK(deep.getFont() == lent);
   CHECK(reinterpret_cast<HFONT>(SendMessageA(deep.getHandle(), WM_GETFONT, 0, 0)) == lent);
+
+  // An OLE font object goes down the whole tree as well; a null one is ignored.
+  FONTDESC desc{sizeof(FONTDESC), const_cast<LPOLESTR>(L"Arial"), {{90000, 0}}, FW_BOLD, ANSI_CHARSET,
+                FALSE, FALSE, FALSE};
+  IFont* font = nullptr;
+  REQUIRE(SUCCEEDED(OleCreateFontIndirect(&desc, IID_IFont, reinterpret_cast<void**>(&font))));
+  HFONT hfont = nullptr;
+  REQUIRE(SUCCEEDED(font->get_hFont(&hfont)));
+  root.setFontObject(font);
+  CHECK(root.getFont() == hfont);
+  CHECK(inner->getFont() == hfont);
+  CHECK(deep.getFont() == hfont);
+  root.setFontObject(nullptr);
+  CHECK(deep.getFont() == hfont);
   root.removeComponent(inner, true);
   CHECK(GetObjectType(lent) == OBJ_FONT);
 
@@ -285,30 +299,6 @@ TEST_CASE("a container lends its font to its children, who never delete it") {
   root.removeComponent(&leaf, false);
   root.removeComponent(&late, false);
   DeleteObject(lent);
-}
-
-TEST_CASE("an OLE font object is lent down the whole tree") {
-  HostWindow host;
-  Panel root;
-  Panel inner;
-  Probe leaf;
-  root.add(&inner);
-  inner.add(&leaf);
-  REQUIRE(root.create(host.hwnd()));
-  FONTDESC desc{sizeof(FONTDESC), const_cast<LPOLESTR>(L"Arial"), {{90000, 0}}, FW_BOLD, ANSI_CHARSET,
-                FALSE, FALSE, FALSE};
-  IFont* font = nullptr;
-  REQUIRE(SUCCEEDED(OleCreateFontIndirect(&desc, IID_IFont, reinterpret_cast<void**>(&font))));
-  HFONT hfont = nullptr;
-  REQUIRE(SUCCEEDED(font->get_hFont(&hfont)));
-  root.setFontObject(font);
-  CHECK(root.getFont() == hfont);
-  CHECK(inner.getFont() == hfont);
-  CHECK(leaf.getFont() == hfont);
-  root.setFontObject(nullptr);  // ignored
-  CHECK(leaf.getFont() == hfont);
-  inner.removeComponent(&leaf, false);
-  root.removeComponent(&inner, false);
   font->Release();
 }
 

@@ -40,37 +40,11 @@ int charX(HWND h, const std::string& text, int index) {
 
 }  // namespace
 
-TEST_CASE("latitude edit: -12.5 shows 12\xB0" "30.000'S and n at the hemisphere makes it N") {
-  EditBench b;
-  REQUIRE(b.edit.setEditType(kEditLatitude));
-  REQUIRE(b.edit.setValue(-12.5));
-  CHECK(b.edit.getText() == "12\xB0" "30.000'S");
-  key(b.h, VK_END);
-  CHECK(b.edit.getCaret() == 10);
-  typeChar(b.h, 'n');
-  CHECK(b.edit.getText() == "12\xB0" "30.000'N");
-  CHECK(b.edit.getValue() == doctest::Approx(12.5));
-  CHECK(b.bubbled(kEventChar) == 0);  // taken
-  typeChar(b.h, 'x');
-  CHECK(b.bubbled(kEventChar) == 1);  // refused: goes on to the parent
-  CHECK(b.bubbled(kEventKeyDown) == 0);
-
-  // Digits, with the caret skipping the degree sign; Backspace resets a digit.
-  key(b.h, VK_HOME);
-  typeText(b.h, "0456");
-  CHECK(b.edit.getText() == "04\xB0" "56.000'N");
-  key(b.h, VK_LEFT);
-  key(b.h, VK_BACK);
-  CHECK(b.edit.getText() == "04\xB0" "50.000'N");
-  key(b.h, VK_DELETE);
-  CHECK(b.edit.getText() == "04\xB0" "50.000'N");  // the caret did not move: still the same digit, now 0
-  CHECK(b.edit.getCaret() == 4);
-}
-
-TEST_CASE("characters typed into each numeric type reach its model; refused ones bubble") {
+TEST_CASE("characters typed into each type reach its model; refused ones bubble, its keys do not") {
   // type, mask, limit, start value (NaN: none), End first, characters, text, characters that bubbled
   struct Row { int type; const char* mask; int limit; double value; bool end; const char *typed, *text; int bubbled; };
   const Row rows[] = {
+      {kEditLatitude, nullptr, 0, -12.5, true, "nx", "12\xB0" "30.000'N", 1},  // 'n' taken, 'x' refused
       {kEditLongitude, nullptr, 0, -4.0875, false, "17N", "174\xB0" "05.250'W", 1},
       {kEditDecimal, nullptr, 0, 3.14159, true, ".5", "3.14165", 1},
       {kEditInteger, nullptr, 6, NAN, false, "1234567-", "123456", 2},
