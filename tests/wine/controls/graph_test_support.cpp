@@ -13,22 +13,15 @@ std::vector<COLORREF> InitialPalette() {
           0x00FF00, 0x00FFFF, 0xFF0000, 0xFFFF00, 0xFF00FF, 0xFFFFFF, 0x000000, 0x808080, 0xA4A0A0, 0xF0FBFF};
 }
 
-VARIANT PaletteVariant(const std::vector<COLORREF>& values, VARTYPE vt, LONG lowerBound) {
-  SAFEARRAYBOUND bound{static_cast<ULONG>(values.size()), lowerBound};
-  SAFEARRAY* array = SafeArrayCreate(vt, 1, &bound);
-  for (std::size_t i = 0; i < values.size(); ++i) {
-    LONG index = lowerBound + static_cast<LONG>(i);
-    if (vt == VT_I2) {
-      SHORT v = static_cast<SHORT>(values[i]);
-      SafeArrayPutElement(array, &index, &v);
-    } else {
-      LONG v = static_cast<LONG>(values[i]);
-      SafeArrayPutElement(array, &index, &v);
-    }
+VARIANT PaletteVariant(const std::vector<COLORREF>& values) {
+  SAFEARRAY* array = SafeArrayCreateVector(VT_I4, 0, static_cast<ULONG>(values.size()));
+  for (LONG i = 0; i < static_cast<LONG>(values.size()); ++i) {
+    LONG v = static_cast<LONG>(values[static_cast<std::size_t>(i)]);
+    SafeArrayPutElement(array, &i, &v);
   }
   VARIANT variant;
   VariantInit(&variant);
-  variant.vt = static_cast<VARTYPE>(VT_ARRAY | vt);
+  variant.vt = VT_ARRAY | VT_I4;
   variant.parray = array;
   return variant;
 }

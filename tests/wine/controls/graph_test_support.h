@@ -24,9 +24,8 @@ constexpr COLORREF kCurveColour = RGB(0x00, 0xFF, 0x00);  // index 10
 
 // The palette the library starts with.
 std::vector<COLORREF> InitialPalette();
-// A VARIANT (VT_ARRAY | vt) holding the values with the given lower bound; the caller
-// clears it.
-VARIANT PaletteVariant(const std::vector<COLORREF>& values, VARTYPE vt = VT_I4, LONG lowerBound = 0);
+// A VARIANT (VT_ARRAY | VT_I4) holding the values from index 0; the caller clears it.
+VARIANT PaletteVariant(const std::vector<COLORREF>& values);
 
 // 25 hourly heights between 0.5 and 1.0 (a cosine with the M2 period).
 std::vector<double> CosineDay();

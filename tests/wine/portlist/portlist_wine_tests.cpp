@@ -20,22 +20,18 @@ using namespace br::test;
 
 namespace {
 
-SAFEARRAY* UnknownArray(const std::vector<IUnknown*>& items, LONG lower = 0) {
-  SAFEARRAYBOUND bound{static_cast<ULONG>(items.size()), lower};
-  SAFEARRAY* array = SafeArrayCreate(VT_UNKNOWN, 1, &bound);
-  for (LONG i = 0; i < static_cast<LONG>(items.size()); ++i) {
-    LONG index = lower + i;
-    SafeArrayPutElement(array, &index, items[i]);
-  }
-  return array;
-}
-
-VARIANT ArrayVariant(SAFEARRAY* array) {
+// Hands the list an array of the items (VT_ARRAY | VT_UNKNOWN), as a caller's array that
+// it destroys afterwards.
+HRESULT SetPorts(ITidesPortList* list, const std::vector<IUnknown*>& items) {
+  SAFEARRAY* array = SafeArrayCreateVector(VT_UNKNOWN, 0, static_cast<ULONG>(items.size()));
+  for (LONG i = 0; i < static_cast<LONG>(items.size()); ++i) SafeArrayPutElement(array, &i, items[i]);
   VARIANT v;
   VariantInit(&v);
   v.vt = VT_ARRAY | VT_UNKNOWN;
   v.parray = array;
-  return v;
+  const HRESULT hr = list->SetPortList(v);
+  SafeArrayDestroy(array);
+  return hr;
 }
 
 VARIANT UnknownVariant(IUnknown* item) {
@@ -134,9 +130,7 @@ TEST_CASE("three ports in a window: shown by name, the first selected and fired 
   FakeTidesPort havre(L"Le Havre"), anvers(L"Anvers"), brest(L"Brest");
   PortList p;
   p.Host();
-  SAFEARRAY* array = UnknownArray({&havre, &anvers, &brest});
-  CHECK(p.list->SetPortList(ArrayVariant(array)) == S_OK);
-  SafeArrayDestroy(array);
+  CHECK(SetPorts(p.list, {&havre, &anvers, &brest}) == S_OK);
   REQUIRE(p.names.size() == 1);
   CHECK(p.names[0] == L"Anvers");
   CHECK(p.sink.lastId == 1);
@@ -183,9 +177,7 @@ TEST_CASE("a single port shows one row and fires once; entries that are no ports
   p.Click(1);  // no second row
   CHECK(p.names.size() == 1);
 
-  SAFEARRAY* array = UnknownArray({&havre, &stranger, nullptr, &brest});
-  CHECK(p.list->SetPortList(ArrayVariant(array)) == S_OK);
-  SafeArrayDestroy(array);
+  CHECK(SetPorts(p.list, {&havre, &stranger, nullptr, &brest}) == S_OK);
   CHECK(stranger.References() == 1);  // kept, though not shown
   REQUIRE(p.names.size() == 2);
   CHECK(p.names[1] == L"Brest");
@@ -200,9 +192,7 @@ TEST_CASE("a single port shows one row and fires once; entries that are no ports
 TEST_CASE("ports set before the window fill the table when it is made") {
   FakeTidesPort havre(L"Le Havre"), anvers(L"Anvers");
   PortList p;
-  SAFEARRAY* array = UnknownArray({&havre, &anvers});
-  p.list->SetPortList(ArrayVariant(array));
-  SafeArrayDestroy(array);
+  SetPorts(p.list, {&havre, &anvers});
   CHECK(p.names.empty());
   p.Host();
   REQUIRE(p.names.size() == 1);
@@ -216,9 +206,7 @@ TEST_CASE("navigation keys given to the accelerator translation reach the focuse
   FakeTidesPort havre(L"Le Havre"), anvers(L"Anvers"), brest(L"Brest");
   PortList p;
   p.Host();
-  SAFEARRAY* array = UnknownArray({&havre, &anvers, &brest});
-  p.list->SetPortList(ArrayVariant(array));
-  SafeArrayDestroy(array);
+  SetPorts(p.list, {&havre, &anvers, &brest});
   SetFocus(p.table);
   IOleInPlaceActiveObject* active = nullptr;
   REQUIRE(p.list->QueryInterface(IID_IOleInPlaceActiveObject, reinterpret_cast<void**>(&active)) == S_OK);
