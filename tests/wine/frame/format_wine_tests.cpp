@@ -25,7 +25,6 @@ TEST_CASE("dates and times use the fixed patterns whatever the locale's own form
   CHECK(FormatDate(afternoon) == "05.03.2024");
   CHECK(FormatTime(afternoon) == "14:07");
   CHECK(FormatDate(afternoon, MONTH_PATTERN) == "03-2024");
-  CHECK(FormatTime(MakeTime(1999, 12, 31, 23, 59)) == "23:59");
   CHECK(FormatTime(MakeTime(2000, 1, 1, 0, 5)) == "00:05");
   CHECK(FormatDate(MakeTime(1601, 1, 1, 0, 0)) == "01.01.1601");
 }
