@@ -26,12 +26,6 @@ void registerOnce(const char* name, WNDPROC proc) {
   RegisterClassExA(&wc);
 }
 
-Seen record(const ToolkitEvent& e) {
-  Seen s{e.id, e.source, e.hwnd, {}, e.keyState};
-  for (int i = 0; i < 7; ++i) s.params[i] = e.params[i];
-  return s;
-}
-
 }  // namespace
 
 RECT placed(HWND hwnd) {
@@ -49,7 +43,7 @@ Probe::~Probe() {
 }
 
 int Probe::dispatchEvent(ToolkitEvent& event) {
-  seen.push_back(record(event));
+  seen.push_back(wtest::recordOf(event));
   return cXComponent::dispatchEvent(event);
 }
 
@@ -74,19 +68,12 @@ std::vector<int> Probe::ids() const {
   return out;
 }
 
-const Seen* Probe::last(int id) const {
-  for (auto it = seen.rbegin(); it != seen.rend(); ++it) {
-    if (it->id == id) return &*it;
-  }
-  return nullptr;
-}
-
 ProbePanel::ProbePanel(std::unique_ptr<Layout> layout) {
   setLayout(layout ? std::move(layout) : std::make_unique<BorderLayout>());
 }
 
 int ProbePanel::dispatchEvent(ToolkitEvent& event) {
-  seen.push_back(record(event));
+  seen.push_back(wtest::recordOf(event));
   return Container::dispatchEvent(event);
 }
 

@@ -22,13 +22,7 @@ RECT placed(const toolkit::cXComponent& component);
 using wtest::str;
 using wtest::xywh;
 
-struct Seen {
-  int id;
-  toolkit::cXComponent* source;
-  HWND hwnd;
-  std::intptr_t params[7];
-  int keyState;
-};
+using wtest::Seen;
 
 // A component that records every event dispatched to it and answers chosen
 // handlers with chosen values.
@@ -52,7 +46,7 @@ public:
   int onNotify(toolkit::ToolkitEvent& event) override { return react(event); }
 
   std::vector<int> ids() const;
-  const Seen* last(int id) const;
+  const Seen* last(int id) const { return wtest::lastOf(seen, id); }
 
 private:
   int react(toolkit::ToolkitEvent& event);

@@ -45,10 +45,14 @@ void pump(int ms) {
 
 RecordingPanel::RecordingPanel() = default;
 
-int RecordingPanel::dispatchEvent(toolkit::ToolkitEvent& event) {
-  Seen s{event.id, event.source, {}};
+Seen recordOf(const toolkit::ToolkitEvent& event) {
+  Seen s{event.id, event.source, event.hwnd, {}, event.keyState};
   for (int i = 0; i < 7; ++i) s.params[i] = event.params[i];
-  seen.push_back(s);
+  return s;
+}
+
+int RecordingPanel::dispatchEvent(toolkit::ToolkitEvent& event) {
+  seen.push_back(recordOf(event));
   if (event.source == this) return Container::dispatchEvent(event);
   return answer;
 }
@@ -59,7 +63,7 @@ int RecordingPanel::count(int id) const {
   return n;
 }
 
-const Seen* RecordingPanel::last(int id) const {
+const Seen* lastOf(const std::vector<Seen>& seen, int id) {
   for (auto it = seen.rbegin(); it != seen.rend(); ++it) {
     if (it->id == id) return &*it;
   }

@@ -27,11 +27,17 @@ private:
 
 void pump(int ms);
 
+// An event as it reached a recording component.
 struct Seen {
   int id;
   toolkit::cXComponent* source;
+  HWND hwnd;
   std::intptr_t params[7];
+  int keyState;
 };
+Seen recordOf(const toolkit::ToolkitEvent& event);
+// The last of `seen` with that id, or null.
+const Seen* lastOf(const std::vector<Seen>& seen, int id);
 
 // A container that records every event reaching its dispatchEvent, and answers
 // them with `answer`.
@@ -42,7 +48,7 @@ public:
   int answer = 0;
   int dispatchEvent(toolkit::ToolkitEvent& event) override;
   int count(int id) const;
-  const Seen* last(int id) const;
+  const Seen* last(int id) const { return lastOf(seen, id); }
 };
 
 // The panel made a window inside `host`, filling it.
