@@ -3,7 +3,6 @@
 // of another make that answer NaN, infinities, absurd counts or failures; NaN and infinite
 // scales and days; late bound. A refused call leaves the properties and the picture alone.
 #include "tests/wine/boundary/boundary_support.h"
-#include "tests/wine/boundary/foreign_port.h"
 
 #include "BR_Private.h"
 

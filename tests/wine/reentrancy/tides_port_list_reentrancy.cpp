@@ -3,7 +3,6 @@
 // Selected, disconnect, and close the host and let the control go while the table is still
 // inside its own selection. Run with the heap's free checking on.
 #include "tests/wine/boundary/boundary_support.h"
-#include "tests/wine/boundary/foreign_port.h"
 
 using namespace br::test;
 using namespace br::test::boundary;
