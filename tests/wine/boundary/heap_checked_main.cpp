@@ -28,17 +28,10 @@ bool FreeCheckingOn() {
 bool SetGlobalFlagForThisProgram() {
   wchar_t path[MAX_PATH] = {};
   GetModuleFileNameW(nullptr, path, MAX_PATH);
-  std::wstring name(path);
-  name = name.substr(name.find_last_of(L"\\/") + 1);
-  const std::wstring key = L"Software\\Microsoft\\Windows NT\\CurrentVersion\\Image File Execution Options\\" + name;
-  HKEY handle = nullptr;
-  if (RegCreateKeyExW(HKEY_LOCAL_MACHINE, key.c_str(), 0, nullptr, 0, KEY_SET_VALUE, nullptr, &handle, nullptr) !=
-      ERROR_SUCCESS)
-    return false;
-  const LONG set = RegSetValueExW(handle, L"GlobalFlag", 0, REG_DWORD, reinterpret_cast<const BYTE*>(&kHeapFlags),
-                                  sizeof kHeapFlags);
-  RegCloseKey(handle);
-  return set == ERROR_SUCCESS;
+  const std::wstring name(path), key = L"Software\\Microsoft\\Windows NT\\CurrentVersion\\Image File Execution Options\\" +
+                                         name.substr(name.find_last_of(L"\\/") + 1);
+  return RegSetKeyValueW(HKEY_LOCAL_MACHINE, key.c_str(), L"GlobalFlag", REG_DWORD, &kHeapFlags, sizeof kHeapFlags) ==
+         ERROR_SUCCESS;
 }
 
 // Runs this program again with the same command line; its exit code, or -1.

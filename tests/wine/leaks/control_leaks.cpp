@@ -17,29 +17,21 @@ using namespace br::test::boundary;
 namespace {
 
 // GDI objects of the process: GetGuiResources, or where Wine leaves that unimplemented, the
-// live entries of the GDI handle table the PEB points to (Wine's GDI_HANDLE_ENTRY layout).
+// live entries of the GDI handle table the PEB points to (16384 GDI_HANDLE_ENTRY of 24 bytes
+// as Wine lays them out, the type byte at offset 14 zero in a free one).
 long GdiObjects() {
   SetLastError(0);
   const DWORD counted = GetGuiResources(GetCurrentProcess(), GR_GDIOBJECTS);
   if (counted != 0 || GetLastError() != ERROR_CALL_NOT_IMPLEMENTED) return static_cast<long>(counted);
-  struct Entry {
-    std::uint64_t object;
-    std::uint32_t owner;
-    std::uint16_t unique;
-    std::uint8_t type;  // zero: a free entry
-    std::uint8_t flags;
-    std::uint64_t user;
-  };
-  static_assert(sizeof(Entry) == 24, "GDI handle table entry layout");
   PROCESS_BASIC_INFORMATION basic = {};
   if (NtQueryInformationProcess(GetCurrentProcess(), ProcessBasicInformation, &basic, sizeof basic, nullptr) != 0 ||
       !basic.PebBaseAddress)
     return -1;
   const auto* peb = reinterpret_cast<const std::uint8_t*>(basic.PebBaseAddress);
-  const auto* table = *reinterpret_cast<const Entry* const*>(peb + (sizeof(void*) == 8 ? 0xF8 : 0x94));
+  const auto* table = *reinterpret_cast<const std::uint8_t* const*>(peb + (sizeof(void*) == 8 ? 0xF8 : 0x94));
   if (!table) return -1;
   long live = 0;
-  for (std::size_t i = 0; i < 16384; ++i) live += table[i].type != 0;
+  for (std::size_t i = 0; i < 16384; ++i) live += table[24 * i + 14] != 0;
   return live;
 }
 
