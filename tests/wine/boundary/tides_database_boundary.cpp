@@ -34,11 +34,7 @@ HRESULT InitializeWith(ITidesDatabase* db, const std::wstring& folder) {
 }
 
 long PortCount(const VARIANT& list) {
-  if (list.vt != (VT_ARRAY | VT_UNKNOWN)) return -1;
-  LONG lower = 0, upper = -1;
-  SafeArrayGetLBound(list.parray, 1, &lower);
-  SafeArrayGetUBound(list.parray, 1, &upper);
-  return upper - lower + 1;
+  return list.vt == (VT_ARRAY | VT_UNKNOWN) ? static_cast<long>(list.parray->rgsabound[0].cElements) : -1;
 }
 
 }  // namespace
