@@ -53,4 +53,23 @@ HRESULT DllUnderTest::Create(REFCLSID clsid, REFIID riid, void** out) const {
   return hr;
 }
 
+ITidesDatabase* OpenedDatabase(const DllUnderTest& dll, const std::wstring& folder) {
+  ITidesDatabase* database = nullptr;
+  REQUIRE(dll.Create(CLSID_TidesDatabase, &database) == S_OK);
+  BSTR path = SysAllocString(folder.c_str());
+  const HRESULT opened = database->Initialize(path);
+  SysFreeString(path);
+  REQUIRE(opened == S_OK);
+  return database;
+}
+
+ITidesPort* PortAt(ITidesDatabase* database, long index) {
+  IUnknown* unknown = nullptr;
+  REQUIRE(database->GetPort(index, &unknown) == S_OK);
+  REQUIRE(unknown != nullptr);
+  ITidesPort* port = Query<ITidesPort>(unknown);
+  unknown->Release();
+  return port;
+}
+
 }  // namespace br::test

@@ -6,7 +6,11 @@
 #include <windows.h>
 #include <objbase.h>
 
+#include <doctest/doctest.h>
+
 #include <string>
+
+#include "BR_Info.h"
 
 namespace br::test {
 
@@ -47,6 +51,20 @@ private:
   Entry0 registerServer_ = nullptr;
   Entry0 unregisterServer_ = nullptr;
 };
+
+// A TidesDatabase of the loaded DLL opened on a station folder, and one of its ports as
+// ITidesPort (both REQUIREd; the caller releases them).
+ITidesDatabase* OpenedDatabase(const DllUnderTest& dll, const std::wstring& folder);
+ITidesPort* PortAt(ITidesDatabase* database, long index);
+
+// The interface I of an object: a new reference, REQUIREd.
+template <class I>
+I* Query(IUnknown* object) {
+  I* face = nullptr;
+  REQUIRE(object->QueryInterface(__uuidof(I), reinterpret_cast<void**>(&face)) == S_OK);
+  REQUIRE(face != nullptr);
+  return face;
+}
 
 // Releases an interface pointer and nulls it.
 template <class I>

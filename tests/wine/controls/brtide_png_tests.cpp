@@ -74,7 +74,9 @@ TEST_CASE("brtide day --png writes the TidesWindow picture of the day") {
 
   // The same day drawn by the control directly.
   DllUnderTest dll;
-  IUnknown* port = FirstPort(dll, folder.Path());
+  ITidesDatabase* database = OpenedDatabase(dll, folder.Path());
+  ITidesPort* port = PortAt(database, 0);
+  database->Release();
   GraphControl graph(dll);
   REQUIRE(graph->SetPort(port) == S_OK);
   REQUIRE(graph->Calculate(1.0, 45098.0) == S_OK);  // 2023-06-21

@@ -9,14 +9,6 @@ using namespace br::test;
 
 namespace {
 
-template <class I>
-I* Query(IUnknown* object, REFIID riid) {
-  I* face = nullptr;
-  REQUIRE(object->QueryInterface(riid, reinterpret_cast<void**>(&face)) == S_OK);
-  REQUIRE(face != nullptr);
-  return face;
-}
-
 SIZEL ScreenHimetric(int width, int height) {
   HDC screen = GetDC(nullptr);
   const int x = GetDeviceCaps(screen, LOGPIXELSX);
@@ -37,12 +29,12 @@ TEST_CASE("a control answers every control interface, one object behind them all
                            &IID_IConnectionPointContainer, &IID_ISpecifyPropertyPages, &IID_IQuickActivate,
                            &IID_IPersistStorage, &IID_IDataObject, &IID_IProvideClassInfo,
                            &IID_IProvideClassInfo2, &IID_IEmbeddedControl, &IID_IUnitsOption};
-  IUnknown* identity = Query<IUnknown>(graph.Get(), IID_IUnknown);
+  IUnknown* identity = Query<IUnknown>(graph.Get());
   for (const IID* iid : answered) {
     IUnknown* face = nullptr;
     CHECK(graph->QueryInterface(*iid, reinterpret_cast<void**>(&face)) == S_OK);
     REQUIRE(face != nullptr);
-    IUnknown* back = Query<IUnknown>(face, IID_IUnknown);
+    IUnknown* back = Query<IUnknown>(face);
     CHECK(back == identity);
     back->Release();
     face->Release();
@@ -53,7 +45,7 @@ TEST_CASE("a control answers every control interface, one object behind them all
   CHECK(graph->QueryInterface(IID_IPersistPropertyBag, reinterpret_cast<void**>(&none)) == E_NOINTERFACE);
   CHECK(none == nullptr);
 
-  IProvideClassInfo2* info = Query<IProvideClassInfo2>(graph.Get(), IID_IProvideClassInfo2);
+  IProvideClassInfo2* info = Query<IProvideClassInfo2>(graph.Get());
   GUID events{};
   CHECK(info->GetGUID(GUIDKIND_DEFAULT_SOURCE_DISP_IID, &events) == S_OK);
   CHECK(IsEqualGUID(events, DIID__ITidesWindowEvents));
@@ -65,7 +57,7 @@ TEST_CASE("a control answers every control interface, one object behind them all
 TEST_CASE("status, class, extent and property pages") {
   DllUnderTest dll;
   GraphControl graph(dll);
-  IOleObject* ole = Query<IOleObject>(graph.Get(), IID_IOleObject);
+  IOleObject* ole = Query<IOleObject>(graph.Get());
   DWORD status = 0;
   CHECK(ole->GetMiscStatus(DVASPECT_CONTENT, &status) == S_OK);
   CHECK(status == 131473);
@@ -88,14 +80,14 @@ TEST_CASE("status, class, extent and property pages") {
   CHECK(ole->GetExtent(DVASPECT_ICON, &extent) == DV_E_DVASPECT);
   SIZEL wanted{5000, 4000};
   CHECK(ole->SetExtent(DVASPECT_CONTENT, &wanted) == S_OK);
-  IViewObject2* view = Query<IViewObject2>(graph.Get(), IID_IViewObject2);
+  IViewObject2* view = Query<IViewObject2>(graph.Get());
   CHECK(view->GetExtent(DVASPECT_CONTENT, -1, nullptr, &extent) == S_OK);
   CHECK(extent.cx == 5000);
   CHECK(extent.cy == 4000);
   view->Release();
   ole->Release();
 
-  ISpecifyPropertyPages* pages = Query<ISpecifyPropertyPages>(graph.Get(), IID_ISpecifyPropertyPages);
+  ISpecifyPropertyPages* pages = Query<ISpecifyPropertyPages>(graph.Get());
   CAUUID list{7, reinterpret_cast<GUID*>(1)};
   CHECK(pages->GetPages(&list) == S_OK);
   CHECK(list.cElems == 0);
@@ -108,7 +100,7 @@ TEST_CASE("status, class, extent and property pages") {
 TEST_CASE("IViewObject::Draw refuses what it cannot draw on") {
   DllUnderTest dll;
   GraphControl graph(dll);
-  IViewObjectEx* view = Query<IViewObjectEx>(graph.Get(), IID_IViewObjectEx);
+  IViewObjectEx* view = Query<IViewObjectEx>(graph.Get());
   Canvas canvas(50, 50);
   const RECTL bounds{0, 0, 50, 50};
   CHECK(view->Draw(DVASPECT_CONTENT, -1, nullptr, nullptr, nullptr, nullptr, &bounds, nullptr, nullptr, 0) ==
@@ -139,12 +131,12 @@ TEST_CASE("the saved state carries the extent through a stream and a storage") {
   DllUnderTest dll;
   GraphControl first(dll);
   GraphControl second(dll);
-  IOleObject* ole = Query<IOleObject>(first.Get(), IID_IOleObject);
+  IOleObject* ole = Query<IOleObject>(first.Get());
   SIZEL wanted{6123, 3456};
   REQUIRE(ole->SetExtent(DVASPECT_CONTENT, &wanted) == S_OK);
   ole->Release();
 
-  IPersistStreamInit* saver = Query<IPersistStreamInit>(first.Get(), IID_IPersistStreamInit);
+  IPersistStreamInit* saver = Query<IPersistStreamInit>(first.Get());
   CHECK(saver->IsDirty() == S_OK);
   ULARGE_INTEGER size{};
   CHECK(saver->GetSizeMax(&size) == S_OK);
@@ -158,7 +150,7 @@ TEST_CASE("the saved state carries the extent through a stream and a storage") {
   CHECK(IsEqualCLSID(clsid, CLSID_TidesWindow));
   saver->Release();
 
-  IPersistStreamInit* loader = Query<IPersistStreamInit>(second.Get(), IID_IPersistStreamInit);
+  IPersistStreamInit* loader = Query<IPersistStreamInit>(second.Get());
   CHECK(loader->InitNew() == S_OK);
   LARGE_INTEGER start{};
   stream->Seek(start, STREAM_SEEK_SET, nullptr);
@@ -175,7 +167,7 @@ TEST_CASE("the saved state carries the extent through a stream and a storage") {
   CHECK(loader->Load(nullptr) == E_POINTER);
   loader->Release();
   stream->Release();
-  IOleObject* secondOle = Query<IOleObject>(second.Get(), IID_IOleObject);
+  IOleObject* secondOle = Query<IOleObject>(second.Get());
   SIZEL extent{};
   CHECK(secondOle->GetExtent(DVASPECT_CONTENT, &extent) == S_OK);
   CHECK(extent.cx == 6123);
@@ -187,16 +179,16 @@ TEST_CASE("the saved state carries the extent through a stream and a storage") {
   IStorage* storage = nullptr;
   REQUIRE(StgCreateDocfileOnILockBytes(bytesOnMemory, STGM_CREATE | STGM_READWRITE | STGM_SHARE_EXCLUSIVE, 0,
                                        &storage) == S_OK);
-  IPersistStorage* storageSaver = Query<IPersistStorage>(second.Get(), IID_IPersistStorage);
+  IPersistStorage* storageSaver = Query<IPersistStorage>(second.Get());
   CHECK(storageSaver->Save(storage, FALSE) == S_OK);
   CHECK(storageSaver->SaveCompleted(nullptr) == S_OK);
   storageSaver->Release();
   GraphControl third(dll);
-  IPersistStorage* storageLoader = Query<IPersistStorage>(third.Get(), IID_IPersistStorage);
+  IPersistStorage* storageLoader = Query<IPersistStorage>(third.Get());
   CHECK(storageLoader->Load(storage) == S_OK);
   CHECK(storageLoader->Load(nullptr) == E_POINTER);
   storageLoader->Release();
-  IOleObject* thirdOle = Query<IOleObject>(third.Get(), IID_IOleObject);
+  IOleObject* thirdOle = Query<IOleObject>(third.Get());
   CHECK(thirdOle->GetExtent(DVASPECT_CONTENT, &extent) == S_OK);
   CHECK(extent.cx == 6123);
   thirdOle->Release();
@@ -212,7 +204,7 @@ TEST_CASE("the saved state carries the extent through a stream and a storage") {
 TEST_CASE("the data object gives the picture as an enhanced metafile and a metafile picture") {
   DllUnderTest dll;
   GraphControl graph(dll);
-  IDataObject* data = Query<IDataObject>(graph.Get(), IID_IDataObject);
+  IDataObject* data = Query<IDataObject>(graph.Get());
   FORMATETC enhanced{CF_ENHMETAFILE, nullptr, DVASPECT_CONTENT, -1, TYMED_ENHMF};
   FORMATETC picture{CF_METAFILEPICT, nullptr, DVASPECT_CONTENT, -1, TYMED_MFPICT};
   FORMATETC text{CF_TEXT, nullptr, DVASPECT_CONTENT, -1, TYMED_HGLOBAL};
@@ -261,7 +253,7 @@ TEST_CASE("quick activation takes the site and connects the event sink") {
   DllUnderTest dll;
   EventSink sink(DIID__ITidesWindowEvents);
   GraphControl graph(dll);
-  IQuickActivate* quick = Query<IQuickActivate>(graph.Get(), IID_IQuickActivate);
+  IQuickActivate* quick = Query<IQuickActivate>(graph.Get());
   QACONTAINER container{};
   container.cbSize = sizeof(container);
   container.pUnkEventSink = static_cast<IDispatch*>(&sink);
@@ -279,7 +271,7 @@ TEST_CASE("quick activation takes the site and connects the event sink") {
   tooSmall.cbSize = 8;
   CHECK(quick->QuickActivate(&container, &tooSmall) == E_INVALIDARG);
 
-  IConnectionPointContainer* points = Query<IConnectionPointContainer>(graph.Get(), IID_IConnectionPointContainer);
+  IConnectionPointContainer* points = Query<IConnectionPointContainer>(graph.Get());
   IConnectionPoint* point = nullptr;
   REQUIRE(points->FindConnectionPoint(DIID__ITidesWindowEvents, &point) == S_OK);
   CHECK(point->Unadvise(control.dwEventCookie) == S_OK);

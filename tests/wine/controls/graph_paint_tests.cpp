@@ -175,8 +175,7 @@ TEST_CASE("feet labels through IUnitsOption keep the margins and change the valu
   REQUIRE(day.graph.SetDrawText(1) == S_OK);
   REQUIRE(day.graph.SetFormat(L"%.0f") == S_OK);
   REQUIRE(day.graph->SetScale(10.0, 0.0) == S_OK);
-  IUnitsOption* units = nullptr;
-  REQUIRE(day.graph->QueryInterface(IID_IUnitsOption, reinterpret_cast<void**>(&units)) == S_OK);
+  IUnitsOption* units = Query<IUnitsOption>(day.graph.Get());
   CHECK(units->SetOption(12345) == S_OK);
 
   Canvas metres(300, 200);

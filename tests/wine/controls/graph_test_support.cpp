@@ -78,19 +78,6 @@ void CheckBandRow(const Canvas& canvas, const Layout& layout, int y, int dayFrom
   CHECK(wrong == 0);
 }
 
-IUnknown* FirstPort(const DllUnderTest& dll, const std::wstring& folder) {
-  ITidesDatabase* database = nullptr;
-  REQUIRE(dll.Create(CLSID_TidesDatabase, &database) == S_OK);
-  BSTR path = SysAllocString(folder.c_str());
-  const HRESULT opened = database->Initialize(path);
-  SysFreeString(path);
-  IUnknown* port = nullptr;
-  if (opened == S_OK) database->GetPort(0, &port);
-  database->Release();
-  REQUIRE(port != nullptr);
-  return port;
-}
-
 GraphControl::GraphControl(const DllUnderTest& dll) {
   REQUIRE(dll.Create(CLSID_TidesWindow, &window_) == S_OK);
 }

@@ -57,10 +57,6 @@ Layout LabelledLayout(HFONT font, const char* high, const char* low);
 void CheckBandRow(const Canvas& canvas, const Layout& layout, int y, int dayFrom, int dayTo, int twilightFrom,
                   int twilightTo);
 
-// Port 0 of a station folder from the built DLL's TidesDatabase (released again); the
-// caller releases the port.
-IUnknown* FirstPort(const DllUnderTest& dll, const std::wstring& folder);
-
 // A TidesWindow from the built DLL, ended by Finish().
 class GraphControl {
 public:

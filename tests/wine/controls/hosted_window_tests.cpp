@@ -20,8 +20,7 @@ namespace {
 constexpr double kDate = 45000.0;  // the fake port's day, 2023-03-15
 
 HWND WindowOf(IUnknown* control) {
-  IOleWindow* window = nullptr;
-  REQUIRE(control->QueryInterface(IID_IOleWindow, reinterpret_cast<void**>(&window)) == S_OK);
+  IOleWindow* window = Query<IOleWindow>(control);
   HWND handle = nullptr;
   CHECK(window->GetWindow(&handle) == S_OK);
   window->Release();
@@ -81,9 +80,7 @@ TEST_CASE("in-place activation makes a window of the control's own, a child of t
   CHECK(client.bottom == 200);
   // The site offered windowless activation; the control still has its window and says so.
   LRESULT result = -1;
-  IOleInPlaceObjectWindowless* windowless = nullptr;
-  REQUIRE(hosted.graph->QueryInterface(IID_IOleInPlaceObjectWindowless, reinterpret_cast<void**>(&windowless)) ==
-          S_OK);
+  IOleInPlaceObjectWindowless* windowless = Query<IOleInPlaceObjectWindowless>(hosted.graph.Get());
   CHECK(windowless->OnWindowMessage(WM_MOUSEMOVE, 0, 0, &result) == S_FALSE);
   // The host's resizing reaches the control through the site's rectangles.
   SetWindowPos(hosted.host, nullptr, 0, 0, 420, 260, SWP_NOMOVE | SWP_NOZORDER);
@@ -107,8 +104,7 @@ TEST_CASE("in-place activation makes a window of the control's own, a child of t
 
 TEST_CASE("verbs: UI activation takes the focus, hide and show, and the verbs a control has not") {
   Hosted hosted;
-  IOleObject* ole = nullptr;
-  REQUIRE(hosted.graph->QueryInterface(IID_IOleObject, reinterpret_cast<void**>(&ole)) == S_OK);
+  IOleObject* ole = Query<IOleObject>(hosted.graph.Get());
   IOleClientSite* site = nullptr;
   CHECK(ole->GetClientSite(&site) == S_OK);
   CHECK(site != nullptr);
@@ -257,8 +253,7 @@ TEST_CASE("set-font copies the font; IEmbeddedControl's font slot does the same 
   PrintClient(hosted.window, withBig);
   checkPlotLeft(withBig, bigLayout);
 
-  IEmbeddedControl* embedded = nullptr;
-  REQUIRE(hosted.graph->QueryInterface(IID_IEmbeddedControl, reinterpret_cast<void**>(&embedded)) == S_OK);
+  IEmbeddedControl* embedded = Query<IEmbeddedControl>(hosted.graph.Get());
   FONTDESC description{sizeof(FONTDESC), const_cast<LPOLESTR>(L"Tahoma"), {}, FW_NORMAL, DEFAULT_CHARSET,
                        FALSE, FALSE, FALSE};
   description.cySize.int64 = 20 * 10000;  // 20 points
@@ -304,8 +299,7 @@ TEST_CASE("created by its programmatic identifier in Wine's ATL host, it takes a
   IUnknown* control = nullptr;
   REQUIRE(atl.CreateEx(L"BR_Info.TidesWindow", host, &site, &control) == S_OK);
   REQUIRE(control != nullptr);
-  ITidesWindow* hosted = nullptr;
-  REQUIRE(control->QueryInterface(IID_ITidesWindow, reinterpret_cast<void**>(&hosted)) == S_OK);
+  ITidesWindow* hosted = Query<ITidesWindow>(control);
   const HWND window = WindowOf(control);
   CHECK(GetParent(window) == host);
   REQUIRE(hosted->SetPort(&port) == S_OK);

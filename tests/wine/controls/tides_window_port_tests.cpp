@@ -26,12 +26,12 @@ TEST_CASE("a calculated day of a real port: sun bands where the port's times say
   // A station at 48.4 N 4.5 W with a mean level of 4 and a 2-unit M2 tide.
   StationFolder folder({{"Harbour", 2903, -270, 0, {{0, 4000, 0}, {29, 2000, 1100}}}});
   DllUnderTest dll;
-  IUnknown* unknown = FirstPort(dll, folder.Path());
-  ITidesPort* port = nullptr;
-  REQUIRE(unknown->QueryInterface(IID_ITidesPort, reinterpret_cast<void**>(&port)) == S_OK);
+  ITidesDatabase* database = OpenedDatabase(dll, folder.Path());
+  ITidesPort* port = PortAt(database, 0);
+  database->Release();
 
   GraphControl graph(dll);
-  REQUIRE(graph->SetPort(unknown) == S_OK);
+  REQUIRE(graph->SetPort(port) == S_OK);
   REQUIRE(graph->Calculate(1.0, 45098.0) == S_OK);  // 2023-06-21, hourly
   long count = 0;
   REQUIRE(port->get_NumPoints(&count) == S_OK);
@@ -76,6 +76,5 @@ TEST_CASE("a calculated day of a real port: sun bands where the port's times say
 
   graph.Release();
   port->Release();
-  unknown->Release();
   CHECK(dll.CanUnloadNow() == S_OK);
 }

@@ -94,8 +94,7 @@ struct PortList {
   void Host() {
     host = AtlHost::MakeWindow(300, 200);
     REQUIRE(atl.Attach(list, host, &site) == S_OK);
-    IOleWindow* ole = nullptr;
-    REQUIRE(list->QueryInterface(IID_IOleWindow, reinterpret_cast<void**>(&ole)) == S_OK);
+    IOleWindow* ole = Query<IOleWindow>(list);
     ole->GetWindow(&window);
     ole->Release();
     REQUIRE(window != nullptr);
@@ -208,8 +207,7 @@ TEST_CASE("navigation keys given to the accelerator translation reach the focuse
   p.Host();
   SetPorts(p.list, {&havre, &anvers, &brest});
   SetFocus(p.table);
-  IOleInPlaceActiveObject* active = nullptr;
-  REQUIRE(p.list->QueryInterface(IID_IOleInPlaceActiveObject, reinterpret_cast<void**>(&active)) == S_OK);
+  IOleInPlaceActiveObject* active = Query<IOleInPlaceActiveObject>(p.list);
   MSG down{p.table, WM_KEYDOWN, VK_DOWN, 1, 0, {0, 0}};
   CHECK(active->TranslateAccelerator(&down) == S_OK);
   CHECK(p.names.back() == L"Brest");
@@ -224,8 +222,7 @@ TEST_CASE("navigation keys given to the accelerator translation reach the focuse
 TEST_CASE("the background is palette colour 7; a font object keeps the table working") {
   PortList p;
   p.Host();
-  IEmbeddedControl* embedded = nullptr;
-  REQUIRE(p.list->QueryInterface(IID_IEmbeddedControl, reinterpret_cast<void**>(&embedded)) == S_OK);
+  IEmbeddedControl* embedded = Query<IEmbeddedControl>(p.list);
   SAFEARRAY* colours = SafeArrayCreateVector(VT_I4, 0, 20);
   for (LONG i = 0; i < 20; ++i) {
     LONG value = RGB(10 * i, 3, 5);

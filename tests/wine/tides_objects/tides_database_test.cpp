@@ -47,13 +47,6 @@ HRESULT Initialize(ITidesDatabase* database, const std::wstring& folder) {
   return hr;
 }
 
-ITidesDatabase* OpenDatabase(const DllUnderTest& dll, const StationFolder& folder) {
-  ITidesDatabase* database = nullptr;
-  REQUIRE(dll.Create(CLSID_TidesDatabase, &database) == S_OK);
-  REQUIRE(Initialize(database, folder.Path()) == S_OK);
-  return database;
-}
-
 long CountOf(ITidesDatabase* database) {
   long count = -1;
   REQUIRE(database->get_NumPorts(&count) == S_OK);
@@ -87,8 +80,7 @@ std::vector<std::wstring> PortsIn(ITidesDatabase* database, double a, double b, 
   for (LONG i = lower; i <= upper; ++i) {
     IUnknown* element = nullptr;
     REQUIRE(SafeArrayGetElement(array, &i, &element) == S_OK);
-    ITidesPort* port = nullptr;
-    REQUIRE(element->QueryInterface(IID_ITidesPort, reinterpret_cast<void**>(&port)) == S_OK);
+    ITidesPort* port = br::test::Query<ITidesPort>(element);
     names.push_back(NameOf(port));
     port->Release();
     element->Release();
@@ -124,7 +116,7 @@ TEST_CASE("Initialize: a folder without td_pnt.dat fails, a good one opens, late
   }
   // After an unload the next load opens another folder.
   DllUnderTest dll;
-  ITidesDatabase* database = OpenDatabase(dll, other);
+  ITidesDatabase* database = br::test::OpenedDatabase(dll, other.Path());
   CHECK(CountOf(database) == 1);
   database->Release();
   CHECK(dll.CanUnloadNow() == S_OK);
@@ -133,7 +125,7 @@ TEST_CASE("Initialize: a folder without td_pnt.dat fails, a good one opens, late
 TEST_CASE("GetPortInfo: positions in degrees, names through the coordinate index and the ANSI code page") {
   StationFolder folder(BoxStations(), EchoNotInCoordinates());
   DllUnderTest dll;
-  ITidesDatabase* database = OpenDatabase(dll, folder);
+  ITidesDatabase* database = br::test::OpenedDatabase(dll, folder.Path());
   double latitude = 0, longitude = 0;
   BSTR name = nullptr;
   CHECK(database->GetPortInfo(2, &latitude, &longitude, &name) == S_OK);
@@ -158,7 +150,7 @@ TEST_CASE("GetPortInfo: positions in degrees, names through the coordinate index
 TEST_CASE("station names come through the ANSI code page, the whole 40-byte field") {
   StationFolder folder({{"Br\xE9st", 2903, -270, -1, {kMeanLevel}}, {std::string(40, 'N'), 100, 100, 0, {kMeanLevel}}});
   DllUnderTest dll;
-  ITidesDatabase* database = OpenDatabase(dll, folder);
+  ITidesDatabase* database = br::test::OpenedDatabase(dll, folder.Path());
   double latitude = 0, longitude = 0;
   BSTR name = nullptr;
   REQUIRE(database->GetPortInfo(0, &latitude, &longitude, &name) == S_OK);
@@ -175,7 +167,7 @@ TEST_CASE("station names come through the ANSI code page, the whole 40-byte fiel
 TEST_CASE("GetPort: a new port per call that outlives the database; a station without coordinates predicts nothing") {
   StationFolder folder(BoxStations(), EchoNotInCoordinates());
   DllUnderTest dll;
-  ITidesDatabase* database = OpenDatabase(dll, folder);
+  ITidesDatabase* database = br::test::OpenedDatabase(dll, folder.Path());
   IUnknown* a = nullptr;
   IUnknown* b = nullptr;
   REQUIRE(database->GetPort(1, &a) == S_OK);
@@ -183,20 +175,14 @@ TEST_CASE("GetPort: a new port per call that outlives the database; a station wi
   REQUIRE(a != nullptr);
   CHECK(a != b);                      // nothing cached
   CHECK(br::test::RefCount(a) == 1);  // one reference, the caller's
-  ITidesPort* bravo = nullptr;
-  REQUIRE(a->QueryInterface(IID_ITidesPort, reinterpret_cast<void**>(&bravo)) == S_OK);
+  ITidesPort* bravo = br::test::Query<ITidesPort>(a);
   CHECK(NameOf(bravo) == L"Bravo");
   double latitude = 0, longitude = 0;
   CHECK(bravo->GetPortPos(&latitude, &longitude) == S_OK);
   CHECK(latitude == Degrees(660));
   CHECK(longitude == Degrees(1260));
 
-  IUnknown* unknown = nullptr;
-  REQUIRE(database->GetPort(4, &unknown) == S_OK);
-  REQUIRE(unknown != nullptr);
-  ITidesPort* echo = nullptr;
-  unknown->QueryInterface(IID_ITidesPort, reinterpret_cast<void**>(&echo));
-  unknown->Release();
+  ITidesPort* echo = br::test::PortAt(database, 4);
   CHECK(NameOf(echo).empty());
 
   // Ports need only the process-wide engine.
@@ -222,7 +208,7 @@ TEST_CASE("GetPort: a new port per call that outlives the database; a station wi
 TEST_CASE("GetPorts: strict box edges, swapped corners, VT_EMPTY for an empty box") {
   StationFolder folder(BoxStations(), EchoNotInCoordinates());
   DllUnderTest dll;
-  ITidesDatabase* database = OpenDatabase(dll, folder);
+  ITidesDatabase* database = br::test::OpenedDatabase(dll, folder.Path());
   using Names = std::vector<std::wstring>;
   const Names three = {L"Alpha", L"Bravo", L"Delta"};
   // Alpha and Delta lie exactly on the corners: only Bravo is strictly inside.

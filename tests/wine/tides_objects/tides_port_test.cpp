@@ -48,30 +48,13 @@ std::string TimeOfDay(double date) {
   return text;
 }
 
-// The one database of the loaded DLL, opened on a folder, and its ports.
-class Stations {
-public:
-  Stations(const DllUnderTest& dll, const StationFolder& folder) {
-    REQUIRE(dll.Create(CLSID_TidesDatabase, &database_) == S_OK);
-    BSTR path = SysAllocString(folder.Path().c_str());
-    REQUIRE(database_->Initialize(path) == S_OK);
-    SysFreeString(path);
-  }
-  ~Stations() { database_->Release(); }
-
-  ITidesPort* Port(long index) {
-    IUnknown* unknown = nullptr;
-    REQUIRE(database_->GetPort(index, &unknown) == S_OK);
-    REQUIRE(unknown != nullptr);
-    ITidesPort* port = nullptr;
-    REQUIRE(unknown->QueryInterface(IID_ITidesPort, reinterpret_cast<void**>(&port)) == S_OK);
-    unknown->Release();
-    return port;
-  }
-
-private:
-  ITidesDatabase* database_ = nullptr;
-};
+// Port index of the folder (the database released again: ports outlive it).
+ITidesPort* Port(const DllUnderTest& dll, const StationFolder& folder, long index = 0) {
+  ITidesDatabase* database = br::test::OpenedDatabase(dll, folder.Path());
+  ITidesPort* port = br::test::PortAt(database, index);
+  database->Release();
+  return port;
+}
 
 long Points(ITidesPort* port) {
   long n = -1;
@@ -90,7 +73,7 @@ double Point(ITidesPort* port, long k) {
 TEST_CASE("the day: whole-day truncation, heights at local midnight + k x step, first of tied extremes") {
   StationFolder folder({kS2Station});
   DllUnderTest dll;
-  ITidesPort* port = Stations(dll, folder).Port(0);
+  ITidesPort* port = Port(dll, folder);
 
   REQUIRE(port->Calculate(1.0, 36526.75) == S_OK);
   double date = 0;
@@ -142,13 +125,8 @@ TEST_CASE("the day: whole-day truncation, heights at local midnight + k x step, 
 TEST_CASE("a constant curve: extremes at 0, zone read back sign-extended, ports share the engine") {
   StationFolder folder({kConstantStation, kS2Station});
   DllUnderTest dll;
-  ITidesPort* constant = nullptr;
-  ITidesPort* s2 = nullptr;
-  {
-    Stations stations(dll, folder);
-    constant = stations.Port(0);
-    s2 = stations.Port(1);
-  }
+  ITidesPort* constant = Port(dll, folder, 0);
+  ITidesPort* s2 = Port(dll, folder, 1);
   REQUIRE(constant->Calculate(0.5, 36526.0) == S_OK);
   long index = -1;
   CHECK(constant->get_MaxValueIndex(&index) == S_OK);
@@ -184,7 +162,7 @@ TEST_CASE("a constant curve: extremes at 0, zone read back sign-extended, ports 
 TEST_CASE("Calculated reaches every connected sink, with the day already in place") {
   StationFolder folder({kS2Station});
   DllUnderTest dll;
-  ITidesPort* port = Stations(dll, folder).Port(0);
+  ITidesPort* port = Port(dll, folder);
   EventSink a(DIID__ITidesPortEvents), b(DIID__ITidesPortEvents);
   REQUIRE(a.Connect(port));
   REQUIRE(b.Connect(port));
@@ -226,7 +204,7 @@ TEST_CASE("sun times arrive as date-times of the predicted day, polar days endin
     INFO(row.what);
     StationFolder folder({{"Sun", row.latitude, 0, 0, {{0, 1000, 0}}}});
     DllUnderTest dll;  // a fresh load: the library opens one folder per load
-    ITidesPort* port = Stations(dll, folder).Port(0);
+    ITidesPort* port = Port(dll, folder);
     REQUIRE(port->Calculate(1.0, row.date) == S_OK);
     REQUIRE(Points(port) == 25);
     double day = 0;
