@@ -45,15 +45,13 @@ void FireWith(FrameTestObject* object, long id) {
 TEST_CASE("QueryInterface answers exactly the class's table, with one identity") {
   ComApartment apartment;
   FrameTestObject* object = NewTestObject();
-  IUnknown* identity = nullptr;
-  REQUIRE(object->QueryInterface(IID_IUnknown, reinterpret_cast<void**>(&identity)) == S_OK);
+  IUnknown* identity = br::test::Query<IUnknown>(object);
 
   for (const IID* iid : {&IID_ITidesPortList, &IID_IDispatch, &IID_IConnectionPointContainer,
                          &IID_IProvideClassInfo, &IID_IProvideClassInfo2, &IID_ISupportErrorInfo}) {
     IUnknown* face = nullptr;
     REQUIRE(object->QueryInterface(*iid, reinterpret_cast<void**>(&face)) == S_OK);
-    IUnknown* back = nullptr;
-    REQUIRE(face->QueryInterface(IID_IUnknown, reinterpret_cast<void**>(&back)) == S_OK);
+    IUnknown* back = br::test::Query<IUnknown>(face);
     CHECK(back == identity);  // companions hand IUnknown to their owner
     back->Release();
     face->Release();
@@ -65,8 +63,7 @@ TEST_CASE("QueryInterface answers exactly the class's table, with one identity")
 
   // Companions share the owner's count.
   const ULONG before = br::test::RefCount(identity);
-  IConnectionPointContainer* container = nullptr;
-  object->QueryInterface(IID_IConnectionPointContainer, reinterpret_cast<void**>(&container));
+  IConnectionPointContainer* container = br::test::Query<IConnectionPointContainer>(object);
   CHECK(br::test::RefCount(identity) == before + 1);
   container->Release();
   CHECK(br::test::RefCount(identity) == before);
@@ -83,8 +80,7 @@ TEST_CASE("every live object and enumerator holds one module lock") {
   FrameTestObject* b = NewTestObject();
   CHECK(Module::LockCount() == base + 2);
 
-  IConnectionPointContainer* container = nullptr;
-  a->QueryInterface(IID_IConnectionPointContainer, reinterpret_cast<void**>(&container));
+  IConnectionPointContainer* container = br::test::Query<IConnectionPointContainer>(a);
   IEnumConnectionPoints* points = nullptr;
   REQUIRE(container->EnumConnectionPoints(&points) == S_OK);
   container->Release();
@@ -102,8 +98,7 @@ TEST_CASE("every live object and enumerator holds one module lock") {
 TEST_CASE("connection point container, point and enumerators") {
   ComApartment apartment;
   FrameTestObject* object = NewTestObject();
-  IConnectionPointContainer* container = nullptr;
-  object->QueryInterface(IID_IConnectionPointContainer, reinterpret_cast<void**>(&container));
+  IConnectionPointContainer* container = br::test::Query<IConnectionPointContainer>(object);
 
   IConnectionPoint* other = reinterpret_cast<IConnectionPoint*>(1);
   CHECK(container->FindConnectionPoint(DIID__ITidesPortEvents, &other) == CONNECT_E_NOCONNECTION);
@@ -248,8 +243,7 @@ TEST_CASE("the method boundary turns every thrown value into an HRESULT with err
     SysFreeString(source);
     info->Release();
   }
-  ISupportErrorInfo* support = nullptr;
-  REQUIRE(object->QueryInterface(IID_ISupportErrorInfo, reinterpret_cast<void**>(&support)) == S_OK);
+  ISupportErrorInfo* support = br::test::Query<ISupportErrorInfo>(object);
   CHECK(support->InterfaceSupportsErrorInfo(IID_ITidesPortList) == S_OK);
   CHECK(support->InterfaceSupportsErrorInfo(IID_IDispatch) == S_FALSE);
   support->Release();
@@ -259,8 +253,7 @@ TEST_CASE("the method boundary turns every thrown value into an HRESULT with err
 TEST_CASE("IProvideClassInfo2 names the default source interface") {
   ComApartment apartment;
   FrameTestObject* object = NewTestObject();
-  IProvideClassInfo2* info = nullptr;
-  REQUIRE(object->QueryInterface(IID_IProvideClassInfo2, reinterpret_cast<void**>(&info)) == S_OK);
+  IProvideClassInfo2* info = br::test::Query<IProvideClassInfo2>(object);
   GUID guid = {};
   CHECK(info->GetGUID(GUIDKIND_DEFAULT_SOURCE_DISP_IID, &guid) == S_OK);
   CHECK(IsEqualIID(guid, DIID__ITidesPortListEvents));

@@ -107,8 +107,7 @@ TEST_CASE("plain objects answer their dual interface, IDispatch, connection poin
       IUnknown* face = nullptr;
       CHECK(object->QueryInterface(*iid, reinterpret_cast<void**>(&face)) == E_NOINTERFACE);
     }
-    IConnectionPointContainer* container = nullptr;
-    object->QueryInterface(IID_IConnectionPointContainer, reinterpret_cast<void**>(&container));
+    IConnectionPointContainer* container = br::test::Query<IConnectionPointContainer>(object);
     IConnectionPoint* point = nullptr;
     CHECK(container->FindConnectionPoint(*c.events, &point) == S_OK);
     if (point) point->Release();
