@@ -31,11 +31,15 @@ SAFEARRAY* MakeLongArray(const std::vector<LONG>& values, LONG lower) {
   return array;
 }
 
-SAFEARRAY* MakeUnknownArray(const std::vector<IUnknown*>& objects, LONG lower) {
-  SAFEARRAY* array = Checked(SafeArrayCreateVector(VT_UNKNOWN, lower, static_cast<ULONG>(objects.size())));
+SAFEARRAY* MakeUnknownArray(const std::vector<IUnknown*>& objects, LONG lower, VARTYPE type) {
+  SAFEARRAY* array = Checked(SafeArrayCreateVector(type, lower, static_cast<ULONG>(objects.size())));
   for (std::size_t i = 0; i < objects.size(); ++i) {
     LONG index = lower + static_cast<LONG>(i);
-    SafeArrayPutElement(array, &index, objects[i]);  // takes its own reference
+    IUnknown* element = objects[i];
+    if (element && type == VT_DISPATCH) element->QueryInterface(IID_IDispatch, reinterpret_cast<void**>(&element));
+    else if (element) element->AddRef();
+    SafeArrayPutElement(array, &index, element);  // takes its own reference
+    if (element) element->Release();
   }
   return array;
 }

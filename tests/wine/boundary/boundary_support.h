@@ -67,7 +67,7 @@ public:
   static Variant R4(float x) { return Make(VT_R4, [=](VARIANT& v) { v.fltVal = x; }); }
   static Variant R8(double x) { return Make(VT_R8, [=](VARIANT& v) { v.dblVal = x; }); }
   static Variant Date(double x) { return Make(VT_DATE, [=](VARIANT& v) { v.date = x; }); }
-  static Variant Bool(bool x) { return Make(VT_BOOL, [=](VARIANT& v) { v.boolVal = x ? VARIANT_TRUE : VARIANT_FALSE; }); }
+  static Variant Bool(bool x) { return Make(VT_BOOL, [=](VARIANT& v) { v.boolVal = x ? -1 : 0; }); }
   static Variant Error(SCODE x) { return Make(VT_ERROR, [=](VARIANT& v) { v.scode = x; }); }
   static Variant NullBstr() { return Make(VT_BSTR, [](VARIANT& v) { v.bstrVal = nullptr; }); }
   static Variant Bstr(const std::wstring& text) {  // embedded zeros kept
@@ -104,9 +104,10 @@ private:
 
 // A SAFEARRAY with one SAFEARRAYBOUND per dimension, every element zero.
 SAFEARRAY* MakeArray(VARTYPE type, std::initializer_list<SAFEARRAYBOUND> bounds);
-// One-dimensional arrays from lower: VT_I4 values, or interface pointers (each referenced).
+// One-dimensional arrays from lower: VT_I4 values, or interface pointers (each referenced;
+// VT_DISPATCH: their IDispatch).
 SAFEARRAY* MakeLongArray(const std::vector<LONG>& values, LONG lower = 0);
-SAFEARRAY* MakeUnknownArray(const std::vector<IUnknown*>& objects, LONG lower = 0);
+SAFEARRAY* MakeUnknownArray(const std::vector<IUnknown*>& objects, LONG lower = 0, VARTYPE type = VT_UNKNOWN);
 // count elements of elementSize bytes and no element type, as a hand-built descriptor.
 SAFEARRAY* MakeRawArray(ULONG elementSize, ULONG count);
 // Two dimensions, one empty, the other claiming `claimed` elements over data it neither
@@ -295,7 +296,7 @@ public:
   }
   // IDispatch: not offered to late binding
   STDMETHODIMP GetTypeInfoCount(UINT* count) override { return count ? (*count = 0, S_OK) : E_POINTER; }
-  STDMETHODIMP GetTypeInfo(UINT, LCID, ITypeInfo** out) override { return out ? (*out = nullptr, E_NOTIMPL) : E_POINTER; }
+  STDMETHODIMP GetTypeInfo(UINT, LCID, ITypeInfo**) override { return E_NOTIMPL; }
   STDMETHODIMP GetIDsOfNames(REFIID, LPOLESTR*, UINT, LCID, DISPID*) override { return E_NOTIMPL; }
   STDMETHODIMP Invoke(DISPID, REFIID, LCID, WORD, DISPPARAMS*, VARIANT*, EXCEPINFO*, UINT*) override {
     return E_NOTIMPL;

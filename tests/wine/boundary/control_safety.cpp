@@ -96,7 +96,8 @@ TEST_CASE("registered classes carry no safety category, at any depth of their ke
     for (const CATID* category : kSafetyCategories) {
       CHECK_FALSE(Mentions(texts, Text(*category)));
       CATID wanted = *category;
-      if (categories) CHECK(categories->IsClassOfCategories(*clsid, 1, &wanted, static_cast<ULONG>(-1), nullptr) != S_OK);
+      if (categories)
+        CHECK(categories->IsClassOfCategories(*clsid, 1, &wanted, static_cast<ULONG>(-1), nullptr) != S_OK);
     }
   }
   if (categories) categories->Release();

@@ -36,7 +36,8 @@ COLORREF FrameColour(IUnknown* probe) {
 // An array of count elements of the type, the 4-byte ones holding the colours.
 SAFEARRAY* Filled(VARTYPE type, const std::vector<LONG>& colours, ULONG count = 20) {
   SAFEARRAY* array = MakeArray(type, {{count, 0}});
-  if (SafeArrayGetElemsize(array) == 4) std::copy_n(colours.begin(), std::min<ULONG>(count, 20), static_cast<LONG*>(array->pvData));
+  if (SafeArrayGetElemsize(array) == 4)
+    std::copy_n(colours.begin(), std::min<ULONG>(count, 20), static_cast<LONG*>(array->pvData));
   return array;
 }
 

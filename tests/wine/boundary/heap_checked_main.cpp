@@ -28,8 +28,9 @@ bool FreeCheckingOn() {
 bool SetGlobalFlagForThisProgram() {
   wchar_t path[MAX_PATH] = {};
   GetModuleFileNameW(nullptr, path, MAX_PATH);
-  const std::wstring name(path), key = L"Software\\Microsoft\\Windows NT\\CurrentVersion\\Image File Execution Options\\" +
-                                         name.substr(name.find_last_of(L"\\/") + 1);
+  const std::wstring name(path);
+  const std::wstring key = L"Software\\Microsoft\\Windows NT\\CurrentVersion\\Image File Execution Options\\" +
+                           name.substr(name.find_last_of(L"\\/") + 1);
   return RegSetKeyValueW(HKEY_LOCAL_MACHINE, key.c_str(), L"GlobalFlag", REG_DWORD, &kHeapFlags, sizeof kHeapFlags) ==
          ERROR_SUCCESS;
 }

@@ -155,7 +155,8 @@ TEST_CASE("ITidesDatabase late bound: argument types, counts and forms as script
   BSTR name = nullptr;
   auto info = [&](double index) {
     return [&, index](LateCall& c) {
-      c.Arg(Variant::R8(index)).Arg(Variant::RefR8(&latitude)).Arg(Variant::RefR8(&longitude)).Arg(Variant::RefBstr(&name));
+      c.Arg(Variant::R8(index)).Arg(Variant::RefR8(&latitude)).Arg(Variant::RefR8(&longitude));
+      c.Arg(Variant::RefBstr(&name));
     };
   };
   // Wine's dispatch turns NaN into a number where a long is wanted.

@@ -23,13 +23,14 @@ struct Getter {
   HRESULT (STDMETHODCALLTYPE ITidesPort::*real)(double*);
   HRESULT (STDMETHODCALLTYPE ITidesPort::*whole)(long*);
 };
+using P = ITidesPort;
 const Getter kPointGetters[] = {
-    {"PredictionDate", &ITidesPort::get_PredictionDate, nullptr}, {"MaxValueIndex", nullptr, &ITidesPort::get_MaxValueIndex},
-    {"MinValueIndex", nullptr, &ITidesPort::get_MinValueIndex},   {"MaxValue", &ITidesPort::get_MaxValue, nullptr},
-    {"MinValue", &ITidesPort::get_MinValue, nullptr},             {"Step", &ITidesPort::get_Step, nullptr},
-    {"SunRise", &ITidesPort::get_SunRise, nullptr},               {"SunSet", &ITidesPort::get_SunSet, nullptr},
-    {"BeginTwilight", &ITidesPort::get_BeginTwilight, nullptr},   {"EndTwilight", &ITidesPort::get_EndTwilight, nullptr},
-    {"TimeZone", nullptr, &ITidesPort::get_TimeZone},
+    {"PredictionDate", &P::get_PredictionDate, nullptr}, {"MaxValueIndex", nullptr, &P::get_MaxValueIndex},
+    {"MinValueIndex", nullptr, &P::get_MinValueIndex},   {"MaxValue", &P::get_MaxValue, nullptr},
+    {"MinValue", &P::get_MinValue, nullptr},             {"Step", &P::get_Step, nullptr},
+    {"SunRise", &P::get_SunRise, nullptr},               {"SunSet", &P::get_SunSet, nullptr},
+    {"BeginTwilight", &P::get_BeginTwilight, nullptr},   {"EndTwilight", &P::get_EndTwilight, nullptr},
+    {"TimeZone", nullptr, &P::get_TimeZone},
 };
 HRESULT Call(ITidesPort* p, const Getter& g, Outs* o) {
   return g.real ? (p->*g.real)(o ? &o->value : nullptr) : (p->*g.whole)(o ? &o->number : nullptr);
@@ -87,7 +88,8 @@ std::vector<Row> Rows(const State& s, Outs& o) {
       {"WavePoint(-1, null)", [=] { return p->get_WavePoint(-1, nullptr); }, s.pointsNull},
   };
   for (long k : {-1L, s.points, LONG_MAX, LONG_MIN, 65536L})
-    rows.push_back({"WavePoint(" + std::to_string(k) + ")", [=, &o] { return p->get_WavePoint(k, &o.value); }, s.outside});
+    rows.push_back({"WavePoint(" + std::to_string(k) + ")", [=, &o] { return p->get_WavePoint(k, &o.value); },
+                    s.outside});
   for (const Getter& g : kPointGetters) {
     rows.push_back({std::string(g.name) + "(null)", [=] { return Call(p, g, nullptr); }, s.pointsNull});
     if (s.pointsRead != S_OK) rows.push_back({g.name, [=, &o] { return Call(p, g, &o); }, s.pointsRead});

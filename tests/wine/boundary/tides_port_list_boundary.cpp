@@ -19,25 +19,10 @@ struct ListRow {
   int events = 0;                        // SelectChanged fired by the fill
 };
 
-IDispatch* DispatchOf(IUnknown* object) {
-  IDispatch* d = nullptr;
-  REQUIRE(object->QueryInterface(IID_IDispatch, reinterpret_cast<void**>(&d)) == S_OK);
-  return d;
-}
-
 // p: Charlie, Alpha, Bravo.
 std::vector<ListRow> Rows(const std::vector<IUnknown*>& p, IUnknown* database) {
   static IUnknown* poison[5] = {kUntouchedUnknown, kUntouchedUnknown, kUntouchedUnknown, kUntouchedUnknown,
                                 kUntouchedUnknown};  // elements that must never be read
-  auto dispatchArray = [p] {
-    SAFEARRAY* array = MakeArray(VT_DISPATCH, {{3, 0}});
-    for (LONG i = 0; i < 3; ++i) {
-      IDispatch* d = DispatchOf(p[i]);
-      SafeArrayPutElement(array, &i, d);
-      d->Release();
-    }
-    return Variant::Array(VT_DISPATCH, array);
-  };
   return {
       {"VT_EMPTY (an empty box)", [] { return Variant::Empty(); }},
       {"VT_NULL", [] { return Variant::Null(); }},
@@ -47,7 +32,8 @@ std::vector<ListRow> Rows(const std::vector<IUnknown*>& p, IUnknown* database) {
       {"VT_UNKNOWN null", [] { return Variant::Unknown(nullptr); }},
       {"VT_UNKNOWN one port", [=] { return Variant::Unknown(p[2]); }, {0, 0, 1}, L"Bravo", 1},
       {"VT_UNKNOWN not a port", [=] { return Variant::Unknown(database); }},
-      {"VT_DISPATCH one port", [=] { return Variant::Make(VT_DISPATCH, [&](VARIANT& v) { v.pdispVal = DispatchOf(p[0]); }); }},
+      {"VT_DISPATCH one port",
+       [=] { return Variant::Make(VT_DISPATCH, [&](VARIANT& v) { p[0]->QueryInterface(IID_IDispatch, &v.byref); }); }},
       {"VT_ARRAY|VT_UNKNOWN of three", [=] { return Variant::Array(VT_UNKNOWN, MakeUnknownArray(p)); }, {1, 1, 1},
        L"Alpha", 1},
       {"lower bound 5", [=] { return Variant::Array(VT_UNKNOWN, MakeUnknownArray(p, 5)); }, {1, 1, 1}, L"Alpha", 1},
@@ -66,7 +52,8 @@ std::vector<ListRow> Rows(const std::vector<IUnknown*>& p, IUnknown* database) {
       {"two dimensions, the empty one last, the other claiming five",
        [] { return Variant::Array(VT_UNKNOWN, MakeEmptyTwoDimensionArray(poison, 5, false)); }},
       {"elements of 4 bytes (VT_I4)", [] { return Variant::Array(VT_UNKNOWN, MakeLongArray({1, 2, 3})); }},
-      {"VT_ARRAY|VT_DISPATCH of ports", dispatchArray},
+      {"VT_ARRAY|VT_DISPATCH of ports",
+       [=] { return Variant::Array(VT_DISPATCH, MakeUnknownArray(p, 0, VT_DISPATCH)); }},
       {"VT_ARRAY|VT_VARIANT", [] { return Variant::Array(VT_VARIANT, MakeArray(VT_VARIANT, {{3, 0}})); }},
       {"elements of another size, no element type", [] { return Variant::Array(VT_UNKNOWN, MakeRawArray(2, 3)); }},
   };

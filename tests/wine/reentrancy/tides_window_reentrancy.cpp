@@ -42,7 +42,7 @@ void PortTakenAwayInside(ITidesWindow* window, bool& armed) {
 
 }  // namespace
 
-TEST_CASE("a port that takes itself away from the window inside a getter, while the window paints or reads the pointer") {
+TEST_CASE("a port that takes itself away from the window inside a getter, while the window paints or reads") {
   Graph g;
   bool armed = false;
   PortTakenAwayInside(g.window, armed);
