@@ -11,6 +11,13 @@ SAFEARRAY* Checked(SAFEARRAY* array) {
   return array;
 }
 
+SAFEARRAY* Descriptor(UINT dimensions, ULONG elementSize) {
+  SAFEARRAY* array = nullptr;
+  if (FAILED(SafeArrayAllocDescriptor(dimensions, &array))) throw std::runtime_error("no descriptor");
+  array->cbElements = elementSize;
+  return array;
+}
+
 }  // namespace
 
 Variant Variant::ZeroDimensions(VARTYPE type) {
@@ -45,18 +52,14 @@ SAFEARRAY* MakeUnknownArray(const std::vector<IUnknown*>& objects, LONG lower, V
 }
 
 SAFEARRAY* MakeRawArray(ULONG elementSize, ULONG count) {
-  SAFEARRAY* array = nullptr;
-  if (FAILED(SafeArrayAllocDescriptor(1, &array))) throw std::runtime_error("SafeArrayAllocDescriptor failed");
-  array->cbElements = elementSize;
+  SAFEARRAY* array = Descriptor(1, elementSize);
   array->rgsabound[0] = SAFEARRAYBOUND{count, 0};
   if (FAILED(SafeArrayAllocData(array))) throw std::runtime_error("SafeArrayAllocData failed");
   return array;
 }
 
 SAFEARRAY* MakeEmptyTwoDimensionArray(IUnknown** data, ULONG claimed, bool emptyFirst) {
-  SAFEARRAY* array = nullptr;
-  if (FAILED(SafeArrayAllocDescriptor(2, &array))) throw std::runtime_error("SafeArrayAllocDescriptor failed");
-  array->cbElements = sizeof(IUnknown*);
+  SAFEARRAY* array = Descriptor(2, sizeof(IUnknown*));
   array->fFeatures = FADF_STATIC | FADF_FIXEDSIZE;
   array->rgsabound[emptyFirst ? 0 : 1] = SAFEARRAYBOUND{0, 0};
   array->rgsabound[emptyFirst ? 1 : 0] = SAFEARRAYBOUND{claimed, 0};
@@ -136,6 +139,12 @@ std::vector<IUnknown*> OpenTides::Ports(long count) const {
   std::vector<IUnknown*> ports;
   for (long i = 0; i < count; ++i) ports.push_back(Unknown(i));
   return ports;
+}
+
+long Points(ITidesPort* port) {
+  long n = -1;
+  REQUIRE(port->get_NumPoints(&n) == S_OK);
+  return n;
 }
 
 std::wstring NameOf(IUnknown* port) {

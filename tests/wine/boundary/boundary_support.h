@@ -1,6 +1,5 @@
-// What the boundary, leak and re-entrancy suites share: VARIANTs and SAFEARRAYs of every
-// awkward form, late-bound calls made as script hosts make them, table runners that check a
-// result and an unchanged state per row, an open station database, and a hosted control.
+// Shared by the boundary, leak and re-entrancy suites: awkward VARIANTs and SAFEARRAYs,
+// late-bound calls, row runners, an open station database, a hosted control, a foreign port.
 #pragma once
 
 #include "tests/wine/common/dll_under_test.h"
@@ -95,7 +94,6 @@ public:
   static Variant ZeroDimensions(VARTYPE type);
 
   VARIANT& get() { return v_; }
-  VARTYPE vt() const { return v_.vt; }
 
 private:
   VARIANT v_;
@@ -225,6 +223,7 @@ struct OpenTides {
   }
 };
 
+long Points(ITidesPort* port);         // NumPoints, REQUIREd to answer
 std::wstring NameOf(IUnknown* port);  // "<none>" for null, "<not a port>"
 std::wstring SelectedName(ITidesPortList* list);
 std::vector<ULONG> RefCounts(const std::vector<IUnknown*>& objects);
@@ -280,13 +279,9 @@ public:
   static long Alive() { return alive_; }
 
   STDMETHODIMP QueryInterface(REFIID riid, void** out) override {
-    if (!out) return E_POINTER;
-    *out = nullptr;
-    if (!IsEqualIID(riid, IID_IUnknown) && !IsEqualIID(riid, IID_IDispatch) && !IsEqualIID(riid, IID_ITidesPort))
-      return E_NOINTERFACE;
-    *out = static_cast<ITidesPort*>(this);
-    AddRef();
-    return S_OK;
+    const bool port = riid == IID_IUnknown || riid == IID_IDispatch || riid == IID_ITidesPort;
+    *out = port ? static_cast<ITidesPort*>(this) : nullptr;
+    return port ? (AddRef(), S_OK) : E_NOINTERFACE;
   }
   STDMETHODIMP_(ULONG) AddRef() override { return ++refs_; }
   STDMETHODIMP_(ULONG) Release() override {

@@ -1,6 +1,5 @@
-// No class is marked safe for scripting or initialisation (the controls read local files and
-// the registry): no IObjectSafety on an instance, and neither category in the class keys,
-// the category keys or the component categories manager.
+// No class may be marked safe for scripting or initialisation: the controls read local files
+// and the registry.
 #include "tests/wine/common/dll_under_test.h"
 
 #include "BR_Info.h"

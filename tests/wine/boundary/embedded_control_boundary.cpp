@@ -1,7 +1,5 @@
-// IEmbeddedControl at its boundary, for each control that answers it: the palette with every
-// VARIANT type, by-reference form and SAFEARRAY shape (only one dimension of 20 four-byte
-// elements from 0 replaces the shared palette; the answer is S_OK either way), the reserved
-// slot, the font slot with no font, a failing font and a bogus handle, and the size slot.
+// IEmbeddedControl of each control with bad input: only one dimension of 20 four-byte elements
+// from 0 replaces the shared palette; every call answers S_OK or E_POINTER.
 #include "tests/wine/boundary/boundary_support.h"
 
 #include "BR_Private.h"

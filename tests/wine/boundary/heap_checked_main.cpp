@@ -1,7 +1,5 @@
-// A doctest main with the heap's free checking on, so a use after free (an object going on
-// after its last reference went inside its own call) reads 0xFEEEFEEE and fails. The switch
-// is the program's GlobalFlag under Image File Execution Options, read at process start:
-// the first run sets it and runs the suite again as a child.
+// A doctest main with the heap's free checking on (the program's GlobalFlag, read at process
+// start: the first run sets it and runs the suite again as a child), so a use after free fails.
 #define DOCTEST_CONFIG_IMPLEMENT
 #include <doctest/doctest.h>
 
@@ -41,27 +39,23 @@ int RunChild() {
   STARTUPINFOW startup = {};
   startup.cb = sizeof startup;
   PROCESS_INFORMATION process = {};
-  wchar_t path[MAX_PATH] = {};
-  GetModuleFileNameW(nullptr, path, MAX_PATH);
   std::wstring commandLine = GetCommandLineW();
   // The child ends with this process (a test runner that gives up on us kills only us).
   HANDLE job = CreateJobObjectW(nullptr, nullptr);
   JOBOBJECT_EXTENDED_LIMIT_INFORMATION limits = {};
   limits.BasicLimitInformation.LimitFlags = JOB_OBJECT_LIMIT_KILL_ON_JOB_CLOSE;
-  if (job) SetInformationJobObject(job, JobObjectExtendedLimitInformation, &limits, sizeof limits);
-  if (!CreateProcessW(path, &commandLine[0], nullptr, nullptr, TRUE, CREATE_SUSPENDED, nullptr, nullptr, &startup,
-                      &process)) {
-    if (job) CloseHandle(job);
+  SetInformationJobObject(job, JobObjectExtendedLimitInformation, &limits, sizeof limits);
+  if (!CreateProcessW(nullptr, &commandLine[0], nullptr, nullptr, TRUE, CREATE_SUSPENDED, nullptr, nullptr, &startup,
+                      &process))
     return -1;
-  }
-  if (job) AssignProcessToJobObject(job, process.hProcess);
+  AssignProcessToJobObject(job, process.hProcess);
   ResumeThread(process.hThread);
   WaitForSingleObject(process.hProcess, INFINITE);
   DWORD code = static_cast<DWORD>(-1);
   GetExitCodeProcess(process.hProcess, &code);
   CloseHandle(process.hThread);
   CloseHandle(process.hProcess);
-  if (job) CloseHandle(job);
+  CloseHandle(job);
   return static_cast<int>(code);
 }
 

@@ -1,5 +1,4 @@
-// ITidesDatabase at its boundary, before and after Initialize, early and late bound: each
-// row's result, out-parameters of a failed call untouched, and the database unchanged.
+// ITidesDatabase with bad input: each row's result, out-parameters untouched, database unchanged.
 #include "tests/wine/boundary/boundary_support.h"
 
 #include <climits>

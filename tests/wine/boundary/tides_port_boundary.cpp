@@ -1,6 +1,4 @@
-// ITidesPort at its boundary: every member in each of the port's three states with null
-// out-pointers and extreme indices, Calculate with NaN, infinite, tiny and huge steps and
-// dates, and late bound. A failed getter writes nothing, changes nothing and fires nothing.
+// ITidesPort with bad input: a failed getter writes nothing, changes nothing and fires nothing.
 #include "tests/wine/boundary/boundary_support.h"
 
 #include <climits>
@@ -57,12 +55,6 @@ std::vector<std::pair<HRESULT, double>> Read(ITidesPort* port) {
     else keep((port->*g.whole)(&o.number), o.number);
   }
   return f;
-}
-
-long Points(ITidesPort* port) {
-  long n = -1;
-  REQUIRE(port->get_NumPoints(&n) == S_OK);
-  return n;
 }
 
 // A port's state and what each kind of call answers in it.

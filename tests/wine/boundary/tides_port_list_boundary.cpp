@@ -1,7 +1,4 @@
-// ITidesPortList at its boundary: SetPortList with every VARIANT type, SAFEARRAYs of 0, 1 and
-// 2 dimensions, other lower bounds, element sizes and types, null elements and non-ports;
-// Selected with a null pointer; late bound. The list keeps one reference per port it takes
-// (none of what it refuses), always answers S_OK, and shows only ports.
+// ITidesPortList with bad input: S_OK always, one reference per port taken and none of the rest.
 #include "tests/wine/boundary/boundary_support.h"
 
 using namespace br::test;

@@ -1,7 +1,5 @@
-// ITidesWindow at its boundary: Property with wrong codes, VARIANT types, by-reference forms
-// and formats printf must never see; SetPort with objects that are no ports and with ports
-// of another make that answer NaN, infinities, absurd counts or failures; NaN and infinite
-// scales and days; late bound. A refused call leaves the properties and the picture alone.
+// ITidesWindow with bad input: a refused call leaves the properties and the picture alone, and
+// any port, however broken, draws, reads the pointer and ends.
 #include "tests/wine/boundary/boundary_support.h"
 
 #include "BR_Private.h"

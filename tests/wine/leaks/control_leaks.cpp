@@ -1,6 +1,5 @@
-// GDI objects and references of the controls: as many GDI objects after 1000 paints, font
-// changes and palette replacements of each control as before, and TidesPortList holding one
-// reference per port it keeps, for as long as it keeps it.
+// GDI objects of the controls over 1000 rounds of each kind of work, and TidesPortList's port
+// references.
 #include "tests/wine/boundary/boundary_support.h"
 
 #include "BR_Private.h"
@@ -48,15 +47,6 @@ void CheckFlat(const char* what, const std::function<void(int)>& action) {
   CHECK(after == before);
 }
 
-IFont* MakeFont(int i) {
-  FONTDESC description = {sizeof(FONTDESC), const_cast<LPOLESTR>(i % 2 ? L"Arial" : L"Tahoma"),
-                          {{static_cast<ULONG>(80000 + 1000 * (i % 40)), 0}},
-                          static_cast<SHORT>(i % 3 ? FW_NORMAL : FW_BOLD), ANSI_CHARSET, FALSE, FALSE, FALSE};
-  IFont* font = nullptr;
-  REQUIRE(OleCreateFontIndirect(&description, IID_IFont, reinterpret_cast<void**>(&font)) == S_OK);
-  return font;
-}
-
 // Paints, font changes and palette replacements of one hosted control.
 void CheckControl(const DllUnderTest& dll, const CLSID& clsid, const std::function<void(IUnknown*)>& prepare) {
   HostedControl hosted(dll, clsid);
@@ -69,7 +59,11 @@ void CheckControl(const DllUnderTest& dll, const CLSID& clsid, const std::functi
     DrawControl(hosted.Control(), canvas);
   });
   CheckFlat("font changes", [&](int i) {
-    IFont* font = MakeFont(i);
+    FONTDESC description = {sizeof(FONTDESC), const_cast<LPOLESTR>(i % 2 ? L"Arial" : L"Tahoma"),
+                            {{static_cast<ULONG>(80000 + 1000 * (i % 40)), 0}},
+                            static_cast<SHORT>(i % 3 ? FW_NORMAL : FW_BOLD), ANSI_CHARSET, FALSE, FALSE, FALSE};
+    IFont* font = nullptr;
+    REQUIRE(OleCreateFontIndirect(&description, IID_IFont, reinterpret_cast<void**>(&font)) == S_OK);
     embedded->SetFont(0, font, 0);
     font->Release();  // the control keeps no reference: a copy, or a borrowed handle
     HFONT handle = CreateFontW(10 + i % 9, 0, 0, 0, FW_NORMAL, 0, 0, 0, 0, 0, 0, 0, 0, L"Arial");

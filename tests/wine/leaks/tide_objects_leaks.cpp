@@ -1,6 +1,4 @@
-// References and memory of TidesDatabase and TidesPort: the ports GetPorts hands out hold
-// exactly the references the array owns, and many failed Initialize or Calculate calls
-// leave the heaps as they were.
+// References GetPorts hands out, and the heaps over many failed Initialize and Calculate calls.
 #include "tests/wine/boundary/boundary_support.h"
 
 #include <cstdio>

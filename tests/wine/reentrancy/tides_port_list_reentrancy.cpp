@@ -1,7 +1,4 @@
-// Calls back into TidesPortList from inside SelectChanged, fired both by a fill (SetPortList
-// on a live window) and by the keyboard in the table: clear or replace the list, read
-// Selected, disconnect, and close the host and let the control go while the table is still
-// inside its own selection. Run with the heap's free checking on.
+// SelectChanged sinks that call back into TidesPortList, fired by a fill and by a key in the table.
 #include "tests/wine/boundary/boundary_support.h"
 
 using namespace br::test;

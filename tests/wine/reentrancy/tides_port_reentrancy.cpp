@@ -1,6 +1,4 @@
-// Sinks of Calculated that call back into the port from inside the event: release it,
-// calculate again, disconnect themselves or others, connect new sinks. The port keeps
-// itself alive while it fires and reads consistently afterwards.
+// Calculated sinks that call back into the port: it keeps itself alive while it fires.
 #include "tests/wine/boundary/boundary_support.h"
 
 #include <cmath>
@@ -9,12 +7,6 @@ using namespace br::test;
 using namespace br::test::boundary;
 
 namespace {
-
-long Points(ITidesPort* port) {
-  long n = -1;
-  REQUIRE(port->get_NumPoints(&n) == S_OK);
-  return n;
-}
 
 // The day a port holds is whole: its point count is that of its step, every point reads.
 void CheckWholeDay(ITidesPort* port, double step, long points) {

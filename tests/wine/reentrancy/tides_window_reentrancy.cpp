@@ -1,7 +1,4 @@
-// Calls back into TidesWindow from inside its own calls out: a port whose getters drop the
-// window's reference to it while the window paints or reads the pointer, MouseAction sinks
-// that take the port away, recalculate, disconnect or close the host, and Calculated sinks
-// that replace the window's port while the window calculates. Run with free checking on.
+// Ports and sinks that call back into TidesWindow from inside its own calls out.
 #include "tests/wine/boundary/boundary_support.h"
 
 using namespace br::test;
