@@ -114,10 +114,9 @@ std::vector<TestStation> ThreeStations() {
           {"Bravo", 620, 620, 0, {{0, 1000, 0}}}};
 }
 
-OpenTides::OpenTides(const std::vector<TestStation>& stations) : folder(stations) {
+OpenTides::OpenTides(const std::vector<TestStation>& stations, bool open) : folder(stations) {
   REQUIRE(dll.Create(CLSID_TidesDatabase, &db) == S_OK);
-  Variant path = Variant::Bstr(folder.Path());
-  REQUIRE(db->Initialize(path.get().bstrVal) == S_OK);
+  if (open) REQUIRE(db->Initialize(Variant::Bstr(folder.Path()).get().bstrVal) == S_OK);
 }
 
 IUnknown* OpenTides::Unknown(long index) const {
@@ -135,8 +134,7 @@ ITidesPort* OpenTides::Port(long index) const {
   return port;
 }
 
-std::vector<IUnknown*> OpenTides::Ports(long count) const {
-  std::vector<IUnknown*> ports;
+const std::vector<IUnknown*>& OpenTides::Ports(long count) {
   for (long i = 0; i < count; ++i) ports.push_back(Unknown(i));
   return ports;
 }

@@ -207,17 +207,21 @@ void RunLate(IDispatch* target, const std::vector<LateRow>& rows, Snapshot snaps
 std::vector<TestStation> ThreeStations();
 inline const TestStation kHarbour = {"Harbour", 1200, -300, -1, {{0, 2000, 0}, {36, 1000, 900}, {29, 700, 100}}};
 
-// A station folder, the DLL, and a database open on the folder (which outlives the DLL).
+// A station folder, the DLL, and a database (open unless asked) on the folder, which
+// outlives the DLL.
 struct OpenTides {
   StationFolder folder;
   DllUnderTest dll;
   ITidesDatabase* db = nullptr;
-  explicit OpenTides(const std::vector<TestStation>& stations);
-  ~OpenTides() { ReleaseAndNull(db); }
+  std::vector<IUnknown*> ports;  // held until Finish
+  explicit OpenTides(const std::vector<TestStation>& stations, bool open = true);
+  ~OpenTides() { Finish(); }
   IUnknown* Unknown(long index) const;  // GetPort, REQUIREd to give a port
   ITidesPort* Port(long index) const;
-  std::vector<IUnknown*> Ports(long count) const;
+  const std::vector<IUnknown*>& Ports(long count);  // the first count, into ports
   HRESULT Finish() {
+    for (IUnknown* p : ports) p->Release();
+    ports.clear();
     ReleaseAndNull(db);
     return dll.CanUnloadNow();
   }

@@ -39,12 +39,10 @@ long PortCount(const VARIANT& list) {
 }  // namespace
 
 TEST_CASE("ITidesDatabase before Initialize: every member refuses and writes nothing; bad folders keep it closed") {
-  StationFolder folder(Stations());
-  DllUnderTest dll;
-  ITidesDatabase* db = nullptr;
-  REQUIRE(dll.Create(CLSID_TidesDatabase, &db) == S_OK);
+  OpenTides t(Stations(), false);
+  ITidesDatabase* db = t.db;
   Outs o;
-  const std::wstring good = folder.Path();
+  const std::wstring good = t.folder.Path();
   RunRows({
       {"NumPorts", [&] { return db->get_NumPorts(&o.number); }, E_ACCESSDENIED},
       {"NumPorts(null)", [&] { return db->get_NumPorts(nullptr); }, E_ACCESSDENIED},
@@ -70,8 +68,7 @@ TEST_CASE("ITidesDatabase before Initialize: every member refuses and writes not
   CHECK(InitializeWith(db, good + std::wstring(1, L'\0') + L"junk") == S_OK);
   CHECK(db->get_NumPorts(&o.number) == S_OK);
   CHECK(o.number == kStations);
-  db->Release();
-  CHECK(dll.CanUnloadNow() == S_OK);
+  CHECK(t.Finish() == S_OK);
 }
 
 TEST_CASE("ITidesDatabase after Initialize: null out-pointers, indices and boxes at the extremes") {
@@ -127,10 +124,8 @@ TEST_CASE("ITidesDatabase after Initialize: null out-pointers, indices and boxes
 }
 
 TEST_CASE("ITidesDatabase late bound: argument types, counts and forms as script hosts pass them") {
-  StationFolder folder(Stations());
-  DllUnderTest dll;
-  ITidesDatabase* db = nullptr;
-  REQUIRE(dll.Create(CLSID_TidesDatabase, &db) == S_OK);
+  OpenTides t(Stations(), false);
+  ITidesDatabase* db = t.db;
   auto read = [&] { return Read(db); };
   // A few calls through the type library: refusals come back as exceptions with the
   // method's own result, and nothing of the database changes.
@@ -146,7 +141,7 @@ TEST_CASE("ITidesDatabase late bound: argument types, counts and forms as script
   }, read);
 
   // The folder by reference, as Basic passes a String variable.
-  Variant path = Variant::Bstr(folder.Path());
+  Variant path = Variant::Bstr(t.folder.Path());
   LateCall open(db, kInitialize);
   CHECK(open.Arg(Variant::RefVariant(&path.get())).Result() == S_OK);
 
@@ -179,6 +174,5 @@ TEST_CASE("ITidesDatabase late bound: argument types, counts and forms as script
     REQUIRE(call.Run() == S_OK);
     CHECK(PortCount(call.result) == kStations);
   }
-  db->Release();
-  CHECK(dll.CanUnloadNow() == S_OK);
+  CHECK(t.Finish() == S_OK);
 }

@@ -51,8 +51,8 @@ std::vector<std::pair<HRESULT, double>> Read(ITidesPort* port) {
   keep(port->get_WavePoint(0, &o.value), o.value);
   keep(port->get_WavePoint(last, &o.value), o.value);
   for (const Getter& g : kPointGetters) {
-    if (g.real) keep((port->*g.real)(&o.value), o.value);
-    else keep((port->*g.whole)(&o.number), o.number);
+    const HRESULT hr = Call(port, g, &o);
+    g.real ? keep(hr, o.value) : keep(hr, o.number);
   }
   return f;
 }

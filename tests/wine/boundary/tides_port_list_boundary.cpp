@@ -60,7 +60,7 @@ std::vector<ListRow> Rows(const std::vector<IUnknown*>& p, IUnknown* database) {
 
 TEST_CASE("ITidesPortList SetPortList: every form of list, on a window, answers S_OK and takes only ports") {
   OpenTides t(ThreeStations());
-  const std::vector<IUnknown*> ports = t.Ports(3);
+  const std::vector<IUnknown*>& ports = t.Ports(3);
   HostedControl hosted(t.dll, CLSID_TidesPortList);
   ITidesPortList* list = hosted.Query<ITidesPortList>();
   EventSink sink(DIID__ITidesPortListEvents);
@@ -85,13 +85,12 @@ TEST_CASE("ITidesPortList SetPortList: every form of list, on a window, answers 
   list->Release();
   hosted.Close();
   CHECK(RefCounts(ports) == base);
-  for (IUnknown* p : ports) p->Release();
   CHECK(t.Finish() == S_OK);
 }
 
 TEST_CASE("ITidesPortList without a window: lists are kept, nothing is selected, and Selected checks its pointer") {
   OpenTides t(ThreeStations());
-  const std::vector<IUnknown*> ports = t.Ports(3);
+  const std::vector<IUnknown*>& ports = t.Ports(3);
   ITidesPortList* list = nullptr;
   REQUIRE(t.dll.Create(CLSID_TidesPortList, &list) == S_OK);
   const std::vector<ULONG> base = RefCounts(ports);
@@ -101,13 +100,12 @@ TEST_CASE("ITidesPortList without a window: lists are kept, nothing is selected,
   CHECK(SelectedName(list) == L"<none>");
   list->Release();  // the list's end lets every port go
   CHECK(RefCounts(ports) == base);
-  for (IUnknown* p : ports) p->Release();
   CHECK(t.Finish() == S_OK);
 }
 
 TEST_CASE("ITidesPortList late bound: a GetPorts result passed on as scripts pass it") {
   OpenTides t(ThreeStations());
-  const std::vector<IUnknown*> ports = t.Ports(3);
+  const std::vector<IUnknown*>& ports = t.Ports(3);
   HostedControl hosted(t.dll, CLSID_TidesPortList);
   ITidesPortList* list = hosted.Query<ITidesPortList>();
   const std::vector<ULONG> base = RefCounts(ports);
@@ -133,6 +131,5 @@ TEST_CASE("ITidesPortList late bound: a GetPorts result passed on as scripts pas
   list->Release();
   hosted.Close();
   CHECK(RefCounts(ports) == base);
-  for (IUnknown* p : ports) p->Release();
   CHECK(t.Finish() == S_OK);
 }

@@ -85,7 +85,7 @@ void CheckControl(const DllUnderTest& dll, const CLSID& clsid, const std::functi
 
 TEST_CASE("TidesWindow and TidesPortList: paints, font changes and palette replacements leave the GDI objects") {
   OpenTides t(ThreeStations());
-  const std::vector<IUnknown*> ports = t.Ports(3);
+  const std::vector<IUnknown*>& ports = t.Ports(3);
   SUBCASE("TidesWindow") {
     CheckControl(t.dll, CLSID_TidesWindow, [&](IUnknown* control) {
       ITidesWindow* window = nullptr;
@@ -103,13 +103,12 @@ TEST_CASE("TidesWindow and TidesPortList: paints, font changes and palette repla
       list->Release();
     });
   }
-  for (IUnknown* p : ports) p->Release();
   CHECK(t.Finish() == S_OK);
 }
 
 TEST_CASE("TidesPortList holds one reference per port it keeps: through lists, the window's end and its own") {
   OpenTides t(ThreeStations());
-  const std::vector<IUnknown*> ports = t.Ports(3);
+  const std::vector<IUnknown*>& ports = t.Ports(3);
   const std::vector<ULONG> base = RefCounts(ports);
   auto plus = [&](ULONG a, ULONG b, ULONG c) { return std::vector<ULONG>{base[0] + a, base[1] + b, base[2] + c}; };
   {
@@ -137,6 +136,5 @@ TEST_CASE("TidesPortList holds one reference per port it keeps: through lists, t
     list->Release();  // and the control's end does too
     CHECK(RefCounts(ports) == base);
   }
-  for (IUnknown* p : ports) p->Release();
   CHECK(t.Finish() == S_OK);
 }

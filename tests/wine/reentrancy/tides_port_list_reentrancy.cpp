@@ -23,7 +23,6 @@ struct List {
   HRESULT Finish() {
     ReleaseAndNull(list);
     hosted.Close();
-    for (IUnknown* p : ports) p->Release();
     return tides.Finish();
   }
 };
