@@ -154,14 +154,8 @@ public:
   LateCall(IDispatch* target, DISPID id, WORD flags = DISPATCH_METHOD);
   ~LateCall();
   LateCall(const LateCall&) = delete;
-  LateCall& Arg(Variant value) {
-    args_.push_back(std::move(value));
-    return *this;
-  }
-  LateCall& Interface(const IID& riid) {  // instead of IID_NULL
-    iid_ = riid;
-    return *this;
-  }
+  LateCall& Arg(Variant value) { return args_.push_back(std::move(value)), *this; }
+  LateCall& Interface(const IID& riid) { return iid_ = riid, *this; }  // instead of IID_NULL
   HRESULT Run();
   HRESULT Result() {  // for DISP_E_EXCEPTION, the exception's scode
     const HRESULT hr = Run();
@@ -326,19 +320,14 @@ private:
   ForeignPort() { ++alive_; }
   ~ForeignPort() { --alive_; }
   template <class T>
-  HRESULT Get(T value, T* out) {
-    return Answer(out != nullptr, [&] { *out = value; });
-  }
+  HRESULT Get(T value, T* out) { return Answer(out != nullptr, [&] { *out = value; }); }
   // E_POINTER for a missing pointer, else the set result (written only on success); then
   // the hook, on a copy, touching nothing of the object afterwards.
   template <class F>
   HRESULT Answer(bool pointers, F write, HRESULT refusal = S_OK) {
     const HRESULT hr = !pointers ? E_POINTER : FAILED(refusal) ? refusal : result;
     if (pointers && SUCCEEDED(hr)) write();
-    if (onGet) {
-      const std::function<void()> hook = onGet;
-      hook();
-    }
+    if (onGet) std::function<void()>{onGet}();  // a copy: the hook may end the object
     return hr;
   }
 
