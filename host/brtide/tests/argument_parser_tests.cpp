@@ -73,13 +73,3 @@ TEST_CASE("an extra output's option joins the day command only") {
   WriteUsage(parser.Commands(), parser.Find("day"), help);
   CHECK((help.str().find("[--png FILE]") != std::string::npos && help.str().find("picture of the curve") != std::string::npos));
 }
-
-TEST_CASE("the general help lists both commands with their synopsis") {
-  std::ostringstream help;
-  const std::vector<CommandSpec> commands = BrtideCommands();
-  WriteUsage(commands, nullptr, help);
-  const std::string text = help.str();
-  CHECK(text.find("brtide ports --folder F --box LATMIN LONMIN LATMAX LONMAX") != std::string::npos);
-  CHECK(text.find("brtide day --folder F (--port N | --near LAT LON) --date YYYY-MM-DD [--step H] [--csv]") !=
-        std::string::npos);
-}

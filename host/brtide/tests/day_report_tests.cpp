@@ -90,16 +90,6 @@ TEST_CASE("the day text tells polar days and missing twilight") {
                      "  twilight ends    --:--  (the sun stays above -12\xC2\xB0)"});
 }
 
-TEST_CASE("sun day kinds and twilight follow the published patterns") {
-  CHECK(ClassifySunDay({At(5, 19), At(6, 3), At(18, 10), At(18, 55)}) == SunDayKind::Ordinary);
-  CHECK(ClassifySunDay({At(0, 0), At(0, 0), At(23, 59), At(23, 59)}) == SunDayKind::PolarDay);
-  CHECK(ClassifySunDay({At(0, 0), At(0, 0), At(0, 0), At(0, 0)}) == SunDayKind::PolarNight);
-  const SunTimes ordinary{At(5, 19), At(6, 3), At(18, 10), At(18, 55)};
-  CHECK((HasMorningTwilight(ordinary) && HasEveningTwilight(ordinary)));
-  const SunTimes noEvening{At(4, 1), At(4, 40), At(21, 0), At(21, 0)};
-  CHECK((HasMorningTwilight(noEvening) && !HasEveningTwilight(noEvening)));
-}
-
 TEST_CASE("the nearest-station line gives the distance from the asked position") {
   DayReport day = SampleDay();
   day.askedNear = Position{48.0, -4.5};

@@ -37,11 +37,6 @@ TEST_CASE("positions print in the library's degree-minute format as UTF-8") {
   CHECK(LongitudeText(-270 * kMinute) == "004\xC2\xB0 30'.000 W");
   CHECK(LatitudeText(-33.5) == "33\xC2\xB0 30'.000 S");
   CHECK(LongitudeText(0.0) == "000\xC2\xB0 00'.000 E");
-  for (int minutes = -5400; minutes <= 5400; minutes += 7) {
-    const std::string text = LatitudeText(minutes * kMinute);
-    CAPTURE(minutes);
-    CHECK(text.substr(text.size() - 6, 4) == ".000");
-  }
   CHECK(PositionText({-0.5, 151.25}) == "00\xC2\xB0 30'.000 S  151\xC2\xB0 15'.000 E");
 }
 

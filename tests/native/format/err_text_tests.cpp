@@ -36,15 +36,6 @@ TEST_CASE("source names keep only the file name and extension") {
   }
 }
 
-TEST_CASE("the line offset counts from the operation's first line") {
-  ErrRecord record = SampleRecord();
-  CHECK(LineOffset(record) == 25);
-  record.line = -1;
-  CHECK(LineOffset(record) == -1);
-  record.line = 1240;
-  CHECK(LineOffset(record) == 0);
-}
-
 TEST_CASE("system messages are cut at their first line break") {
   CHECK((FirstLineOf("Unspecified error\r\n") == "Unspecified error" && FirstLineOf("two\nlines") == "two"));
   CHECK((FirstLineOf("") == "" && FirstLineOf(nullptr) == ""));
