@@ -1,8 +1,7 @@
-// The COM frame on a class of its own: interface table, module lock, connection points
-// and firing, the method boundary, class factories and texts.
+// The COM frame on a class of its own: connection points, the method boundary and class
+// factories.
 #include "tests/wine/com/frame_test_object.h"
 
-#include "frame/com/bstr_text.h"
 #include "frame/com/class_factory.h"
 #include "frame/com/module.h"
 #include "tests/wine/common/dll_under_test.h"
@@ -33,70 +32,14 @@ FrameTestObject* NewTestObject() {
   return object;
 }
 
-void FireWith(FrameTestObject* object, long id) {
-  VARIANT v;
-  v.vt = VT_I4;
-  v.lVal = id;
-  object->SetPortList(v);
-}
-
 }  // namespace
 
-TEST_CASE("QueryInterface answers exactly the class's table, with one identity") {
-  ComApartment apartment;
-  FrameTestObject* object = NewTestObject();
-  IUnknown* identity = br::test::Query<IUnknown>(object);
+// QueryInterface, IProvideClassInfo2 and firing are checked on the real classes (the
+// module, control and list suites); texts through station names (the database suite).
 
-  for (const IID* iid : {&IID_ITidesPortList, &IID_IDispatch, &IID_IConnectionPointContainer,
-                         &IID_IProvideClassInfo, &IID_IProvideClassInfo2, &IID_ISupportErrorInfo}) {
-    IUnknown* face = nullptr;
-    REQUIRE(object->QueryInterface(*iid, reinterpret_cast<void**>(&face)) == S_OK);
-    IUnknown* back = br::test::Query<IUnknown>(face);
-    CHECK(back == identity);  // companions hand IUnknown to their owner
-    back->Release();
-    face->Release();
-  }
-  void* none = reinterpret_cast<void*>(1);
-  CHECK(object->QueryInterface(IID_IOleObject, &none) == E_NOINTERFACE);
-  CHECK(none == nullptr);
-  CHECK(object->QueryInterface(IID_IUnknown, nullptr) == E_POINTER);
-
-  // Companions share the owner's count.
-  const ULONG before = br::test::RefCount(identity);
-  IConnectionPointContainer* container = br::test::Query<IConnectionPointContainer>(object);
-  CHECK(br::test::RefCount(identity) == before + 1);
-  container->Release();
-  CHECK(br::test::RefCount(identity) == before);
-
-  identity->Release();
-  object->Release();
-  CHECK(FrameTestObject::live == 0);
-}
-
-TEST_CASE("every live object and enumerator holds one module lock") {
+TEST_CASE("connection point container, point and enumerators; an enumerator holds a lock and its object") {
   ComApartment apartment;
   const LONG base = Module::LockCount();
-  FrameTestObject* a = NewTestObject();
-  FrameTestObject* b = NewTestObject();
-  CHECK(Module::LockCount() == base + 2);
-
-  IConnectionPointContainer* container = br::test::Query<IConnectionPointContainer>(a);
-  IEnumConnectionPoints* points = nullptr;
-  REQUIRE(container->EnumConnectionPoints(&points) == S_OK);
-  container->Release();
-  CHECK(Module::LockCount() == base + 3);
-
-  a->Release();  // the enumerator's point still holds the object
-  CHECK(FrameTestObject::live == 2);
-  points->Release();
-  CHECK(FrameTestObject::live == 1);
-  b->Release();
-  CHECK(FrameTestObject::live == 0);
-  CHECK(Module::LockCount() == base);
-}
-
-TEST_CASE("connection point container, point and enumerators") {
-  ComApartment apartment;
   FrameTestObject* object = NewTestObject();
   IConnectionPointContainer* container = br::test::Query<IConnectionPointContainer>(object);
 
@@ -107,6 +50,7 @@ TEST_CASE("connection point container, point and enumerators") {
 
   IEnumConnectionPoints* points = nullptr;
   REQUIRE(container->EnumConnectionPoints(&points) == S_OK);
+  CHECK(Module::LockCount() == base + 2);
   IConnectionPoint* got[2] = {};
   ULONG fetched = 0;
   CHECK(points->Next(2, got, &fetched) == S_FALSE);
@@ -126,7 +70,6 @@ TEST_CASE("connection point container, point and enumerators") {
   CHECK(points->Clone(&clone) == S_OK);
   CHECK(clone->Next(1, got, nullptr) == S_FALSE);
   clone->Release();
-  points->Release();
 
   IConnectionPoint* point = nullptr;
   REQUIRE(container->FindConnectionPoint(DIID__ITidesPortListEvents, &point) == S_OK);
@@ -159,47 +102,12 @@ TEST_CASE("connection point container, point and enumerators") {
   CHECK(first.References() == 0);
   point->Release();
   container->Release();
-  object->Release();
+  object->Release();  // the enumerator's point still holds the object
+  CHECK(FrameTestObject::live == 1);
+  points->Release();
   CHECK(FrameTestObject::live == 0);
+  CHECK(Module::LockCount() == base);
 }
-
-TEST_CASE("events reach every sink in order as a method call with the user-default locale") {
-  ComApartment apartment;
-  FrameTestObject* object = NewTestObject();
-  EventSink a(DIID__ITidesPortListEvents), b(DIID__ITidesPortListEvents);
-  REQUIRE(a.Connect(object));
-  REQUIRE(b.Connect(object));
-  std::string order;
-  a.onCall = [&] { order += 'a'; };
-  b.onCall = [&] { order += 'b'; };
-
-  FireWith(object, 7);
-  CHECK(order == "ab");
-  CHECK(a.calls == 1);
-  CHECK(b.calls == 1);
-  CHECK(a.lastId == 7);
-  CHECK(a.lastIidNull);
-  CHECK(a.lastLocale == 0x400);
-  CHECK(a.lastFlags == DISPATCH_METHOD);
-  CHECK(a.lastArgumentCount == 0);
-
-  VARIANT value;
-  value.vt = VT_R8;
-  value.dblVal = 2.5;
-  object->SetPortList(value);
-  REQUIRE(b.lastDoubles.size() == 1);
-  CHECK(b.lastDoubles[0] == 2.5);
-
-  a.Disconnect();
-  FireWith(object, 1);
-  CHECK(a.calls == 2);
-  CHECK(b.calls == 3);
-  b.Disconnect();
-  object->Release();
-}
-
-// Sinks that disconnect, connect or release the source inside a call: the re-entrancy
-// suite, through TidesPort's Calculated.
 
 TEST_CASE("the method boundary turns every thrown value into an HRESULT with error information") {
   ComApartment apartment;
@@ -247,23 +155,6 @@ TEST_CASE("the method boundary turns every thrown value into an HRESULT with err
   CHECK(support->InterfaceSupportsErrorInfo(IID_ITidesPortList) == S_OK);
   CHECK(support->InterfaceSupportsErrorInfo(IID_IDispatch) == S_FALSE);
   support->Release();
-  object->Release();
-}
-
-TEST_CASE("IProvideClassInfo2 names the default source interface") {
-  ComApartment apartment;
-  FrameTestObject* object = NewTestObject();
-  IProvideClassInfo2* info = br::test::Query<IProvideClassInfo2>(object);
-  GUID guid = {};
-  CHECK(info->GetGUID(GUIDKIND_DEFAULT_SOURCE_DISP_IID, &guid) == S_OK);
-  CHECK(IsEqualIID(guid, DIID__ITidesPortListEvents));
-  CHECK(info->GetGUID(GUIDKIND_DEFAULT_SOURCE_DISP_IID + 1, &guid) == E_INVALIDARG);
-  CHECK(info->GetGUID(GUIDKIND_DEFAULT_SOURCE_DISP_IID, nullptr) == E_POINTER);
-  // This program has no type library, so the coclass type info is refused, not invented.
-  ITypeInfo* type = reinterpret_cast<ITypeInfo*>(1);
-  CHECK(FAILED(info->GetClassInfo(&type)));
-  CHECK(type == nullptr);
-  info->Release();
   object->Release();
 }
 
@@ -318,30 +209,4 @@ TEST_CASE("class factory: lock rule, aggregation, creation failures") {
   list->Release();
   CHECK(Module::LockCount() == base);
   factory->Release();
-}
-
-TEST_CASE("texts: ANSI code page inside, BSTR at the boundary") {
-  using namespace br::com;
-  CHECK(AnsiFromBstr(nullptr).empty());
-  BstrHolder empty(BstrFromAnsi(""));
-  REQUIRE(empty.Get() != nullptr);
-  CHECK(SysStringLen(empty.Get()) == 0);
-
-  const std::string name = "Saint-Malo";
-  BstrHolder text(BstrFromAnsi(name));
-  CHECK(std::wstring(text.Get()) == L"Saint-Malo");
-  CHECK(AnsiFromBstr(text.Get()) == name);
-
-  // A character of the upper half goes through the code page both ways.
-  const std::string accented = "Br\xE9st";  // e acute in the Western code pages
-  if (GetACP() == 1252) {
-    BstrHolder wide(BstrFromAnsi(accented));
-    CHECK(std::wstring(wide.Get()) == L"Br\u00E9st");
-    CHECK(AnsiFromBstr(wide.Get()) == accented);
-  }
-  // Embedded zeros survive.
-  const std::string withZero("a\0b", 3);
-  BstrHolder zero(BstrFromAnsi(withZero));
-  CHECK(SysStringLen(zero.Get()) == 3);
-  CHECK(AnsiFromBstr(zero.Get()) == withZero);
 }

@@ -134,15 +134,11 @@ TEST_CASE("late binding goes through the type library") {
   info->ReleaseTypeAttr(attributes);
   info->Release();
 
-  const wchar_t* names[] = {L"Initialize", L"NumPorts", L"GetPortInfo", L"GetPort", L"GetPorts"};
-  for (DISPID expected = 1; expected <= 5; ++expected) {
-    LPOLESTR name = const_cast<LPOLESTR>(names[expected - 1]);
-    DISPID id = 0;
-    CHECK(database->GetIDsOfNames(IID_NULL, &name, 1, 0, &id) == S_OK);
-    CHECK(id == expected);
-  }
-  LPOLESTR unknownName = const_cast<LPOLESTR>(L"NoSuchMember");
+  LPOLESTR name = const_cast<LPOLESTR>(L"NumPorts");
   DISPID id = 0;
+  CHECK(database->GetIDsOfNames(IID_NULL, &name, 1, 0, &id) == S_OK);
+  CHECK(id == 2);
+  LPOLESTR unknownName = const_cast<LPOLESTR>(L"NoSuchMember");
   CHECK(database->GetIDsOfNames(IID_NULL, &unknownName, 1, 0, &id) == DISP_E_UNKNOWNNAME);
   CHECK(database->GetIDsOfNames(IID_ITidesDatabase, &unknownName, 1, 0, &id) == DISP_E_UNKNOWNINTERFACE);
 
