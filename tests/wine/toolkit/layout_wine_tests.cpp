@@ -9,7 +9,6 @@
 #include "toolkit/core/Panel.h"
 #include "toolkit/layout/BorderLayout.h"
 #include "toolkit/layout/GridLayout.h"
-#include "toolkit/layout/SplitterLayout.h"
 
 using namespace toolkit;
 using namespace tktest;
@@ -57,22 +56,6 @@ TEST_CASE("border: two \"North\" children side by side, the region as high as th
   CHECK_PLACED(w, 0, 30, 60, 245);
   CHECK_PLACED(e, 365, 30, 35, 245);
   CHECK_PLACED(c, 60, 30, 305, 245);
-}
-
-TEST_CASE("splitter: an unset split divides nothing; initializeSplit measures the panes") {
-  Tree t(std::make_unique<SplitterLayout>(kSplitStacked, 10), 100, 200);
-  Probe& a = t.add(30, 40);
-  Probe& b = t.add(30, 70);
-  t.root.doLayout();
-  CHECK_PLACED(a, 0, 0, 100, 95);
-  CHECK_PLACED(b, 0, 105, 100, 95);
-  t.root.initializeSplit();
-  CHECK(t.root.getLayout()->splitNumerator == 45);
-  CHECK(t.root.getLayout()->splitDenominator == 120);
-  t.root.setBounds(0, 0, 100, 240, true, true);
-  t.root.doLayout();
-  CHECK_PLACED(a, 0, 0, 100, 85);
-  CHECK_PLACED(b, 0, 95, 100, 145);
 }
 
 TEST_CASE("insets shrink the area; nested visible containers are laid out in the same pass") {
@@ -140,21 +123,4 @@ TEST_CASE("a batch the platform refuses falls back to immediate moves for the re
   CHECK_PLACED(a, 0, 0, 100, 60);
   CHECK_PLACED(b, 100, 0, 100, 60);
   CHECK_PLACED(c, 200, 0, 100, 60);
-}
-
-TEST_CASE("the layout slots can be driven directly; a null batch moves at once") {
-  Tree t(std::make_unique<BorderLayout>(2, 2), 300, 200);
-  Probe& n = t.add(10, 30, "North");
-  HDWP none = nullptr;
-  SIZE used = t.root.layoutBorderRegion(RECT{0, 0, 300, 200}, kRegionNorth, true, none);
-  CHECK(str(used) == "300x30");
-  CHECK_PLACED(n, 0, 0, 300, 30);
-  used = t.root.layoutBorderRegion(RECT{0, 50, 300, 200}, kRegionNorth, false, none);
-  CHECK_PLACED(n, 0, 0, 300, 30);
-  used = t.root.layoutGrid(RECT{0, 0, 60, 40}, false, none);
-  CHECK(str(used) == "60x40");
-  // The tab slot needs a TabLayout; with another layout it does nothing.
-  used = t.root.layoutTabs(RECT{0, 0, 60, 40}, none);
-  CHECK(used.cx == 0);
-  CHECK(n.isVisible());
 }
