@@ -10,17 +10,16 @@ using br::tides::graph::FormatValueLabel;
 using br::tides::graph::IsValueLabelFormat;
 
 TEST_CASE("label formats with one floating conversion are accepted") {
-  for (const char* format : {"%.2f", "%f", "%F", "%e", "%E", "%g", "%G", "%a", "%A", "%.f", "%+08.3f m",
-                             "Level: %-10.1e", "%% %.1f %%", "% f", "%#g", "%999.999f", "%0-+ #5.1f"}) {
+  for (const char* format : {"%.2f", "%A", "%.f", "Level: %-10.1e", "%% %.1f %%", "%999.999f", "%0-+ #5.1f"}) {
     CAPTURE(format);
     CHECK(IsValueLabelFormat(format));
   }
 }
 
 TEST_CASE("label formats that could read or write the wrong memory are refused") {
-  for (const char* format : {"", "%s", "%n", "%d", "%i", "%x", "%c", "%p", "%lf", "%Lf", "%hf", "%.2f %.2f",
-                             "%f%n", "%", "abc%", "%5", "%.2", "no conversion", "%%", "%%f", "%*f", "%.*f",
-                             "%1000f", "%.1000f", "%'f", "%1$f", "%-", "%+.2"}) {
+  // One row per way a format is refused; the label_format fuzz harness judges accepted ones by glibc.
+  for (const char* format : {"", "%s", "%n", "%lf", "%.2f %.2f", "abc%", "%.2", "%%f", "%*f", "%.*f", "%1000f",
+                             "%.1000f", "%'f", "%1$f"}) {
     CAPTURE(format);
     CHECK_FALSE(IsValueLabelFormat(format));
   }

@@ -41,12 +41,9 @@ TEST_CASE("system messages are cut at their first line break") {
   CHECK((FirstLineOf("") == "" && FirstLineOf(nullptr) == ""));
 }
 
-TEST_CASE("the log line has every field in its place") {
+// The plain failure's line and box are the Wine errors suite's, through the reporter.
+TEST_CASE("the log line with no line, a code, a text and no system text") {
   ErrRecord record = SampleRecord();
-  CHECK(FormatErrLogLine(record, SampleContext("Unspecified error")) ==
-        "ERR: 05.03.2024 14:07 file:XChartLegend.cpp(1265) CXChartLegend::SetLegendData "
-        "line:25 code:20000000 text:'(null)' thread:36 hres:0x80004005(Unspecified error) \n");
-
   record.line = -1;
   record.code = 0x1234abcd;
   record.text = "extra";
@@ -66,9 +63,6 @@ TEST_CASE("the log line is not limited in length") {
 
 TEST_CASE("the box text, with the record's text on a line of its own, at most 511 characters") {
   ErrRecord record = SampleRecord();
-  CHECK(FormatErrBoxText(record, SampleContext("Unspecified error")) ==
-        "XChartLegend.cpp(1265) CXChartLegend::SetLegendData line:25 code:20000000 "
-        "hres:0x80004005(Unspecified error)");
   record.text = "";
   CHECK(FormatErrBoxText(record, SampleContext(nullptr)).find('\n') == std::string::npos);
   record.text = "more";

@@ -15,20 +15,11 @@ using namespace br::tidefiles;
 using namespace br::tidefiles::test;
 namespace bt = br::tides;
 
-TEST_CASE("fields are rounded to whole minutes, millimetres and tenths of a degree") {
-  CHECK((WholeMinutes(50.103) == 3006 && WholeMinutes(-10.5) == -630 && WholeMinutes(-5.25) == -315));
-  CHECK(WholeMinutes(180.0) == 10800);
-  const struct {
-    double metres;
-    int field;
-    bool clipped;
-  } amplitudes[] = {{1.7116, 1712, false}, {65.535, 65535, false}, {65.536, 65535, true}, {1e300, 65535, true}};
-  for (const auto& a : amplitudes) {
-    bool clipped = !a.clipped;
-    CHECK(AmplitudeField(a.metres, clipped) == a.field);
-    CHECK(clipped == a.clipped);
-  }
-  const std::pair<double, int> phases[] = {{133.71, 1337}, {-5.0, 3550}, {359.96, 0}, {720.04, 0}, {-0.04, 0}};
+// Positions and amplitudes are rounded and clipped in the station-block and clipping cases below.
+TEST_CASE("phases are stored in tenths of a degree within one turn") {
+  bool clipped = false;
+  CHECK((AmplitudeField(65.535, clipped) == 65535 && !clipped));  // the largest that fits
+  const std::pair<double, int> phases[] = {{-5.0, 3550}, {359.96, 0}, {720.04, 0}, {-0.04, 0}};
   for (const auto& [degrees, field] : phases) CHECK(PhaseField(degrees) == field);
   CHECK(PhaseField(1e18) < 3600);
 }

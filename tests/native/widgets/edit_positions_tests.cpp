@@ -1,50 +1,15 @@
+// The caret places and the default masks' read-back are checked through the edit (edit_types,
+// edit_model); here the read-back of other masks and of date pictures.
 #include <doctest/doctest.h>
 
 #include "frame/format/CoordFormat.h"
 #include "toolkit/widgets/edit/CoordText.h"
 #include "toolkit/widgets/edit/EditTypes.h"
-#include "toolkit/widgets/edit/EditPositions.h"
 #include "toolkit/widgets/edit/MonthPicture.h"
 
 using namespace toolkit;
 
-TEST_CASE("caret places of free, masked, coordinate and date fields") {
-  SUBCASE("free text: every place from 0 to the length") {
-    EditPositions places(kEditText, "", "abc");
-    CHECK_FALSE(places.restricted());
-    CHECK((places.editable(0) && places.editable(3) && !places.editable(4)));
-    CHECK(places.settle(9, true) == 3);
-  }
-  SUBCASE("masked text: the 9s and a '-' at position 0 only") {
-    EditPositions places(kEditText, "-99-99", " 12-34");
-    CHECK((places.restricted() && places.editable(0) && places.editable(1)));
-    CHECK_FALSE(places.editable(3));  // a '-' elsewhere is a copied character
-    CHECK((places.first() == 0 && places.last() == 5 && places.nextAfter(2) == 4 && places.previousBefore(4) == 2));
-    CHECK((places.settle(3, true) == 4 && places.settle(3, false) == 2));
-  }
-  SUBCASE("coordinates: the mask letters") {
-    const std::string text = FormatCoord(kDefaultLatitudeMask, kEditLatitude, -12.5);
-    EditPositions places(kEditLatitude, kDefaultLatitudeMask, text);
-    for (int at = 0; at <= 10; ++at) CHECK(places.editable(at) == (at != 2 && at != 5 && at != 9));  // ° . '
-    CHECK((places.coordinateRole(10) == '$' && places.coordinateRole(6) == 'm' && places.last() == 10));
-  }
-  SUBCASE("dates: the digits of the text") {
-    EditPositions places(kEditMonth, "MM-yyyy", "05-2024");
-    CHECK((places.editable(1) && !places.editable(2) && places.nextAfter(1) == 3));
-  }
-  SUBCASE("a restricted field without any such place settles on 0") {
-    EditPositions places(kEditText, "ab", "ab");
-    CHECK((places.first() == -1 && places.settle(1, true) == 0));
-  }
-}
-
 TEST_CASE("coordinate text read back by its mask") {
-  SUBCASE("the default masks") {
-    CHECK(CoordText::parse(kDefaultLatitudeMask, kEditLatitude, "12\xB0" "30.000'S") == doctest::Approx(-12.5));
-    CHECK(CoordText::parse(kDefaultLongitudeMask, kEditLongitude, "004\xB0" "05.250'W") ==
-          doctest::Approx(-4.0875));
-    CHECK(CoordText::parse(kDefaultLatitudeMask, kEditLatitude, "00\xB0" "00.000'N") == 0.0);
-  }
   SUBCASE("round trip through FormatCoord for several masks") {
     const char* masks[] = {kDefaultLatitudeMask, "DD\xB0MM'.mm $", "DD MM SS.ss $", "DD.dddd$"};
     for (const char* mask : masks) {
