@@ -137,17 +137,6 @@ TEST_CASE("bounds setters move the window and keep the bounds field") {
   c.setLocation(40, 40);
   CHECK(str(placed(c)) == str(xywh(1, 1, 0, 10)));
 
-  // deferBounds with no batch moves at once.
-  HDWP none = nullptr;
-  c.deferBounds(none, 12, 14, 16, 18);
-  CHECK(str(placed(c)) == str(xywh(12, 14, 16, 18)));
-  CHECK(str(c.bounds()) == str(xywh(12, 14, 16, 18)));
-  HDWP batch = BeginDeferWindowPos(1);
-  c.deferBounds(batch, 22, 24, 26, 28);
-  CHECK(batch != nullptr);
-  EndDeferWindowPos(batch);
-  CHECK(str(placed(c)) == str(xywh(22, 24, 26, 28)));
-
   CHECK(c.modifyStyle(0, WS_BORDER, SWP_FRAMECHANGED));
   CHECK((c.getStyle() & WS_BORDER) != 0);
   CHECK_FALSE(c.modifyStyle(0, WS_BORDER, 0));
