@@ -88,7 +88,6 @@ void BoxPresser::Run() {
     Sleep(100);  // let the box finish its set-up before it is looked at
     SeenBox seen;
     EnumChildWindows(box, CollectText, reinterpret_cast<LPARAM>(&seen.text));
-    seen.topmost = (GetWindowLongA(box, GWL_EXSTYLE) & WS_EX_TOPMOST) != 0;
     seen.hasAbortRetryIgnore = GetDlgItem(box, IDABORT) && GetDlgItem(box, IDRETRY) &&
                                GetDlgItem(box, IDIGNORE);
     HICON icon = nullptr;

@@ -13,7 +13,6 @@
 
 struct SeenBox {
   std::string text;
-  bool topmost = false;
   bool hasAbortRetryIgnore = false;
   bool errorIcon = false;
   std::string note;  // whatever the per-box check wants to remember
