@@ -67,7 +67,6 @@ public:
   static Variant R8(double x) { return Make(VT_R8, [=](VARIANT& v) { v.dblVal = x; }); }
   static Variant Date(double x) { return Make(VT_DATE, [=](VARIANT& v) { v.date = x; }); }
   static Variant Bool(bool x) { return Make(VT_BOOL, [=](VARIANT& v) { v.boolVal = x ? -1 : 0; }); }
-  static Variant Error(SCODE x) { return Make(VT_ERROR, [=](VARIANT& v) { v.scode = x; }); }
   static Variant NullBstr() { return Make(VT_BSTR, [](VARIANT& v) { v.bstrVal = nullptr; }); }
   static Variant Bstr(const std::wstring& text) {  // embedded zeros kept
     return Make(VT_BSTR, [&](VARIANT& v) {
@@ -172,30 +171,6 @@ private:
   IID iid_ = IID_NULL;
   std::vector<Variant> args_;
 };
-
-struct LateRow {
-  std::string what;
-  DISPID id;
-  WORD flags;
-  std::function<void(LateCall&)> build;
-  HRESULT expected;
-  HRESULT onWine = E_UNEXPECTED;  // where Wine's type-library dispatch answers otherwise
-};
-
-// Runs each row through Invoke as a Row (the result: the exception's scode for
-// DISP_E_EXCEPTION; the Wine answer, where given, counts as the expected one).
-template <class Snapshot>
-void RunLate(IDispatch* target, const std::vector<LateRow>& rows, Snapshot snapshot) {
-  std::vector<Row> calls;
-  for (const LateRow& r : rows)
-    calls.push_back({r.what, [target, &r] {
-                       LateCall call(target, r.id, r.flags);
-                       if (r.build) r.build(call);
-                       const HRESULT result = call.Result();
-                       return result == r.onWine ? r.expected : result;
-                     }, r.expected});
-  RunRows(calls, snapshot);
-}
 
 // Three stations whose name order (Alpha, Bravo, Charlie) is not their file order.
 std::vector<TestStation> ThreeStations();

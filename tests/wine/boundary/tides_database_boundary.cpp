@@ -47,22 +47,16 @@ TEST_CASE("ITidesDatabase before Initialize: every member refuses and writes not
       {"NumPorts", [&] { return db->get_NumPorts(&o.number); }, E_ACCESSDENIED},
       {"NumPorts(null)", [&] { return db->get_NumPorts(nullptr); }, E_ACCESSDENIED},
       {"GetPortInfo(0)", [&] { return db->GetPortInfo(0, &o.value, &o.second, &o.name); }, E_ACCESSDENIED},
-      {"GetPortInfo(-1, null, null, null)", [&] { return db->GetPortInfo(-1, nullptr, nullptr, nullptr); },
-       E_ACCESSDENIED},
       {"GetPort(0)", [&] { return db->GetPort(0, &o.unknown); }, E_ACCESSDENIED},
-      {"GetPort(0, null)", [&] { return db->GetPort(0, nullptr); }, E_ACCESSDENIED},
       {"GetPorts(world)", [&] { return db->GetPorts(-90, -180, 90, 180, &o.variant); }, E_ACCESSDENIED},
-      {"GetPorts(null)", [&] { return db->GetPorts(-90, -180, 90, 180, nullptr); }, E_ACCESSDENIED},
       {"Initialize(null BSTR)", [&] { return db->Initialize(nullptr); }, E_INVALIDARG},
       {"Initialize(empty text)", [&] { return InitializeWith(db, L""); }, E_INVALIDARG},
       {"Initialize(241 characters)",
        [&] { return InitializeWith(db, good + L"\\" + std::wstring(240 - good.size(), L'x')); }, E_INVALIDARG},
-      {"Initialize(100000 characters)", [&] { return InitializeWith(db, std::wstring(100000, L'a')); }, E_INVALIDARG},
       {"Initialize(missing folder)", [&] { return InitializeWith(db, good + L"\\missing"); }, E_INVALIDARG},
       {"Initialize(a station file)", [&] { return InitializeWith(db, good + L"\\td_num.ntx"); }, E_INVALIDARG},
       {"Initialize(outside the ANSI code page)", [&] { return InitializeWith(db, good + L"\x6771\x4eac"); },
        E_INVALIDARG},
-      {"Initialize(only separators)", [&] { return InitializeWith(db, L"\\\\\\"); }, E_INVALIDARG},
   }, [&] { return Read(db); }, &o);
   // A zero inside ends the folder text, as the file functions read it (Basic buffers).
   CHECK(InitializeWith(db, good + std::wstring(1, L'\0') + L"junk") == S_OK);
@@ -90,30 +84,23 @@ TEST_CASE("ITidesDatabase after Initialize: null out-pointers, indices and boxes
       // Null out-pointers come before the index check.
       {"NumPorts(null)", [&] { return db->get_NumPorts(nullptr); }, E_POINTER},
       {"GetPortInfo(lat null)", [&] { return db->GetPortInfo(0, nullptr, &o.second, &o.name); }, E_POINTER},
-      {"GetPortInfo(lon null)", [&] { return db->GetPortInfo(0, &o.value, nullptr, &o.name); }, E_POINTER},
       {"GetPortInfo(-1, null, null)", [&] { return db->GetPortInfo(-1, nullptr, nullptr, &o.name); }, E_POINTER},
       {"GetPort(-1, null)", [&] { return db->GetPort(-1, nullptr); }, E_POINTER},
       {"GetPorts(NaN, null)", [&] { return db->GetPorts(n, n, n, n, nullptr); }, E_POINTER},
       {"GetPortInfo(-1)", [&] { return info(-1); }, E_INVALIDARG},
       {"GetPortInfo(count)", [&] { return info(kStations); }, E_INVALIDARG},
-      {"GetPortInfo(LONG_MAX)", [&] { return info(LONG_MAX); }, E_INVALIDARG},
       {"GetPortInfo(LONG_MIN)", [&] { return info(LONG_MIN); }, E_INVALIDARG},
       {"GetPortInfo(65537)", [&] { return info(65537); }, E_INVALIDARG},
       {"GetPortInfo(1) without a name", [&] { return db->GetPortInfo(1, &o.value, &o.second, nullptr); }, S_OK,
        [&] { return o.value == Degrees(-630) && o.second == Degrees(-315) && o.name == o.marker; }},
       {"GetPort(-1)", [&] { return db->GetPort(-1, &o.unknown); }, S_OK, portIsNull},
       {"GetPort(count)", [&] { return db->GetPort(kStations, &o.unknown); }, S_OK, portIsNull},
-      {"GetPort(LONG_MIN)", [&] { return db->GetPort(LONG_MIN, &o.unknown); }, S_OK, portIsNull},
       {"GetPort(65536)", [&] { return db->GetPort(65536, &o.unknown); }, S_OK, portIsNull},
       // NaN in any corner compares false everywhere: nothing is inside.
       {"GetPorts(NaN latMin)", [&] { return box(n, -180, 90, 180); }, S_OK, ports(0)},
-      {"GetPorts(NaN lonMin)", [&] { return box(-90, n, 90, 180); }, S_OK, ports(0)},
-      {"GetPorts(NaN latMax)", [&] { return box(-90, -180, n, 180); }, S_OK, ports(0)},
       {"GetPorts(NaN lonMax)", [&] { return box(-90, -180, 90, n); }, S_OK, ports(0)},
       {"GetPorts(infinite box)", [&] { return box(-inf, -inf, inf, inf); }, S_OK, ports(kStations)},
       {"GetPorts(infinite box swapped)", [&] { return box(inf, inf, -inf, -inf); }, S_OK, ports(kStations)},
-      {"GetPorts(largest doubles)", [&] { return box(-kLargest, -kLargest, kLargest, kLargest); }, S_OK,
-       ports(kStations)},
       {"GetPorts(one point on a station)", [&] { return box(0, 0, 0, 0); }, S_OK, ports(0)},
       {"GetPorts(denormal box)", [&] { return box(-tiny, -tiny, tiny, tiny); }, S_OK, ports(1)},
       // Once open, later folders are ignored, whatever they are.
@@ -123,21 +110,18 @@ TEST_CASE("ITidesDatabase after Initialize: null out-pointers, indices and boxes
   CHECK(t.Finish() == S_OK);
 }
 
-TEST_CASE("ITidesDatabase late bound: argument types, counts and forms as script hosts pass them") {
+TEST_CASE("ITidesDatabase late bound: the method's own answers and the forms script hosts pass") {
   OpenTides t(Stations(), false);
   ITidesDatabase* db = t.db;
   auto read = [&] { return Read(db); };
-  // A few calls through the type library: refusals come back as exceptions with the
-  // method's own result, and nothing of the database changes.
-  RunLate(db, {
-      {"Initialize(VT_I4 5)", kInitialize, DISPATCH_METHOD, [](LateCall& c) { c.Arg(Variant::I4(5)); }, E_INVALIDARG},
-      {"Initialize(VT_NULL)", kInitialize, DISPATCH_METHOD, [](LateCall& c) { c.Arg(Variant::Null()); },
-       DISP_E_TYPEMISMATCH},
-      {"Initialize()", kInitialize, DISPATCH_METHOD, nullptr, DISP_E_BADPARAMCOUNT},
-      {"NumPorts", kNumPorts, DISPATCH_PROPERTYGET, nullptr, E_ACCESSDENIED},
-      {"unknown member 99", 99, DISPATCH_METHOD, nullptr, DISP_E_MEMBERNOTFOUND},
-      {"interface other than IID_NULL", kNumPorts, DISPATCH_PROPERTYGET,
-       [](LateCall& c) { c.Interface(IID_ITidesDatabase); }, DISP_E_UNKNOWNINTERFACE},
+  // Through the type library the method's refusal comes back as the exception's scode;
+  // an interface other than IID_NULL is refused before it.
+  RunRows({
+      {"Initialize(VT_I4 5)", [&] { return LateCall(db, kInitialize).Arg(Variant::I4(5)).Result(); }, E_INVALIDARG},
+      {"NumPorts", [&] { return LateCall(db, kNumPorts, DISPATCH_PROPERTYGET).Result(); }, E_ACCESSDENIED},
+      {"interface other than IID_NULL",
+       [&] { return LateCall(db, kNumPorts, DISPATCH_PROPERTYGET).Interface(IID_ITidesDatabase).Result(); },
+       DISP_E_UNKNOWNINTERFACE},
   }, read);
 
   // The folder by reference, as Basic passes a String variable.
@@ -147,23 +131,9 @@ TEST_CASE("ITidesDatabase late bound: argument types, counts and forms as script
 
   double latitude = kUntouchedDouble, longitude = kUntouchedDouble;
   BSTR name = nullptr;
-  auto info = [&](double index) {
-    return [&, index](LateCall& c) {
-      c.Arg(Variant::R8(index)).Arg(Variant::RefR8(&latitude)).Arg(Variant::RefR8(&longitude));
-      c.Arg(Variant::RefBstr(&name));
-    };
-  };
-  // Wine's dispatch turns NaN into a number where a long is wanted.
-  RunLate(db, {
-      {"NumPorts as a method", kNumPorts, DISPATCH_METHOD | DISPATCH_PROPERTYGET, nullptr, S_OK},
-      {"GetPortInfo(NaN)", kGetPortInfo, DISPATCH_METHOD, info(kNaN), DISP_E_OVERFLOW, E_INVALIDARG},
-      {"GetPortInfo(-1)", kGetPortInfo, DISPATCH_METHOD, info(-1), E_INVALIDARG},
-      {"GetPort(\"1\")", kGetPort, DISPATCH_METHOD, [](LateCall& c) { c.Arg(Variant::Bstr(L"1")); }, S_OK},
-      {"GetPort(an object)", kGetPort, DISPATCH_METHOD, [&](LateCall& c) { c.Arg(Variant::Dispatch(db)); },
-       DISP_E_TYPEMISMATCH},
-      {"GetPorts(NaN corners)", kGetPorts, DISPATCH_METHOD,
-       [](LateCall& c) { for (int i = 0; i < 4; ++i) c.Arg(Variant::R8(kNaN)); }, S_OK},
-  }, read);
+  LateCall info(db, kGetPortInfo);
+  info.Arg(Variant::R8(-1)).Arg(Variant::RefR8(&latitude)).Arg(Variant::RefR8(&longitude)).Arg(Variant::RefBstr(&name));
+  CHECK(info.Result() == E_INVALIDARG);
   CHECK(latitude == kUntouchedDouble);
   CHECK(longitude == kUntouchedDouble);
   CHECK(name == nullptr);

@@ -14,7 +14,7 @@ using namespace br::test::boundary;
 namespace {
 
 constexpr int kWidth = 300, kHeight = 200;
-enum DispId : DISPID { kSetPort = 1, kCalculate, kProperty = 4 };
+constexpr DISPID kProperty = 4;
 
 struct Graph {
   OpenTides tides{{kHarbour}};
@@ -77,7 +77,6 @@ TEST_CASE("ITidesWindow Property and IUnitsOption: wrong codes, types, by-refere
   LONG drawText = 1;
   BSTR format = SysAllocString(L"%.1f");
   std::vector<Row> rows = {
-      {"put code -1", [&] { return Put(w, static_cast<TW_PROPERTY>(-1), Variant::Bstr(L"%f")); }, E_INVALIDARG},
       {"DRAWTEXT VT_BSTR \"0\"", [&] { return Put(w, TW_DRAWTEXT, Variant::Bstr(L"0")); }, E_INVALIDARG},
       {"FORMATTEXT VT_I4", [&] { return Put(w, TW_FORMATTEXT, Variant::I4(2)); }, E_INVALIDARG},
       {"get with a null out-pointer", [&] { return w->get_Property(TW_DRAWTEXT, nullptr); }, E_INVALIDARG},
@@ -98,27 +97,22 @@ TEST_CASE("ITidesWindow Property and IUnitsOption: wrong codes, types, by-refere
   // Types neither property takes, by-reference forms of the ones they take included.
   const std::pair<const char*, std::function<Variant()>> wrong[] = {
       {"VT_EMPTY", [] { return Variant::Empty(); }},
-      {"VT_NULL", [] { return Variant::Null(); }},
       {"VT_R8 0", [] { return Variant::R8(0); }},
       {"VT_BOOL false", [] { return Variant::Bool(false); }},
-      {"VT_ERROR", [] { return Variant::Error(DISP_E_PARAMNOTFOUND); }},
       {"VT_BYREF|VT_I4", [&] { return Variant::RefI4(&drawText); }},
       {"VT_BYREF|VT_BSTR", [&] { return Variant::RefBstr(&format); }},
       {"VT_ARRAY|VT_I4", [] { return Variant::Array(VT_I4, MakeLongArray({0})); }},
-      {"VT_ARRAY|VT_BSTR", [] { return Variant::Array(VT_BSTR, MakeArray(VT_BSTR, {{1, 0}})); }},
       {"VT_DISPATCH null", [] { return Variant::Dispatch(nullptr); }},
   };
   for (TW_PROPERTY code : {TW_DRAWTEXT, TW_FORMATTEXT})
     for (const auto& [what, make] : wrong)
       rows.push_back({std::to_string(code) + " " + what, [=, &make] { return Put(w, code, make()); }, E_INVALIDARG});
-  for (int code : {0, 3, INT_MAX})
+  for (int code : {-1, 3, INT_MAX})
     rows.push_back({"put code " + std::to_string(code),
                     [=] { return Put(w, static_cast<TW_PROPERTY>(code), Variant::I4(0)); }, E_INVALIDARG});
-  // Formats that would make printf read or write what it should not.
-  for (const std::wstring& bad : {std::wstring(L"%s"), std::wstring(L"%n%f"), std::wstring(L"%f to %f"),
-                                  std::wstring(L"%.2f %"), std::wstring(L"%*f"), std::wstring(L"%1000f"),
-                                  std::wstring(L"%.1000f"), std::wstring(L"%Lf"), std::wstring(L"%d"),
-                                  std::wstring(L"%I64d"), std::wstring(L"%.2f") + L'\0' + L"%s"})
+  // Formats that would make printf read or write what it should not (the check itself is
+  // fuzzed natively; here its answer reaches the property, a zero inside the BSTR included).
+  for (const std::wstring& bad : {std::wstring(L"%n%f"), std::wstring(L"%1000f"), std::wstring(L"%.2f\0%s", 7)})
     rows.push_back({"format " + std::string(bad.begin(), bad.end()),
                     [=] { return Put(w, TW_FORMATTEXT, Variant::Bstr(bad)); }, E_INVALIDARG});
   RunRows(rows, [&] { return Read(w); });
@@ -164,16 +158,14 @@ TEST_CASE("ITidesWindow SetPort: objects that are not ports leave no port; null 
 
 TEST_CASE("ITidesWindow: NaN and infinite scales and days, and ports of another make, draw, read the pointer, end") {
   Graph g;
-  const double scales[][2] = {{kNaN, kNaN}, {kInfinity, -kInfinity}, {kLargest, -kLargest}, {-1.0, 1.0},
-                              {1.0, 1.0},   {kSmallestDenormal, 0.0}, {1.0, kNaN},          {0.0, kNaN}};
+  const double scales[][2] = {{kNaN, kNaN}, {kInfinity, -kInfinity}, {-1.0, 1.0}, {1.0, 1.0}, {0.0, kNaN}};
   for (const auto& s : scales) {
     CAPTURE(s[0]);
     CAPTURE(s[1]);
     CHECK(g.window->SetScale(s[0], s[1]) == S_OK);
     g.Exercise();
   }
-  const double days[][2] = {{kNaN, 36526.0}, {1.0, kNaN}, {kInfinity, kInfinity}, {-kLargest, -kLargest},
-                            {1e-9, 36526.0}};
+  const double days[][2] = {{kNaN, 36526.0}, {1.0, kNaN}, {kInfinity, kInfinity}};
   for (const auto& d : days) {
     CHECK(g.window->Calculate(d[0], d[1]) == S_OK);
     g.Exercise();
@@ -183,19 +175,15 @@ TEST_CASE("ITidesWindow: NaN and infinite scales and days, and ports of another 
       {"NaN heights", [](ForeignPort& p) { p.height = kNaN; }},
       {"infinite heights and extremes",
        [](ForeignPort& p) { p.heights = {kInfinity, -kInfinity}, p.maxValue = kInfinity, p.minValue = -kInfinity; }},
-      {"largest heights",
-       [](ForeignPort& p) { p.heights = {kLargest, -kLargest}, p.maxValue = kLargest, p.minValue = -kLargest; }},
       {"NaN extremes", [](ForeignPort& p) { p.maxValue = p.minValue = kNaN; }},
       {"one point", [](ForeignPort& p) { p.points = 1; }},
       {"no points", [](ForeignPort& p) { p.points = 0; }},
       {"a negative count", [](ForeignPort& p) { p.points = -5; }},
       {"every getter fails", [](ForeignPort& p) { p.result = E_FAIL; }},
       {"NaN sun times", [](ForeignPort& p) { p.sunRise = p.sunSet = p.twilightBegin = p.twilightEnd = kNaN; }},
-      {"infinite sun times", [](ForeignPort& p) { p.sunRise = kInfinity, p.sunSet = -kInfinity; }},
       {"sun times far outside the platform's dates",
        [](ForeignPort& p) { p.sunRise = 1e300, p.sunSet = -1e300, p.twilightBegin = 3e6, p.twilightEnd = -7e5; }},
       {"NaN prediction date", [](ForeignPort& p) { p.predictionDate = kNaN; }},
-      {"a prediction date past the platform's", [](ForeignPort& p) { p.predictionDate = 3e6; }},
       {"an absurd count (LONG_MAX)", [](ForeignPort& p) { p.points = LONG_MAX; }},
       {"a count of a hundred million", [](ForeignPort& p) { p.points = 100000000; }},
   };
@@ -240,18 +228,10 @@ TEST_CASE("ITidesWindow late bound: Property through Invoke with every form a sc
   Graph g;
   ITidesWindow* w = g.window;
   const WORD put = DISPATCH_PROPERTYPUT, get = DISPATCH_PROPERTYGET;
-  RunLate(w, {  // a few calls through the type library
-      {"Property put code \"x\"", kProperty, put, [](LateCall& c) { c.Arg(Variant::Bstr(L"x")).Arg(Variant::I4(0)); },
-       DISP_E_TYPEMISMATCH},
-      {"Property put code 9", kProperty, put, [](LateCall& c) { c.Arg(Variant::I4(9)).Arg(Variant::I4(0)); },
-       E_INVALIDARG},
-      {"Property put without a value", kProperty, put, [](LateCall& c) { c.Arg(Variant::I4(TW_DRAWTEXT)); },
-       DISP_E_BADPARAMCOUNT},
-      {"Property get code 0", kProperty, get, [](LateCall& c) { c.Arg(Variant::I4(0)); }, E_INVALIDARG},
-      {"SetPort(text)", kSetPort, DISPATCH_METHOD, [](LateCall& c) { c.Arg(Variant::Bstr(L"port")); },
-       DISP_E_TYPEMISMATCH},
-      {"Calculate(\"x\", 0)", kCalculate, DISPATCH_METHOD,
-       [](LateCall& c) { c.Arg(Variant::Bstr(L"x")).Arg(Variant::R8(0)); }, DISP_E_TYPEMISMATCH},
+  RunRows({  // the method's own refusals through the type library
+      {"Property put code 9",
+       [&] { return LateCall(w, kProperty, put).Arg(Variant::I4(9)).Arg(Variant::I4(0)).Result(); }, E_INVALIDARG},
+      {"Property get code 0", [&] { return LateCall(w, kProperty, get).Arg(Variant::I4(0)).Result(); }, E_INVALIDARG},
   }, [&] { return Read(w); });
   // A value by reference is none of the three integer types the property takes; the
   // integer itself, with the code as a short or a double, is.
