@@ -111,20 +111,9 @@ TEST_CASE("TidesPortList holds one reference per port it keeps: through lists, t
   const std::vector<IUnknown*>& ports = t.Ports(3);
   const std::vector<ULONG> base = RefCounts(ports);
   auto plus = [&](ULONG a, ULONG b, ULONG c) { return std::vector<ULONG>{base[0] + a, base[1] + b, base[2] + c}; };
-  {
+  {  // (each kind of list, replaced and emptied, is counted by boundary_tides_port_list)
     HostedControl hosted(t.dll, CLSID_TidesPortList);
     ITidesPortList* list = hosted.Query<ITidesPortList>();
-    for (int round = 0; round < 100; ++round) {
-      // The caller's array goes at once; the list's references stay.
-      REQUIRE(list->SetPortList(Variant::Array(VT_UNKNOWN, MakeUnknownArray(ports)).get()) == S_OK);
-      REQUIRE(RefCounts(ports) == plus(1, 1, 1));
-      IUnknown* selected = nullptr;
-      REQUIRE(list->get_Selected(&selected) == S_OK);
-      REQUIRE(selected != nullptr);
-      selected->Release();
-      REQUIRE(list->SetPortList(round % 2 ? Variant::Empty().get() : Variant::Unknown(ports[1]).get()) == S_OK);
-      REQUIRE(RefCounts(ports) == (round % 2 ? base : plus(0, 1, 0)));
-    }
     Variant array = Variant::Array(VT_UNKNOWN, MakeUnknownArray(ports));
     REQUIRE(list->SetPortList(array.get()) == S_OK);
     CHECK(RefCounts(ports) == plus(2, 2, 2));  // the Variant's and the list's

@@ -44,23 +44,11 @@ void CheckHeapFlat(const char* what, int warmUp, int rounds, std::size_t slack, 
 
 TEST_CASE("GetPorts: each port holds exactly the one reference its array element owns") {
   OpenTides t(ThreeStations());
-  VARIANT list, again, copy;
+  VARIANT list, again;
   REQUIRE(t.db->GetPorts(-90, -180, 90, 180, &list) == S_OK);
   const std::vector<IUnknown*> ports = Elements(list);
   REQUIRE(ports.size() == 3);
-  for (IUnknown* port : ports) {
-    CHECK(RefCount(port) == 1);
-    ITidesPort* typed = nullptr;
-    REQUIRE(port->QueryInterface(IID_ITidesPort, reinterpret_cast<void**>(&typed)) == S_OK);
-    CHECK(RefCount(port) == 2);
-    typed->Release();
-  }
   CHECK(RefCounts(ports) == std::vector<ULONG>{1, 1, 1});
-  // A copy of the VARIANT takes a reference per element; clearing it gives them back.
-  VariantInit(&copy);
-  REQUIRE(VariantCopy(&copy, &list) == S_OK);
-  CHECK(RefCounts(ports) == std::vector<ULONG>{2, 2, 2});
-  VariantClear(&copy);
   // A second call makes new ports and leaves the first array's alone.
   REQUIRE(t.db->GetPorts(-90, -180, 90, 180, &again) == S_OK);
   const std::vector<IUnknown*> others = Elements(again);
