@@ -7,9 +7,7 @@
 #include <cmath>
 #include <cstddef>
 #include <cstdint>
-#include <cstdio>
 #include <limits>
-#include <printf.h>
 #include <string>
 
 #include "fuzz/common/fuzz_check.h"
@@ -29,10 +27,8 @@ const char* const kTexts[] = {"", "Newlyn", "a longer text with %s and %n inside
 
 // The types glibc reads from the mask: at most one argument, of a type the kind passes.
 bool ReadsAsKind(const std::string& mask, MaskArgument kind) {
-  int types[4] = {};
-  const std::size_t count = parse_printf_format(mask.c_str(), 4, types);
-  if (count == 0) return true;
-  if (count > 1) return false;
+  const std::vector<int> types = br::fuzz::FormatArguments(mask);
+  if (types.size() != 1) return types.empty();
   switch (kind) {
     case MaskArgument::Text: return types[0] == PA_STRING;
     // char and short arguments are promoted to int on the way in: one int is read.
@@ -40,12 +36,6 @@ bool ReadsAsKind(const std::string& mask, MaskArgument kind) {
     case MaskArgument::Double: return types[0] == PA_DOUBLE;
   }
   return false;
-}
-
-std::string Print(const char* format, double value) {
-  char text[512];
-  const int n = std::snprintf(text, sizeof text, format, value);
-  return n < 0 ? std::string() : std::string(text, static_cast<std::size_t>(n));
 }
 
 }  // namespace
@@ -73,6 +63,6 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   FUZZ_CHECK(doubleCell.size() <= kLongestCell);
   if (mask.empty() || !maskFitsArgument(mask, MaskArgument::Text)) FUZZ_CHECK(textCell == text);
   if (mask.empty() || !maskFitsArgument(mask, MaskArgument::Long)) FUZZ_CHECK(longCell == std::to_string(number));
-  if (mask.empty() || !maskFitsArgument(mask, MaskArgument::Double)) FUZZ_CHECK(doubleCell == Print("%g", value));
+  if (mask.empty() || !maskFitsArgument(mask, MaskArgument::Double)) FUZZ_CHECK(doubleCell == br::fuzz::Print("%g", value));
   return 0;
 }

@@ -1,12 +1,20 @@
 // What every harness needs besides its target: a check that stops the run the way a
-// sanitizer does, and a reader that splits one fuzz input into parts.
+// sanitizer does, a reader that splits one fuzz input into parts, a scratch folder, and
+// glibc's own reading of a printf format.
 #pragma once
+
+#include <printf.h>
+#include <unistd.h>
 
 #include <cstddef>
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
+#include <filesystem>
+#include <string>
 #include <string_view>
+#include <system_error>
+#include <vector>
 
 namespace br::fuzz {
 
@@ -14,6 +22,15 @@ namespace br::fuzz {
   std::fprintf(stderr, "%s:%d: fuzz check failed: %s\n", file, line, condition);
   std::abort();
 }
+
+}  // namespace br::fuzz
+
+#define FUZZ_CHECK(condition) \
+  do {                        \
+    if (!(condition)) ::br::fuzz::Fail(#condition, __FILE__, __LINE__); \
+  } while (0)
+
+namespace br::fuzz {
 
 // Takes bytes from the front of an input; past the end it gives zeros and empty parts,
 // so every input, however short, is a valid one.
@@ -24,8 +41,7 @@ class InputReader {
   std::uint8_t U8() { return used_ < size_ ? data_[used_++] : 0; }
   std::uint16_t U16() {
     const unsigned low = U8();
-    const unsigned high = U8();
-    return static_cast<std::uint16_t>(low | (high << 8));
+    return static_cast<std::uint16_t>(low | (U8() << 8));
   }
   std::uint64_t U64() {
     std::uint64_t v = 0;
@@ -34,9 +50,8 @@ class InputReader {
   }
   // Up to n bytes (fewer when the input runs out).
   std::string_view Bytes(std::size_t n) {
-    const std::size_t take = n < Remaining() ? n : Remaining();
-    const std::string_view part(reinterpret_cast<const char*>(data_) + used_, take);
-    used_ += take;
+    const std::string_view part(reinterpret_cast<const char*>(data_) + used_, n < Remaining() ? n : Remaining());
+    used_ += part.size();
     return part;
   }
   // Bytes up to (not including) the next zero byte, which is consumed.
@@ -56,9 +71,45 @@ class InputReader {
   std::size_t used_ = 0;
 };
 
-}  // namespace br::fuzz
+// One scratch folder per process (made on first use under TMPDIR or /tmp), removed at exit.
+inline const std::filesystem::path& ScratchFolder() {
+  static std::filesystem::path folder;
+  if (folder.empty()) {
+    const char* base = std::getenv("TMPDIR");
+    std::string pattern = std::string(base && *base ? base : "/tmp") + "/br-fuzz-XXXXXX";
+    FUZZ_CHECK(mkdtemp(pattern.data()) != nullptr);
+    folder = pattern;
+    std::atexit([] {
+      std::error_code ignored;
+      std::filesystem::remove_all(folder, ignored);
+    });
+  }
+  return folder;
+}
 
-#define FUZZ_CHECK(condition) \
-  do {                        \
-    if (!(condition)) ::br::fuzz::Fail(#condition, __FILE__, __LINE__); \
-  } while (0)
+// Writes bytes as the file name inside the scratch folder, replacing it.
+inline void WriteScratchFile(const char* name, std::string_view bytes) {
+  std::FILE* f = std::fopen((ScratchFolder() / name).c_str(), "wb");
+  FUZZ_CHECK(f != nullptr);
+  if (!bytes.empty()) FUZZ_CHECK(std::fwrite(bytes.data(), 1, bytes.size(), f) == bytes.size());
+  FUZZ_CHECK(std::fclose(f) == 0);
+}
+
+// The argument types glibc's own format parser reads from a printf format (the first four).
+inline std::vector<int> FormatArguments(const std::string& format) {
+  int types[4] = {};
+  const std::size_t count = parse_printf_format(format.c_str(), 4, types);
+  return std::vector<int>(types, types + (count < 4 ? count : 4));
+}
+
+// The C library's own text for one double.
+inline std::string Print(const char* format, double value) {
+  const int length = std::snprintf(nullptr, 0, format, value);
+  if (length <= 0) return std::string();
+  std::string text(static_cast<std::size_t>(length) + 1, '\0');
+  std::snprintf(text.data(), text.size(), format, value);
+  text.resize(static_cast<std::size_t>(length));
+  return text;
+}
+
+}  // namespace br::fuzz

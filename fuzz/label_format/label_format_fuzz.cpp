@@ -7,9 +7,7 @@
 #include <cmath>
 #include <cstddef>
 #include <cstdint>
-#include <cstdio>
 #include <limits>
-#include <printf.h>
 #include <string>
 
 #include "fuzz/common/fuzz_check.h"
@@ -19,32 +17,9 @@ using namespace br::tides::graph;
 
 namespace {
 
-const double kValues[] = {0.0,
-                          -0.0,
-                          -1.5,
-                          123456.789,
-                          std::numeric_limits<double>::quiet_NaN(),
-                          std::numeric_limits<double>::infinity(),
-                          -std::numeric_limits<double>::infinity(),
-                          std::numeric_limits<double>::max(),
-                          -std::numeric_limits<double>::max(),
-                          std::numeric_limits<double>::denorm_min()};
-
-// What glibc reads from the format: true when it takes exactly one plain double.
-bool TakesOneDouble(const std::string& format) {
-  int types[4] = {};
-  const std::size_t count = parse_printf_format(format.c_str(), 4, types);
-  return count == 1 && types[0] == PA_DOUBLE;
-}
-
-std::string Print(const char* format, double value) {
-  const int length = std::snprintf(nullptr, 0, format, value);
-  if (length <= 0) return std::string();
-  std::string text(static_cast<std::size_t>(length) + 1, '\0');
-  std::snprintf(text.data(), text.size(), format, value);
-  text.resize(static_cast<std::size_t>(length));
-  return text;
-}
+using L = std::numeric_limits<double>;
+const double kValues[] = {0.0, -0.0, -1.5, 123456.789, L::quiet_NaN(), L::infinity(),
+                          -L::infinity(), L::max(), -L::max(), L::denorm_min()};
 
 }  // namespace
 
@@ -53,7 +28,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   const bool accepted = IsValueLabelFormat(format);
   if (accepted) {
     FUZZ_CHECK(format.find('\0') == std::string::npos);
-    FUZZ_CHECK(TakesOneDouble(format));
+    FUZZ_CHECK(br::fuzz::FormatArguments(format) == std::vector<int>{PA_DOUBLE});
   }
   // The widest label: the format's own text, a field of at most 999, and the longest
   // fixed-point double (309 digits, sign and point) with at most 999 decimals.
@@ -61,7 +36,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   for (const double value : kValues) {
     const std::string label = FormatValueLabel(format, value);
     FUZZ_CHECK(label.size() <= limit);
-    if (!accepted) FUZZ_CHECK(label == Print(kDefaultLabelFormat, value));
+    if (!accepted) FUZZ_CHECK(label == br::fuzz::Print(kDefaultLabelFormat, value));
   }
   return 0;
 }

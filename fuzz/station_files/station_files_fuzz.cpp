@@ -19,7 +19,6 @@
 #include <vector>
 
 #include "fuzz/common/fuzz_check.h"
-#include "fuzz/common/temp_folder.h"
 #include "tides/engine/prediction.h"
 #include "tides/engine/station_files.h"
 #include "tides/engine/sun_events.h"

@@ -11,7 +11,6 @@
 #include <vector>
 
 #include "fuzz/common/fuzz_check.h"
-#include "fuzz/common/temp_folder.h"
 #include "tides/engine/station_files.h"
 #include "tools/tidefiles/diagnostics.h"
 #include "tools/tidefiles/folder_builder.h"
