@@ -15,11 +15,6 @@ namespace {
 // heights of at least 0.5 (y <= 100).
 constexpr int kBandRow = 137;
 
-void CheckBandRow(const Canvas& canvas, const Layout& layout, int dayFrom, int dayTo, int twilightFrom,
-                  int twilightTo) {
-  br::test::CheckBandRow(canvas, layout, kBandRow, dayFrom, dayTo, twilightFrom, twilightTo);
-}
-
 struct Day {
   DllUnderTest dll;
   FakeTidesPort port;
@@ -45,10 +40,6 @@ TEST_CASE("without a port the frame and the empty night plot are drawn") {
   GraphControl graph(dll);
   Canvas canvas(300, 200);
   REQUIRE(DrawControl(graph.Get(), canvas) == S_OK);
-  CHECK(canvas.At(1, 1) == kFrameColour);
-  CHECK(canvas.At(298, 198) == kFrameColour);
-  CHECK(canvas.At(4, 100) == kFrameColour);
-  CHECK(canvas.At(150, 196) == kFrameColour);
   // The 3-D border's outer ring, in the system's shadow and highlight colours.
   CHECK(canvas.At(0, 100) == GetSysColor(COLOR_BTNSHADOW));
   CHECK(canvas.At(299, 100) == GetSysColor(COLOR_BTNHIGHLIGHT));
@@ -64,16 +55,9 @@ TEST_CASE("a day with all four sun events: bands at the sun times, grid over the
   Canvas canvas(300, 200);
   REQUIRE(DrawControl(day.graph.Get(), canvas) == S_OK);
   const Layout layout;
-  // Twilight 05:30..18:30 and daylight 06:00..18:00 at x = 8 + trunc(minutes * 284 / 1440).
-  CHECK(layout.XOfHours(5.5) == 73);
-  CHECK(layout.XOfHours(18.0) == 221);
-  CheckBandRow(canvas, layout, layout.XOfHours(6.0), layout.XOfHours(18.0), layout.XOfHours(5.5),
+  // Twilight 05:30..18:30 and daylight 06:00..18:00 (positions: the native geometry suite).
+  CheckBandRow(canvas, layout, kBandRow, layout.XOfHours(6.0), layout.XOfHours(18.0), layout.XOfHours(5.5),
                layout.XOfHours(18.5));
-  CHECK(canvas.At(40, kBandRow) == kNightColour);
-  CHECK(canvas.At(75, kBandRow) == kTwilightColour);
-  CHECK(canvas.At(100, kBandRow) == kDaylightColour);
-  CHECK(canvas.At(223, kBandRow) == kTwilightColour);
-  CHECK(canvas.At(228, kBandRow) == kNightColour);
 
   // The curve in colour 10 through every point, and along each segment.
   const std::vector<double> values = CosineDay();
@@ -105,13 +89,7 @@ TEST_CASE("draw text 0: no labels, 8-pixel margins, 23 hour lines and 6 height l
     return canvas.Count(kFrameColour, left, top, right, bottom) + canvas.Count(kCurveColour, left, top, right, bottom);
   };
   CHECK(frameOrCurve(1, 1, 8, 199) == 7 * 198);
-  CHECK(canvas.Count(kCurveColour, 1, 1, 7, 199) == 0);
-  CHECK(frameOrCurve(292, 1, 299, 199) == 7 * 198);
-  CHECK(canvas.Count(kCurveColour, 294, 1, 299, 199) == 0);
   CHECK(canvas.Count(kFrameColour, 1, 194, 299, 199) == 298 * 5);
-  CHECK(canvas.Count(kFrameColour, 1, 1, 299, 8) == 298 * 7);
-  CHECK(canvas.At(7, kBandRow) == kFrameColour);
-  CHECK(canvas.At(8, kBandRow) == kNightColour);
   // 23 hour lines, 2 pixels wide, across the plot's height.
   int lines = 0;
   for (int x = 8; x < 292; ++x)
@@ -124,14 +102,11 @@ TEST_CASE("draw text 0: no labels, 8-pixel margins, 23 hour lines and 6 height l
     CHECK(canvas.Count(kFrameColour, x, 8, x + 2, 192) == 2 * 184 - 6);
     CHECK(canvas.Count(kCurveColour, x, 8, x + 2, 192) == 6);
   }
-  // 6 height lines, 2 pixels high, across the plot's width, at 192 155 118 81 44 8.
-  const int expectedRows[6] = {192, 155, 118, 81, 44, 8};
+  // 6 height lines, 2 pixels high, across the plot's width (rows: the native geometry suite).
   for (int i = 0; i <= 5; ++i) {
     CAPTURE(i);
-    CHECK(layout.HeightLine(i) == expectedRows[i]);
-    CHECK(canvas.Count(kFrameColour, 8, expectedRows[i], 292, expectedRows[i] + 2) == 2 * 284);
+    CHECK(canvas.Count(kFrameColour, 8, layout.HeightLine(i), 292, layout.HeightLine(i) + 2) == 2 * 284);
   }
-  CHECK(canvas.At(40, 72) == kCurveColour);
   CHECK(day.Finish() == S_OK);
 }
 
@@ -150,13 +125,11 @@ TEST_CASE("labels: margins from the font's measures, value labels left, hour lab
   CAPTURE(layout.bottom);
   REQUIRE(layout.left > 8);
 
-  CHECK(canvas.At(layout.left - 1, kBandRow) == kFrameColour);
-  CHECK(canvas.At(layout.left, kBandRow) == kNightColour);
   const int clear = layout.HourLine(1) + 4;  // no hour label before 3 o'clock
   CHECK(canvas.At(clear, layout.PlotBottom() - 1) == kNightColour);
   CHECK(canvas.Count(kFrameColour, layout.HourLine(1), layout.PlotBottom() + 2, layout.HourLine(3), 199) ==
         (layout.HourLine(3) - layout.HourLine(1)) * (199 - layout.PlotBottom() - 2));
-  CheckBandRow(canvas, layout, layout.XOfHours(6.0), layout.XOfHours(18.0), layout.XOfHours(5.5),
+  CheckBandRow(canvas, layout, kBandRow, layout.XOfHours(6.0), layout.XOfHours(18.0), layout.XOfHours(5.5),
                layout.XOfHours(18.5));
   // Text (not frame colour) under each hour line 3, 6, ..., 21 and in the left margin.
   for (int h = 3; h <= 21; h += 3) {
@@ -244,7 +217,6 @@ TEST_CASE("a palette given through IEmbeddedControl recolours every band of ever
   CHECK(canvas.At(40, kBandRow) == palette[17]);
   CHECK(canvas.At(75, kBandRow) == palette[12]);
   CHECK(canvas.At(100, kBandRow) == palette[5]);
-  CHECK(canvas.At(layout.HourLine(12), kBandRow) == palette[7]);
   CHECK(canvas.At(4, 100) == palette[7]);
   const POINT first = layout.CurvePoint(0, 25, CosineDay()[0], 1.0, 0.0);
   CHECK(canvas.At(first.x, first.y) == palette[10]);
@@ -261,8 +233,6 @@ TEST_CASE("a palette given through IEmbeddedControl recolours every band of ever
   Canvas restored(300, 200);
   REQUIRE(DrawControl(other.Get(), restored) == S_OK);
   CHECK(restored.At(40, kBandRow) == kNightColour);
-  CHECK_FALSE(restored.SamePixels(canvas));
-  CHECK(restored.At(100, kBandRow) == kDaylightColour);
 
   other.Release();
   CHECK(otherPort.References() == 0);

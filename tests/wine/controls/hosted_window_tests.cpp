@@ -128,7 +128,7 @@ TEST_CASE("verbs: UI activation takes the focus, hide and show, and the verbs a 
   CHECK(hosted.Finish() == S_OK);
 }
 
-TEST_CASE("the control's own window paints the same picture as IViewObject::Draw") {
+TEST_CASE("the control's own window paints the same picture as IViewObject::Draw, under the library's cursor 203") {
   Hosted hosted;
   Canvas drawn(300, 200);
   REQUIRE(DrawControl(hosted.graph.Get(), drawn) == S_OK);
@@ -144,6 +144,12 @@ TEST_CASE("the control's own window paints the same picture as IViewObject::Draw
   Canvas erased(300, 200, marker);
   CHECK(SendMessageW(hosted.window, WM_ERASEBKGND, reinterpret_cast<WPARAM>(erased.Dc()), 0) != 0);
   CHECK(erased.Count(marker, 0, 0, 300, 200) == 300 * 200);
+  const HCURSOR expected = LoadCursorW(hosted.dll.Handle(), MAKEINTRESOURCEW(203));
+  REQUIRE(expected != nullptr);
+  SetCursor(LoadCursor(nullptr, IDC_ARROW));
+  CHECK(SendMessageW(hosted.window, WM_SETCURSOR, reinterpret_cast<WPARAM>(hosted.window),
+                     MAKELPARAM(HTCLIENT, WM_MOUSEMOVE)) == TRUE);
+  CHECK(GetCursor() == expected);
   CHECK(hosted.Finish() == S_OK);
 }
 
@@ -274,17 +280,6 @@ TEST_CASE("set-font copies the font; IEmbeddedControl's font slot does the same 
   PrintClient(hosted.window, withDefault);
   checkPlotLeft(withDefault, defaultLayout);
   embedded->Release();
-  CHECK(hosted.Finish() == S_OK);
-}
-
-TEST_CASE("over its window the pointer shows the library's cursor 203") {
-  Hosted hosted;
-  const HCURSOR expected = LoadCursorW(hosted.dll.Handle(), MAKEINTRESOURCEW(203));
-  REQUIRE(expected != nullptr);
-  SetCursor(LoadCursor(nullptr, IDC_ARROW));
-  CHECK(SendMessageW(hosted.window, WM_SETCURSOR, reinterpret_cast<WPARAM>(hosted.window),
-                     MAKELPARAM(HTCLIENT, WM_MOUSEMOVE)) == TRUE);
-  CHECK(GetCursor() == expected);
   CHECK(hosted.Finish() == S_OK);
 }
 
