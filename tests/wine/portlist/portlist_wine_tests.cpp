@@ -146,21 +146,14 @@ TEST_CASE("three ports in a window: shown by name, the first selected and fired 
   CHECK(p.names.back() == L"Brest");
   p.Click(1);  // the same row: no change, no event
   CHECK(p.names.size() == 3);
-
-  // Keys: Up and Down move through the shown order.
-  SendMessageA(p.table, WM_KEYDOWN, VK_UP, 1);
-  CHECK(p.names.back() == L"Anvers");
-  SendMessageA(p.table, WM_KEYDOWN, VK_DOWN, 1);
-  SendMessageA(p.table, WM_KEYDOWN, VK_DOWN, 1);
-  CHECK(p.names.back() == L"Le Havre");
-  CHECK(p.names.size() == 6);
+  // (Keys that move the selection: the navigation case below and the table's own suite.)
 
   // Replacing the list with nothing empties the table: nothing is selected.
   VARIANT empty;
   VariantInit(&empty);
   CHECK(p.list->SetPortList(empty) == S_OK);
   CHECK(SelectedName(p.list).empty());
-  CHECK(p.names.size() == 6);
+  CHECK(p.names.size() == 3);
   CHECK(havre.References() == 0);
   CHECK(p.Finish() == S_OK);
 }
