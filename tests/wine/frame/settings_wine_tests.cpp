@@ -149,7 +149,7 @@ TEST_CASE("the simple key reader throws 0xE0030002 without a key and limits stri
   CHECK_FALSE(reader.ReadString("Text", text, 10));
 }
 
-TEST_CASE("the settings table: tree mode, folders and the picture window placement") {
+TEST_CASE("the settings table: tree mode, key path and the picture window placement") {
   const std::string enumKey = cRegSettings::FullPath(SETTINGS_ENUM_KEY);
   SavedRegistryValue treeMode(HKEY_LOCAL_MACHINE, enumKey, SETTING_TREE_MODE);
   SavedRegistryValue keyPath(HKEY_LOCAL_MACHINE, enumKey, SETTING_KEY_PATH);
@@ -165,16 +165,7 @@ TEST_CASE("the settings table: tree mode, folders and the picture window placeme
   CHECK(ReadKeyPath() == "C:\\Brine\\Data\\");
   keyPath.Delete();
   CHECK(ReadKeyPath().empty());
-
-  const std::string database = "BrTestDb" + std::to_string(GetCurrentProcessId());
-  const std::string volumeKey = enumKey + "\\" + database + "\\Volumes\\00";
-  {
-    SavedRegistryValue volume(HKEY_LOCAL_MACHINE, volumeKey, "");
-    volume.SetString("E:\\Vol00\\");
-    CHECK(ReadVolumeFolder(database) == "E:\\Vol00\\");
-  }
-  RegDeleteTreeA(HKEY_LOCAL_MACHINE, (enumKey + "\\" + database).c_str());
-  CHECK(ReadVolumeFolder(database).empty());
+  // The volume folder is read by the volume file case below.
 
   const std::string boxKey = cRegSettings::FullPath(SETTINGS_PICTURE_BOX_KEY);
   SavedRegistryValue left(HKEY_CURRENT_USER, boxKey, "left");
