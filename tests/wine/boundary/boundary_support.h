@@ -27,7 +27,6 @@ namespace br::test::boundary {
 
 inline const double kNaN = std::numeric_limits<double>::quiet_NaN();
 inline const double kInfinity = std::numeric_limits<double>::infinity();
-inline const double kLargest = std::numeric_limits<double>::max();
 inline const double kSmallestDenormal = std::numeric_limits<double>::denorm_min();
 
 // Written into out-parameters before a call that must not write them.
@@ -63,9 +62,7 @@ public:
   static Variant Null() { return Make(VT_NULL, [](VARIANT&) {}); }
   static Variant I2(SHORT x) { return Make(VT_I2, [=](VARIANT& v) { v.iVal = x; }); }
   static Variant I4(LONG x) { return Make(VT_I4, [=](VARIANT& v) { v.lVal = x; }); }
-  static Variant R4(float x) { return Make(VT_R4, [=](VARIANT& v) { v.fltVal = x; }); }
   static Variant R8(double x) { return Make(VT_R8, [=](VARIANT& v) { v.dblVal = x; }); }
-  static Variant Date(double x) { return Make(VT_DATE, [=](VARIANT& v) { v.date = x; }); }
   static Variant Bool(bool x) { return Make(VT_BOOL, [=](VARIANT& v) { v.boolVal = x ? -1 : 0; }); }
   static Variant NullBstr() { return Make(VT_BSTR, [](VARIANT& v) { v.bstrVal = nullptr; }); }
   static Variant Bstr(const std::wstring& text) {  // embedded zeros kept

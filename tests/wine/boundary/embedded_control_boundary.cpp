@@ -161,8 +161,7 @@ TEST_CASE("IEmbeddedControl reserved, font and size slots with odd and missing a
   DllUnderTest dll;
   HFONT deleted = CreateFontW(12, 0, 0, 0, FW_NORMAL, 0, 0, 0, 0, 0, 0, 0, 0, L"Arial");
   DeleteObject(deleted);
-  BadFont failing(E_FAIL, nullptr), bogus(S_OK, reinterpret_cast<HFONT>(static_cast<UINT_PTR>(0x1234))),
-      stale(S_OK, deleted);
+  BadFont failing(E_FAIL, nullptr), stale(S_OK, deleted);
   FONTDESC description = {sizeof(FONTDESC), const_cast<LPOLESTR>(L"Arial"), {{120000, 0}}, FW_BOLD, ANSI_CHARSET,
                           FALSE, FALSE, FALSE};
   IFont* real = nullptr;
@@ -173,7 +172,7 @@ TEST_CASE("IEmbeddedControl reserved, font and size slots with odd and missing a
     IEmbeddedControl* embedded = hosted.Query<IEmbeddedControl>();
     CHECK(embedded->Reserved(0, 0) == S_OK);
     CHECK(embedded->Reserved(LONG_MIN, LONG_MAX) == S_OK);
-    for (IFont* font : std::initializer_list<IFont*>{nullptr, &failing, &bogus, &stale, real, nullptr}) {
+    for (IFont* font : std::initializer_list<IFont*>{nullptr, &failing, &stale, real, nullptr}) {
       CHECK(embedded->SetFont(-1, font, LONG_MAX) == S_OK);
       Canvas canvas(300, 200);
       CHECK(DrawControl(hosted.Control(), canvas) == S_OK);

@@ -138,9 +138,9 @@ TEST_CASE("ITidesDatabase late bound: the method's own answers and the forms scr
   CHECK(longitude == kUntouchedDouble);
   CHECK(name == nullptr);
 
-  {  // A whole box through Invoke, each corner of another coercible type.
+  {  // A whole box through Invoke: the array comes back as the result.
     LateCall call(db, kGetPorts);
-    call.Arg(Variant::I2(-90)).Arg(Variant::Bstr(L"-180")).Arg(Variant::Date(90)).Arg(Variant::R4(180));
+    call.Arg(Variant::I2(-90)).Arg(Variant::Bstr(L"-180")).Arg(Variant::R8(90)).Arg(Variant::R8(180));
     REQUIRE(call.Run() == S_OK);
     CHECK(PortCount(call.result) == kStations);
   }

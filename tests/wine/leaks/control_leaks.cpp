@@ -121,7 +121,8 @@ TEST_CASE("TidesPortList holds one reference per port it keeps: through lists, t
     hosted.Close();  // the window's end lets the ports go, before the control's
     CHECK(RefCounts(ports) == base);
     REQUIRE(list->SetPortList(Variant::Unknown(ports[2]).get()) == S_OK);
-    CHECK(RefCounts(ports) == plus(0, 0, 1));
+    CHECK(RefCounts(ports) == plus(0, 0, 1));  // kept without a window, and not selected
+    CHECK(SelectedName(list) == L"<none>");
     list->Release();  // and the control's end does too
     CHECK(RefCounts(ports) == base);
   }
