@@ -93,6 +93,12 @@ TEST_CASE("every message of the table becomes its event with its parameters") {
     CHECK(p.seen.empty());
   }
 
+  // WM_ENABLE (sent by the platform, not by setEnabled) keeps the component's flag in step.
+  EnableWindow(h, FALSE);
+  CHECK_FALSE(p.getEnabledFlag());
+  EnableWindow(h, TRUE);
+  CHECK(p.getEnabledFlag());
+
   // WM_CLOSE reaches the default processing, which destroys the window.
   send(WM_CLOSE, 0, 0);
   CHECK(p.last(kEventClose));
