@@ -40,13 +40,12 @@ int charX(HWND h, const std::string& text, int index) {
 
 }  // namespace
 
-TEST_CASE("characters typed into each type reach its model; refused ones bubble, its keys do not") {
+// What each edit type makes of a character is the native edit suites'; here the routing.
+TEST_CASE("characters typed reach the model; refused ones bubble, the edit's keys do not") {
   // type, mask, limit, start value (NaN: none), End first, characters, text, characters that bubbled
   struct Row { int type; const char* mask; int limit; double value; bool end; const char *typed, *text; int bubbled; };
   const Row rows[] = {
       {kEditLatitude, nullptr, 0, -12.5, true, "nx", "12\xB0" "30.000'N", 1},  // 'n' taken, 'x' refused
-      {kEditLongitude, nullptr, 0, -4.0875, false, "17N", "174\xB0" "05.250'W", 1},
-      {kEditDecimal, nullptr, 0, 3.14159, true, ".5", "3.14165", 1},
       {kEditInteger, nullptr, 6, NAN, false, "1234567-", "123456", 2},
       {kEditText, "-99:99", 0, NAN, false, "-1234", "-12:34", 0},
   };
