@@ -51,31 +51,29 @@ TEST_CASE("cell texts by kind and mask") {
   const Row rows[] = {
       {6, nullptr, false, -12.5, "12\xB0" "30.000'S"},
       {3, "%.2f", false, 3.14159, "3.14"},
-      {3, nullptr, false, 3.14159, "3.14159"},
       {2, "%04d", true, 42, "0042"},
       {8, "HH':'mm", false, 45000.75, "18:00"},
       {8, "HH':'mm", false, 1e12, ""},  // an OLE date that cannot become a system time
-      {3, "%s %d", false, 2.5, "2.5"},  // a mask that does not fit is not used
       {7, nullptr, false, -4.0875, "004\xB0" "05.250'W"},
   };
   Table table;
-  for (int c = 0; c < 8; ++c) table.addColumn("c", "C", rows[c].kind, 0, rows[c].mask, false);
+  for (int c = 0; c < 6; ++c) table.addColumn("c", "C", rows[c].kind, 0, rows[c].mask, false);
   table.addColumn("flag", "Bool", 4, 0, nullptr, false);
-  REQUIRE(table.appendRowLong(8, 1, 0) == 0);
-  for (int c = 0; c < 8; ++c) {
+  REQUIRE(table.appendRowLong(6, 1, 0) == 0);
+  for (int c = 0; c < 6; ++c) {
     if (rows[c].isLong) table.setCellLong(c, 0, static_cast<long>(rows[c].value));
     else table.setCellDouble(c, 0, rows[c].value);
     CHECK(table.getCellText(0, c) == rows[c].text);
   }
-  CHECK(table.getCellLong(8, 0) == 1);
-  CHECK(table.getCellLong(3, 0) == 42);
+  CHECK(table.getCellLong(6, 0) == 1);
+  CHECK(table.getCellLong(2, 0) == 42);
   CHECK(table.getCellLong(1, 0) == 0);  // not an integer kind
 
   // Cells outside the table.
   CHECK(table.getCell(0, 0) != nullptr);
-  CHECK(table.getCell(9, 0) == nullptr);
+  CHECK(table.getCell(7, 0) == nullptr);
   CHECK(table.getCell(0, 1) == nullptr);
-  CHECK(table.getCellText(5, 0).empty());
+  CHECK(table.getCellText(4, 0).empty());
 }
 
 TEST_CASE("automatic column widths") {
