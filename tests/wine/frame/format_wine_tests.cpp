@@ -44,12 +44,10 @@ TEST_CASE("dates the platform refuses give empty text") {
   CHECK(FormatDate(1e12).empty());
 }
 
+// The no-value texts and plain widths are the native format suites'; here what the C runtime prints.
 TEST_CASE("coordinates and numbers read the same as in the native build") {
   CHECK(FormatCoord("DD\xB0MM.mmm'$", COORD_LATITUDE, 12.5) == "12\xB0" "30.000'N");
   CHECK(FormatCoord("DD MM SS", COORD_LATITUDE, 12.2583333) == "12 15 29");
   CHECK(FormatLatitudeDM(-33.99999) == "33\xB0 59'.999 S");
-  CHECK(FormatNumber(2.5, 3) == "2.500");
-  CHECK(FormatNumber(NO_VALUE, 1) == "<None>");
   CHECK(FormatNumber(0.1, 20) == "0.10000000000000000555");
-  CHECK(FormatCoord("DDD$", COORD_LATITUDE, NO_VALUE) == "179N");
 }
