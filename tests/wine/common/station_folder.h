@@ -1,12 +1,17 @@
-// Station folders written by the tests themselves into a temporary folder, with the
-// engine's record encoders. Removed again when the object goes (declare it before the
+// Station folders written by the tests themselves into a temporary folder, by the engine
+// suite's folder writer. Removed again when the object goes (declare it before the
 // DllUnderTest that opens it, so the DLL has closed the files by then).
 #pragma once
 
 #include <cstdint>
+#include <memory>
 #include <set>
 #include <string>
 #include <vector>
+
+namespace br::tides::testing {
+class TempFolder;
+}
 
 namespace br::test {
 
@@ -41,6 +46,7 @@ public:
   const std::wstring& Path() const { return path_; }  // no trailing separator
 
 private:
+  std::unique_ptr<br::tides::testing::TempFolder> folder_;
   std::wstring path_;
 };
 
