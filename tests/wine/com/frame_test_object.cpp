@@ -32,15 +32,7 @@ FrameTestObject::FrameTestObject() {
 
 FrameTestObject::~FrameTestObject() { --live; }
 
-STDMETHODIMP FrameTestObject::SetPortList(VARIANT value) {
-  if (value.vt == VT_I4) {
-    FireEvent(value.lVal);
-  } else {
-    DISPPARAMS params = {&value, nullptr, 1, 0};
-    FireEvent(1, &params);
-  }
-  return S_OK;
-}
+STDMETHODIMP FrameTestObject::SetPortList(VARIANT) { return E_NOTIMPL; }
 
 STDMETHODIMP FrameTestObject::get_Selected(IUnknown** out) {
   return Guard([&]() -> HRESULT {

@@ -1,5 +1,5 @@
-// A class built on the frame for its own tests: ITidesPortList as its dual interface (two
-// small methods), a test CLSID, and switches that make construction or its methods fail.
+// A class built on the frame for its own tests: ITidesPortList as its dual interface, a test
+// CLSID, and switches that make construction or get_Selected fail.
 #pragma once
 
 #include "frame/com/dispatch_object.h"
@@ -22,9 +22,7 @@ public:
   ~FrameTestObject() override;
   HRESULT FinalConstruct() override { return finalConstructResult; }
 
-  // SetPortList(VT_I4 n): fires event n with no arguments; any other value: fires 1
-  // with the VARIANT as its argument.
-  STDMETHODIMP SetPortList(VARIANT value) override;
+  STDMETHODIMP SetPortList(VARIANT value) override;  // not used: E_NOTIMPL
   // get_Selected: throws what `thrown` names (0 none: S_OK with null).
   STDMETHODIMP get_Selected(IUnknown** out) override;
 
