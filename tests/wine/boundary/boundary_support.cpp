@@ -126,14 +126,6 @@ IUnknown* OpenTides::Unknown(long index) const {
   return port;
 }
 
-ITidesPort* OpenTides::Port(long index) const {
-  IUnknown* unknown = Unknown(index);
-  ITidesPort* port = nullptr;
-  REQUIRE(unknown->QueryInterface(IID_ITidesPort, reinterpret_cast<void**>(&port)) == S_OK);
-  unknown->Release();
-  return port;
-}
-
 const std::vector<IUnknown*>& OpenTides::Ports(long count) {
   for (long i = 0; i < count; ++i) ports.push_back(Unknown(i));
   return ports;
@@ -173,8 +165,7 @@ std::vector<ULONG> RefCounts(const std::vector<IUnknown*>& objects) {
 }
 
 void AdviseOnly(IUnknown* source, const IID& events, EventSink& sink) {
-  IConnectionPointContainer* container = nullptr;
-  REQUIRE(source->QueryInterface(IID_IConnectionPointContainer, reinterpret_cast<void**>(&container)) == S_OK);
+  IConnectionPointContainer* container = Query<IConnectionPointContainer>(source);
   IConnectionPoint* point = nullptr;
   REQUIRE(container->FindConnectionPoint(events, &point) == S_OK);
   container->Release();

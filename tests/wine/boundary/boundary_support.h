@@ -183,7 +183,7 @@ struct OpenTides {
   explicit OpenTides(const std::vector<TestStation>& stations, bool open = true);
   ~OpenTides() { Finish(); }
   IUnknown* Unknown(long index) const;  // GetPort, REQUIREd to give a port
-  ITidesPort* Port(long index) const;
+  ITidesPort* Port(long index) const { return PortAt(db, index); }
   const std::vector<IUnknown*>& Ports(long count);  // the first count, into ports
   HRESULT Finish() {
     for (IUnknown* p : ports) p->Release();
@@ -211,10 +211,8 @@ public:
   HWND Window() const { return window_; }          // the control's own window
   template <class I>
   I* Query() const {  // a new reference, REQUIREd
-    I* out = nullptr;
     REQUIRE(control_ != nullptr);
-    REQUIRE(control_->QueryInterface(__uuidof(I), reinterpret_cast<void**>(&out)) == S_OK);
-    return out;
+    return br::test::Query<I>(control_);
   }
   void Paint() const { RedrawWindow(window_, nullptr, nullptr, RDW_INVALIDATE | RDW_UPDATENOW | RDW_ALLCHILDREN); }
   void MouseMove(int x, int y = 50) const { SendMessageW(window_, WM_MOUSEMOVE, 0, MAKELPARAM(x, y)); }
