@@ -2,8 +2,6 @@
 
 #include "toolkit/base/ClassRecords.h"
 #include "toolkit/base/Object.h"
-#include "toolkit/layout/FlowLayout.h"
-#include "toolkit/layout/SplitterLayout.h"
 
 using namespace toolkit;
 
@@ -17,11 +15,6 @@ public:
 private:
   const ClassRecord* record_;
 };
-
-int layoutIndex(const Object* object) {
-  return whichOf(object, &records::FlowLayout, &records::BorderLayout, &records::GridLayout,
-                 &records::TabLayout, &records::SplitterLayout);
-}
 }  // namespace
 
 TEST_CASE("isKindOf walks the parent chain") {
@@ -46,14 +39,9 @@ TEST_CASE("isKindOf walks the parent chain") {
 }
 
 TEST_CASE("whichOf answers the index of the first matching record") {
-  FlowLayout flow;
-  SplitterLayout splitter;
+  // Picking each layout by its record is the layout engine suite's (every layout kind, and an unknown one).
   Stand panel(&records::Panel);
-  Stand plainLayout(&records::Layout);
-  const Object* objects[] = {&flow, &splitter, &panel, &plainLayout, nullptr};
-  const int expected[] = {0, 4, -1, -1, -1};
-  for (int i = 0; i < 5; ++i) CHECK(layoutIndex(objects[i]) == expected[i]);
-
+  CHECK(whichOf(static_cast<const Object*>(nullptr), &records::Panel) == -1);
   // Earlier records win; a null record ends the list.
   CHECK(whichOf(&panel, &records::cXComponent, &records::Panel) == 0);
   CHECK(whichOf(&panel, &records::Choice, nullptr, &records::Panel) == -1);
