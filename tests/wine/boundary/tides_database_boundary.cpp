@@ -113,16 +113,17 @@ TEST_CASE("ITidesDatabase after Initialize: null out-pointers, indices and boxes
 TEST_CASE("ITidesDatabase late bound: the method's own answers and the forms script hosts pass") {
   OpenTides t(Stations(), false);
   ITidesDatabase* db = t.db;
-  auto read = [&] { return Read(db); };
   // Through the type library the method's refusal comes back as the exception's scode;
   // an interface other than IID_NULL is refused before it.
   RunRows({
       {"Initialize(VT_I4 5)", [&] { return LateCall(db, kInitialize).Arg(Variant::I4(5)).Result(); }, E_INVALIDARG},
-      {"NumPorts", [&] { return LateCall(db, kNumPorts, DISPATCH_PROPERTYGET).Result(); }, E_ACCESSDENIED},
       {"interface other than IID_NULL",
        [&] { return LateCall(db, kNumPorts, DISPATCH_PROPERTYGET).Interface(IID_ITidesDatabase).Result(); },
        DISP_E_UNKNOWNINTERFACE},
-  }, read);
+  }, [&] { return Read(db); });
+  LateCall count(db, kNumPorts, DISPATCH_PROPERTYGET);  // the refusal as an exception with its scode
+  CHECK(count.Run() == DISP_E_EXCEPTION);
+  CHECK(count.exception.scode == E_ACCESSDENIED);
 
   // The folder by reference, as Basic passes a String variable.
   Variant path = Variant::Bstr(t.folder.Path());
