@@ -156,26 +156,21 @@ TEST_CASE("a constant curve: extremes at 0, zone read back sign-extended, ports 
   CHECK(dll.CanUnloadNow() == S_OK);
 }
 
-TEST_CASE("Calculated reaches every connected sink, with the day already in place") {
+// Several sinks, and sinks that disconnect: the re-entrancy suite; an event for every
+// refused step: the boundary suite.
+TEST_CASE("Calculated comes with no arguments and the day already in place") {
   StationFolder folder({kS2Station});
   DllUnderTest dll;
   ITidesPort* port = Port(dll, folder);
-  EventSink a(DIID__ITidesPortEvents), b(DIID__ITidesPortEvents);
+  EventSink a(DIID__ITidesPortEvents);
   REQUIRE(a.Connect(port));
-  REQUIRE(b.Connect(port));
   long seen = -1;
   a.onCall = [&] { seen = Points(port); };
   REQUIRE(port->Calculate(1.0, 36526.0) == S_OK);
   CHECK(a.calls == 1);
-  CHECK(b.calls == 1);
   CHECK(seen == 25);
   CHECK(a.lastId == 1);
   CHECK(a.lastArgumentCount == 0);
-  b.Disconnect();
-  REQUIRE(port->Calculate(-1.0, 36526.0) == S_OK);
-  CHECK(a.calls == 2);
-  CHECK(b.calls == 1);
-  CHECK(seen == 0);
   a.Disconnect();
   port->Release();
   CHECK(dll.CanUnloadNow() == S_OK);
