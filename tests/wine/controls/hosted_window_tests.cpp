@@ -185,17 +185,10 @@ TEST_CASE("MouseAction reports the time and height under the pointer") {
   CHECK(sink.lastFlags == DISPATCH_METHOD);
   CHECK(sink.lastLocale == LOCALE_USER_DEFAULT);
 
-  move(292);  // 24:00 and the strip right of the plot: no time of this day, no event
+  // 24:00 and the strip right of the plot: no time of this day, no event. (No reading
+  // without points or a port: the native graph suite's readout rules.)
+  move(292);
   move(296);
-  CHECK(sink.calls == calls);
-
-  // Without points, or without a port, the pointer reports nothing.
-  FakeTidesPort empty;
-  REQUIRE(hosted.graph->SetPort(&empty) == S_OK);
-  move(150);
-  CHECK(sink.calls == calls);
-  REQUIRE(hosted.graph->SetPort(nullptr) == S_FALSE);
-  move(150);
   CHECK(sink.calls == calls);
   sink.Disconnect();
   CHECK(hosted.Finish() == S_OK);
