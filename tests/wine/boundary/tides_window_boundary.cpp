@@ -110,11 +110,9 @@ TEST_CASE("ITidesWindow Property and IUnitsOption: wrong codes, types, by-refere
   for (int code : {-1, 3, INT_MAX})
     rows.push_back({"put code " + std::to_string(code),
                     [=] { return Put(w, static_cast<TW_PROPERTY>(code), Variant::I4(0)); }, E_INVALIDARG});
-  // Formats that would make printf read or write what it should not (the check itself is
-  // fuzzed natively; here its answer reaches the property, a zero inside the BSTR included).
-  for (const std::wstring& bad : {std::wstring(L"%n%f"), std::wstring(L"%1000f"), std::wstring(L"%.2f\0%s", 7)})
-    rows.push_back({"format " + std::string(bad.begin(), bad.end()),
-                    [=] { return Put(w, TW_FORMATTEXT, Variant::Bstr(bad)); }, E_INVALIDARG});
+  // Which formats are unsafe is the label-format suites'; a zero inside the BSTR hides none.
+  rows.push_back({"format with a zero inside",
+                  [=] { return Put(w, TW_FORMATTEXT, Variant::Bstr(std::wstring(L"%.2f\0%s", 7))); }, E_INVALIDARG});
   RunRows(rows, [&] { return Read(w); });
   SysFreeString(format);
 
@@ -129,16 +127,14 @@ TEST_CASE("ITidesWindow Property and IUnitsOption: wrong codes, types, by-refere
   CHECK(g.Finish() == S_OK);
 }
 
-TEST_CASE("ITidesWindow SetPort: objects that are not ports leave no port; null gives S_FALSE") {
+TEST_CASE("ITidesWindow SetPort: a null from QueryInterface leaves no port; a port without a station draws none") {
   Graph g;
   ITidesWindow* w = g.window;
   NullAnswering broken;
   ITidesPort* unopened = nullptr;
   REQUIRE(g.tides.dll.Create(CLSID_TidesPort, &unopened) == S_OK);
   const std::tuple<const char*, IUnknown*, HRESULT> rows[] = {
-      {"the database", g.tides.db, E_INVALIDARG},
       {"a QueryInterface that answers S_OK and null", &broken, E_INVALIDARG},
-      {"null", nullptr, S_FALSE},
       {"a port created directly (no station)", unopened, S_OK},
   };
   REQUIRE(w->SetPort(nullptr) == S_FALSE);
