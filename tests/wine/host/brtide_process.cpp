@@ -5,7 +5,6 @@
 #include <sstream>
 #include <stdexcept>
 
-
 namespace br::test {
 
 namespace {
@@ -50,8 +49,6 @@ private:
   HANDLE handle_ = INVALID_HANDLE_VALUE;
 };
 
-}  // namespace
-
 std::wstring BuiltBrtidePath() {
   std::vector<wchar_t> buffer(32768);
   const DWORD n = GetModuleFileNameW(nullptr, buffer.data(), static_cast<DWORD>(buffer.size()));
@@ -63,6 +60,8 @@ std::wstring BuiltBrtidePath() {
   }
   throw std::runtime_error("brtide.exe not found above the test program");
 }
+
+}  // namespace
 
 ProcessResult RunBrtide(const std::vector<std::string>& args) {
   const std::wstring exe = BuiltBrtidePath();

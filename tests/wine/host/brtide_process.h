@@ -12,10 +12,8 @@ struct ProcessResult {
   std::string err;  // standard error
 };
 
-// The brtide.exe of the build tree the test program lies in.
-std::wstring BuiltBrtidePath();
-
-// brtide with arguments (UTF-8; each is quoted for the command line).
+// The brtide.exe of the build tree the test program lies in, with arguments (UTF-8; each
+// is quoted for the command line).
 ProcessResult RunBrtide(const std::vector<std::string>& args);
 
 // Lines of text without their line ends.
