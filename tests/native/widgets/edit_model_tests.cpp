@@ -94,23 +94,16 @@ TEST_CASE("clipboard: copy, cut and paste as plain text") {
   }
 }
 
-TEST_CASE("clicks and drags place the caret and select") {
+// Clicks and drags in free text are the Wine edit suite's, through the window; here the
+// tie-break it cannot pin for want of exact font metrics.
+TEST_CASE("restricted fields snap a click to the nearest place and never drag-select") {
   EditModel edit;
-  edit.setText("abcdef");
-  edit.placeCaret(2, false);
-  edit.placeCaret(5, true);
-  CHECK((edit.caret() == 5 && edit.selectionStart() == 2 && edit.selectionEnd() == 5));
-  edit.placeCaret(99, false);
-  CHECK((edit.caret() == 6 && edit.selectionLength() == 0));
-
-  SUBCASE("restricted fields snap to the nearest place and never drag-select") {
-    REQUIRE(edit.setEditType(kEditLatitude, ""));
-    REQUIRE(edit.setValue(1.0));
-    edit.placeCaret(2, false);  // the degree sign: the next place is as near as the one before
-    CHECK(edit.caret() == 3);
-    edit.placeCaret(9, false);
-    CHECK(edit.caret() == 10);
-    edit.placeCaret(0, true);
-    CHECK(edit.selectionLength() == 0);
-  }
+  REQUIRE(edit.setEditType(kEditLatitude, ""));
+  REQUIRE(edit.setValue(1.0));
+  edit.placeCaret(2, false);  // the degree sign: the next place is as near as the one before
+  CHECK(edit.caret() == 3);
+  edit.placeCaret(9, false);
+  CHECK(edit.caret() == 10);
+  edit.placeCaret(0, true);
+  CHECK(edit.selectionLength() == 0);
 }
