@@ -3,6 +3,7 @@
 // and re-entering sinks are in the boundary and re-entrancy suites.
 #include "tests/wine/common/dll_under_test.h"
 #include "tests/wine/controls/atl_host.h"
+#include "tests/wine/controls/canvas.h"
 #include "tests/wine/common/event_sink.h"
 #include "tests/wine/controls/fake_tides_port.h"
 
@@ -214,17 +215,9 @@ TEST_CASE("the background is palette colour 7; a font object keeps the table wor
   CHECK(embedded->SetPalette(palette) == S_OK);
   SafeArrayDestroy(colours);
 
-  HDC screen = GetDC(nullptr);
-  HDC dc = CreateCompatibleDC(screen);
-  HBITMAP bitmap = CreateCompatibleBitmap(screen, 300, 200);
-  ReleaseDC(nullptr, screen);
-  HGDIOBJ old = SelectObject(dc, bitmap);
-  CHECK(SendMessageA(p.window, WM_ERASEBKGND, reinterpret_cast<WPARAM>(dc), 0) != 0);
-  CHECK(GetPixel(dc, 5, 5) == RGB(70, 3, 5));
-  CHECK(GetPixel(dc, 299, 199) == RGB(70, 3, 5));
-  SelectObject(dc, old);
-  DeleteObject(bitmap);
-  DeleteDC(dc);
+  Canvas erased(300, 200);
+  CHECK(SendMessageA(p.window, WM_ERASEBKGND, reinterpret_cast<WPARAM>(erased.Dc()), 0) != 0);
+  CHECK(erased.Count(RGB(70, 3, 5), 0, 0, 300, 200) == 300 * 200);
 
   // A font through slot 3 keeps the table working.
   FONTDESC description{sizeof(FONTDESC), const_cast<LPOLESTR>(L"Tahoma"), {120000, 0}, FW_BOLD, ANSI_CHARSET,
