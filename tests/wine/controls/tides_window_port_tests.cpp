@@ -53,10 +53,7 @@ TEST_CASE("a calculated day of a real port: sun bands where the port's times say
   const int sunrise = MinutesOf(port, &ITidesPort::get_SunRise);
   const int sunset = MinutesOf(port, &ITidesPort::get_SunSet);
   const int twilightEnd = MinutesOf(port, &ITidesPort::get_EndTwilight);
-  CAPTURE(twilightBegin);
-  CAPTURE(sunrise);
-  CAPTURE(sunset);
-  CAPTURE(twilightEnd);
+  INFO("minutes: ", twilightBegin, " ", sunrise, " ", sunset, " ", twilightEnd);
   // A midsummer day at 48 N: dawn before 5, dusk after 19 (universal time at 4.5 W).
   REQUIRE(twilightBegin < sunrise);
   REQUIRE(sunrise < 6 * 60);
