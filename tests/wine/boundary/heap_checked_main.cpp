@@ -23,7 +23,8 @@ bool SetGlobalFlagForThisProgram() {
          ERROR_SUCCESS;
 }
 
-// Runs this program again with the same command line; its exit code, or -1.
+// Runs this program again with the same command line; its exit code, or -1. A child that
+// fails without a word says nothing of why, so its code is printed here.
 int RunChild() {
   SetEnvironmentVariableW(kChildMark, L"1");
   STARTUPINFOW startup = {};
@@ -36,16 +37,23 @@ int RunChild() {
   limits.BasicLimitInformation.LimitFlags = JOB_OBJECT_LIMIT_KILL_ON_JOB_CLOSE;
   SetInformationJobObject(job, JobObjectExtendedLimitInformation, &limits, sizeof limits);
   if (!CreateProcessW(nullptr, &commandLine[0], nullptr, nullptr, TRUE, CREATE_SUSPENDED, nullptr, nullptr, &startup,
-                      &process))
+                      &process)) {
+    std::fprintf(stderr, "heap-checked run: the suite could not be started (error %lu)\n",
+                 static_cast<unsigned long>(GetLastError()));
     return -1;
+  }
   AssignProcessToJobObject(job, process.hProcess);
   ResumeThread(process.hThread);
-  WaitForSingleObject(process.hProcess, INFINITE);
+  const DWORD waited = WaitForSingleObject(process.hProcess, INFINITE);
+  if (waited != WAIT_OBJECT_0)
+    std::fprintf(stderr, "heap-checked run: waiting for the suite gave %lu (error %lu)\n",
+                 static_cast<unsigned long>(waited), static_cast<unsigned long>(GetLastError()));
   DWORD code = static_cast<DWORD>(-1);
   GetExitCodeProcess(process.hProcess, &code);
   CloseHandle(process.hThread);
   CloseHandle(process.hProcess);
   CloseHandle(job);
+  if (code != 0) std::fprintf(stderr, "heap-checked run: the suite ended with code %08lX\n", static_cast<unsigned long>(code));
   return static_cast<int>(code);
 }
 
