@@ -5,6 +5,10 @@
 # native tree includes, so one ctest run in build/native runs every suite.
 
 set(BR_DOCTEST_MAIN ${BR_ROOT}/tests/doctest_main.cpp)
+if(BR_WINDOWS)
+  set(BR_CRASH_REPORT ${BR_ROOT}/tests/support/crash_report.cpp)
+  list(APPEND BR_DOCTEST_MAIN ${BR_CRASH_REPORT})
+endif()
 
 if(BR_WINDOWS)
   # doctest is header-only; expose just its folder to the cross compiler.

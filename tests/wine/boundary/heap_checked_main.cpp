@@ -5,6 +5,8 @@
 
 #include <windows.h>
 
+#include "tests/support/crash_report.h"
+
 #include <cstdio>
 #include <string>
 
@@ -57,21 +59,10 @@ int RunChild() {
   return static_cast<int>(code);
 }
 
-LONG WINAPI ReportCrash(EXCEPTION_POINTERS* exception) {
-  std::fprintf(stderr, "crash: exception %08lX at %p\n",
-               static_cast<unsigned long>(exception->ExceptionRecord->ExceptionCode),
-               exception->ExceptionRecord->ExceptionAddress);
-  std::fflush(stderr);
-  TerminateProcess(GetCurrentProcess(), 3);
-  return EXCEPTION_EXECUTE_HANDLER;
-}
-
 }  // namespace
 
 int main(int argc, char** argv) {
-  // A crash ends the suite at once, as a failure, instead of waiting on a debugger.
-  SetErrorMode(SEM_FAILCRITICALERRORS | SEM_NOGPFAULTERRORBOX);
-  SetUnhandledExceptionFilter(ReportCrash);
+  br::test::ReportCrashesAndEnd();
   if (!GetEnvironmentVariableW(kChildMark, nullptr, 0) && SetGlobalFlagForThisProgram()) return RunChild();
   doctest::Context context(argc, argv);
   return context.run();

@@ -6,9 +6,12 @@
 
 #include <cstring>
 
+#include "tests/support/crash_report.h"
+
 int RunChildScenario(const char* scenario);
 
 int main(int argc, char** argv) {
+  br::test::ReportCrashesAndEnd();
   if (argc >= 3 && std::strcmp(argv[1], "--child") == 0) {
     return RunChildScenario(argv[2]);
   }
