@@ -62,6 +62,18 @@ TEST_CASE("midsummer at 50 and 60 degrees north") {
   CHECK(Times(p.events) == "21:0 2:35 21:27 21:0 ");
 }
 
+TEST_CASE("a day with its morning twilight but no evening one") {
+  // Near the date the sun stops reaching -12 degrees, one twilight can happen without the
+  // other; the missing one alone takes the sunset's hour.
+  SunDay d;
+  d.zoneHours = {1.5, 3.25, 21.75, kNoSunEvent};
+  d.outcomes = {SunEventOutcome::kOccurs, SunEventOutcome::kOccurs, SunEventOutcome::kOccurs,
+                SunEventOutcome::kSunStaysAbove};
+  const PublishedSunTimes p = PublishSunTimes(d);
+  CHECK(p.kind == SunDayKind::kNormal);
+  CHECK(Times(p.events) == "1:30 3:15 21:45 21:0 ");
+}
+
 TEST_CASE("80 degrees north: midnight sun and polar night") {
   const SunDay june = Day({2000, 6, 21}, 80, 0, 0);
   CHECK((june.zoneHours[1] == kNoSunEvent && june.zoneHours[2] == kNoSunEvent));
