@@ -43,8 +43,6 @@ void pump(int ms) {
   } while (static_cast<int>(GetTickCount() - start) < ms);
 }
 
-RecordingPanel::RecordingPanel() = default;
-
 Seen recordOf(const toolkit::ToolkitEvent& event) {
   Seen s{event.id, event.source, event.hwnd, {}, event.keyState};
   for (int i = 0; i < 7; ++i) s.params[i] = event.params[i];
@@ -77,24 +75,10 @@ void mount(RecordingPanel& panel, HostWindow& host) {
   panel.setBounds(0, 0, client.right, client.bottom, true, true);
 }
 
-void setModifiers(bool shift, bool ctrl) {
-  BYTE state[256] = {};
-  GetKeyboardState(state);
-  state[VK_SHIFT] = shift ? 0x80 : 0;
-  state[VK_LSHIFT] = shift ? 0x80 : 0;
-  state[VK_CONTROL] = ctrl ? 0x80 : 0;
-  state[VK_LCONTROL] = ctrl ? 0x80 : 0;
-  SetKeyboardState(state);
-}
-
 void key(HWND hwnd, int virtualKey) { SendMessageA(hwnd, WM_KEYDOWN, static_cast<WPARAM>(virtualKey), 1); }
 
 void typeChar(HWND hwnd, char ch) {
   SendMessageA(hwnd, WM_CHAR, static_cast<WPARAM>(static_cast<unsigned char>(ch)), 1);
-}
-
-void typeText(HWND hwnd, const char* text) {
-  for (const char* c = text; *c; ++c) typeChar(hwnd, *c);
 }
 
 void press(HWND hwnd, UINT message, int x, int y, WPARAM keys) {
@@ -148,8 +132,6 @@ int Canvas::countIn(COLORREF colour, const RECT& area) const {
   return n;
 }
 
-int Canvas::count(COLORREF colour) const { return countIn(colour, RECT{0, 0, width_, height_}); }
-
 std::string windowClass(HWND hwnd) {
   char name[128] = {};
   GetClassNameA(hwnd, name, static_cast<int>(sizeof(name)));
@@ -168,19 +150,6 @@ std::string str(const RECT& r) {
 std::string str(SIZE s) { return std::to_string(s.cx) + "x" + std::to_string(s.cy); }
 
 std::string str(POINT p) { return "(" + std::to_string(p.x) + "," + std::to_string(p.y) + ")"; }
-
-Metrics metricsOf(const char* text, UINT flags) {
-  Metrics m;
-  HDC dc = GetDC(nullptr);
-  HGDIOBJ old = SelectObject(dc, GetStockObject(DEFAULT_GUI_FONT));
-  GetTextMetricsA(dc, &m.tm);
-  RECT box{0, 0, 0, 0};
-  DrawTextA(dc, text, -1, &box, DT_CALCRECT | flags);
-  m.measured = SIZE{box.right, box.bottom};
-  SelectObject(dc, old);
-  ReleaseDC(nullptr, dc);
-  return m;
-}
 
 bool cursorMoves() {
   SetCursorPos(7, 9);

@@ -43,7 +43,6 @@ const Seen* lastOf(const std::vector<Seen>& seen, int id);
 // them with `answer`.
 class RecordingPanel : public toolkit::Container {
 public:
-  RecordingPanel();
   std::vector<Seen> seen;
   int answer = 0;
   int dispatchEvent(toolkit::ToolkitEvent& event) override;
@@ -60,13 +59,9 @@ struct MountedPanel : RecordingPanel {
   MountedPanel() { mount(*this, host); }
 };
 
-// Shift and Ctrl as GetKeyState sees them on this thread.
-void setModifiers(bool shift, bool ctrl);
-
-// WM_KEYDOWN (and WM_CHAR for `ch` when given) sent to `hwnd`.
+// WM_KEYDOWN, WM_CHAR and mouse messages sent to `hwnd`.
 void key(HWND hwnd, int virtualKey);
 void typeChar(HWND hwnd, char ch);
-void typeText(HWND hwnd, const char* text);
 void press(HWND hwnd, UINT message, int x, int y, WPARAM keys);
 
 // A 32-bit top-down DIB with a memory DC, filled with `fill` at first.
@@ -76,7 +71,6 @@ public:
   ~Canvas();
   HDC dc() const { return dc_; }
   COLORREF at(int x, int y) const;
-  int count(COLORREF colour) const;
   int countIn(COLORREF colour, const RECT& area) const;
 
 private:
@@ -95,13 +89,6 @@ RECT xywh(int x, int y, int w, int h);
 std::string str(const RECT& r);  // "(left,top wxh)"
 std::string str(SIZE s);         // "wxh"
 std::string str(POINT p);        // "(x,y)"
-
-// The default GUI font's metrics and the extent DrawText gives `text` in it.
-struct Metrics {
-  TEXTMETRICA tm{};
-  SIZE measured{};
-};
-Metrics metricsOf(const char* text, UINT flags = DT_NOPREFIX);
 
 // Moves the shared cursor to a test point: false where the platform keeps it still.
 bool cursorMoves();
