@@ -20,8 +20,7 @@ AtlHost::AtlHost() {
   REQUIRE(module_ != nullptr);
   winInit_ = Entry<WinInitEntry>(module_, "AtlAxWinInit");
   attach_ = Entry<AttachEntry>(module_, "AtlAxAttachControl");
-  createEx_ = Entry<CreateExEntry>(module_, "AtlAxCreateControlEx");
-  REQUIRE((winInit_ && attach_ && createEx_));
+  REQUIRE((winInit_ && attach_));
 }
 
 AtlHost::~AtlHost() { FreeLibrary(module_); }

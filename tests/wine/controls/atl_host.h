@@ -21,19 +21,14 @@ public:
   HRESULT Attach(IUnknown* control, HWND window, IUnknown** container) const {
     return attach_(control, window, container);
   }
-  HRESULT CreateEx(const wchar_t* name, HWND window, IUnknown** container, IUnknown** control) const {
-    return createEx_(name, window, nullptr, container, control, IID_NULL, nullptr);
-  }
 
 private:
   using WinInitEntry = BOOL(WINAPI*)();
   using AttachEntry = HRESULT(WINAPI*)(IUnknown*, HWND, IUnknown**);
-  using CreateExEntry = HRESULT(WINAPI*)(LPCOLESTR, HWND, IStream*, IUnknown**, IUnknown**, REFIID, IUnknown*);
 
   HMODULE module_ = nullptr;
   WinInitEntry winInit_ = nullptr;
   AttachEntry attach_ = nullptr;
-  CreateExEntry createEx_ = nullptr;
 };
 
 }  // namespace br::test

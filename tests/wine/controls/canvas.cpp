@@ -50,25 +50,15 @@ bool Canvas::SamePixels(const Canvas& other) const {
   return std::memcmp(bits_, other.bits_, static_cast<std::size_t>(width_) * height_ * sizeof(std::uint32_t)) == 0;
 }
 
-bool Canvas::Near(int x, int y, COLORREF colour, int reach) const {
-  for (int dy = -reach; dy <= reach; ++dy)
-    for (int dx = -reach; dx <= reach; ++dx)
-      if (At(x + dx, y + dy) == colour) return true;
-  return false;
-}
-
-HRESULT DrawControl(IUnknown* control, const Canvas& canvas, const RECT& bounds) {
+HRESULT DrawControl(IUnknown* control, const Canvas& canvas, const RECT* bounds) {
   IViewObject* view = nullptr;
   HRESULT hr = control->QueryInterface(IID_IViewObject, reinterpret_cast<void**>(&view));
   if (FAILED(hr)) return hr;
-  const RECTL box{bounds.left, bounds.top, bounds.right, bounds.bottom};
+  const RECTL box = bounds ? RECTL{bounds->left, bounds->top, bounds->right, bounds->bottom}
+                           : RECTL{0, 0, canvas.Width(), canvas.Height()};
   hr = view->Draw(DVASPECT_CONTENT, -1, nullptr, nullptr, nullptr, canvas.Dc(), &box, nullptr, nullptr, 0);
   view->Release();
   return hr;
-}
-
-HRESULT DrawControl(IUnknown* control, const Canvas& canvas) {
-  return DrawControl(control, canvas, RECT{0, 0, canvas.Width(), canvas.Height()});
 }
 
 }  // namespace br::test

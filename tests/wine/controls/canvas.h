@@ -25,8 +25,6 @@ public:
   // Pixels of the colour inside [left, right) x [top, bottom).
   int Count(COLORREF colour, int left, int top, int right, int bottom) const;
   bool SamePixels(const Canvas& other) const;
-  // True when a pixel within `reach` pixels of (x, y) has the colour.
-  bool Near(int x, int y, COLORREF colour, int reach = 1) const;
 
 private:
   int width_;
@@ -37,9 +35,8 @@ private:
   std::uint32_t* bits_ = nullptr;
 };
 
-// Draws control (any interface of it) into the canvas at bounds through IViewObject::Draw.
-HRESULT DrawControl(IUnknown* control, const Canvas& canvas, const RECT& bounds);
-// The same over the whole canvas.
-HRESULT DrawControl(IUnknown* control, const Canvas& canvas);
+// Draws control (any interface of it) into the canvas at bounds (default: all of it)
+// through IViewObject::Draw.
+HRESULT DrawControl(IUnknown* control, const Canvas& canvas, const RECT* bounds = nullptr);
 
 }  // namespace br::test
