@@ -7,36 +7,20 @@ namespace tktest {
 using namespace toolkit;
 
 namespace {
-
 LRESULT CALLBACK nativeProc(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam) {
-  nativeCalls().push_back(NativeCall{hwnd, message, wParam});
+  nativeCalls().push_back(NativeCall{message, wParam});
   return DefWindowProcA(hwnd, message, wParam, lParam);
 }
-
-void registerOnce(const char* name, WNDPROC proc) {
-  WNDCLASSEXA info{};
-  info.cbSize = sizeof(info);
-  if (GetClassInfoExA(GetModuleHandleA(nullptr), name, &info)) return;
-  WNDCLASSEXA wc{};
-  wc.cbSize = sizeof(wc);
-  wc.lpfnWndProc = proc;
-  wc.hInstance = GetModuleHandleA(nullptr);
-  wc.hCursor = LoadCursor(nullptr, IDC_ARROW);
-  wc.lpszClassName = name;
-  RegisterClassExA(&wc);
-}
-
 }  // namespace
 
-RECT placed(HWND hwnd) {
+RECT placed(const cXComponent& component) {
   RECT r{};
+  HWND hwnd = component.getHandle();
   if (!hwnd) return r;
   GetWindowRect(hwnd, &r);
   MapWindowPoints(nullptr, GetParent(hwnd), reinterpret_cast<POINT*>(&r), 2);
   return r;
 }
-
-RECT placed(const cXComponent& component) { return placed(component.getHandle()); }
 
 Probe::~Probe() {
   if (deletions) ++*deletions;
@@ -47,19 +31,12 @@ int Probe::dispatchEvent(ToolkitEvent& event) {
   return cXComponent::dispatchEvent(event);
 }
 
-int Probe::react(ToolkitEvent& event) {
-  if (markHandled) event.handled = true;
-  return answer;
-}
-
-int Probe::onKeyDown(ToolkitEvent& event, int) {
-  if (deleteSelfOnKey) {
-    // Something still queued behind this event must be dropped, not dispatched.
-    peer()->queue(std::make_unique<ToolkitEvent>(this, 61, event.hwnd));
-    delete this;
-    return 1;
-  }
-  return react(event);
+int Probe::onKeyDown(ToolkitEvent& event, int key) {
+  if (!deleteSelfOnKey) return cXComponent::onKeyDown(event, key);
+  // Something still queued behind this event must be dropped, not dispatched.
+  peer()->queue(std::make_unique<ToolkitEvent>(this, 61, event.hwnd));
+  delete this;
+  return 1;
 }
 
 std::vector<int> Probe::ids() const {
@@ -68,9 +45,7 @@ std::vector<int> Probe::ids() const {
   return out;
 }
 
-ProbePanel::ProbePanel(std::unique_ptr<Layout> layout) {
-  setLayout(layout ? std::move(layout) : std::make_unique<BorderLayout>());
-}
+ProbePanel::ProbePanel() { setLayout(std::make_unique<BorderLayout>()); }
 
 int ProbePanel::dispatchEvent(ToolkitEvent& event) {
   seen.push_back(wtest::recordOf(event));
@@ -78,7 +53,15 @@ int ProbePanel::dispatchEvent(ToolkitEvent& event) {
 }
 
 const char* nativeClassName() {
-  registerOnce("ToolkitTestNative", nativeProc);
+  static const bool registered = [] {
+    WNDCLASSEXA wc{};
+    wc.cbSize = sizeof(wc);
+    wc.lpfnWndProc = nativeProc;
+    wc.hInstance = GetModuleHandleA(nullptr);
+    wc.lpszClassName = "ToolkitTestNative";
+    return RegisterClassExA(&wc) != 0;
+  }();
+  (void)registered;
   return "ToolkitTestNative";
 }
 

@@ -15,24 +15,19 @@ namespace tktest {
 
 using wtest::HostWindow;
 using wtest::pump;
-
-// The window's rectangle in its parent's client coordinates.
-RECT placed(HWND hwnd);
-RECT placed(const toolkit::cXComponent& component);
+using wtest::Seen;
 using wtest::str;
 using wtest::xywh;
 
-using wtest::Seen;
+// The window's rectangle in its parent's client coordinates.
+RECT placed(const toolkit::cXComponent& component);
 
-// A component that records every event dispatched to it and answers chosen
-// handlers with chosen values.
+// A component that records every event dispatched to it.
 class Probe : public toolkit::cXComponent {
 public:
   SIZE pref{10, 10};
   std::vector<Seen> seen;
-  int answer = 0;             // what the handlers below answer
-  bool markHandled = false;   // whether they mark the event handled
-  int* deletions = nullptr;   // counts destructor runs when set
+  int* deletions = nullptr;  // counts destructor runs when set
   bool deleteSelfOnKey = false;
 
   ~Probe() override;
@@ -40,26 +35,18 @@ public:
   SIZE getPreferredSize() override { return pref; }
   SIZE getPreferredSizeIn(const RECT&) override { return pref; }
   int onKeyDown(toolkit::ToolkitEvent& event, int key) override;
-  int onChar(toolkit::ToolkitEvent& event, int ch) override { return react(event); }
-  int onMouseDown(toolkit::ToolkitEvent& event, int, int) override { return react(event); }
-  int onAction(toolkit::ToolkitEvent& event) override { return react(event); }
-  int onNotify(toolkit::ToolkitEvent& event) override { return react(event); }
 
   std::vector<int> ids() const;
   const Seen* last(int id) const { return wtest::lastOf(seen, id); }
-
-private:
-  int react(toolkit::ToolkitEvent& event);
 };
 
-// A container that records what bubbles up to it.
+// A container that records what bubbles up to it and answers key events with `answer`.
 class ProbePanel : public toolkit::Container {
 public:
-  explicit ProbePanel(std::unique_ptr<toolkit::Layout> layout = nullptr);
+  ProbePanel();
   std::vector<Seen> seen;
   int answer = 0;
   int dispatchEvent(toolkit::ToolkitEvent& event) override;
-  int onAction(toolkit::ToolkitEvent&) override { return answer; }
   int onKeyDown(toolkit::ToolkitEvent&, int) override { return answer; }
 };
 
@@ -67,7 +54,6 @@ public:
 // native control's own procedure.
 const char* nativeClassName();
 struct NativeCall {
-  HWND hwnd;
   UINT message;
   WPARAM wParam;
 };
