@@ -6,19 +6,18 @@
 
 #include <doctest/doctest.h>
 
-#include <cstdio>
 #include <fstream>
 #include <map>
 #include <regex>
-#include <sstream>
+#include <iterator>
 #include <string>
 #include <vector>
 
 namespace {
 
 struct Header {
-  std::map<std::string, GUID> guids;                      // IID_/DIID_/CLSID_ name -> GUID
-  std::vector<std::pair<std::string, GUID>> classes;      // coclass name, CLSID
+  std::map<std::string, GUID> guids;                        // class or interface name -> GUID
+  std::vector<std::string> classes;                         // coclass names
   std::map<std::string, std::vector<std::string>> vtables;  // interface -> members in slot order
 };
 
@@ -28,33 +27,22 @@ Header ReadHeader() {
   path = path.substr(0, path.find_last_of(L"\\/")) + L"\\resources\\generated\\BR_Info.h";
   std::ifstream file(path.c_str());
   REQUIRE(file.good());
-  std::stringstream buffer;
-  buffer << file.rdbuf();
-  const std::string text = buffer.str();
+  const std::string text{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+  const std::sregex_iterator end;
   Header header;
-  const std::regex guid(R"(DEFINE_GUID\((\w+), *(0x\w+), *(0x\w+), *(0x\w+), *((?:0x\w+, *){7}0x\w+)\))");
-  for (std::sregex_iterator m(text.begin(), text.end(), guid), end; m != end; ++m) {
-    GUID g = {};
-    unsigned b[8] = {};
-    g.Data1 = std::stoul((*m)[2], nullptr, 16);
-    g.Data2 = static_cast<WORD>(std::stoul((*m)[3], nullptr, 16));
-    g.Data3 = static_cast<WORD>(std::stoul((*m)[4], nullptr, 16));
-    REQUIRE(std::sscanf((*m)[5].str().c_str(), "%x,%x,%x,%x,%x,%x,%x,%x", &b[0], &b[1], &b[2], &b[3], &b[4], &b[5],
-                        &b[6], &b[7]) == 8);
-    for (int i = 0; i < 8; ++i) g.Data4[i] = static_cast<BYTE>(b[i]);
-    header.guids[(*m)[1]] = g;
-  }
-  const std::regex coclass(R"(class DECLSPEC_UUID\("[-0-9a-f]+"\) (\w+);)");
-  for (std::sregex_iterator m(text.begin(), text.end(), coclass), end; m != end; ++m) {
-    REQUIRE(header.guids.count("CLSID_" + (*m)[1].str()) == 1);
-    header.classes.emplace_back((*m)[1], header.guids["CLSID_" + (*m)[1].str()]);
+  // Each class and interface declaration with its GUID.
+  const std::regex declared(R"x((MIDL_INTERFACE|class DECLSPEC_UUID)\("([-0-9a-f]+)"\)\s+(\w+))x");
+  for (std::sregex_iterator m(text.begin(), text.end(), declared); m != end; ++m) {
+    const std::string braced = "{" + (*m)[2].str() + "}";
+    REQUIRE(IIDFromString(std::wstring(braced.begin(), braced.end()).c_str(), &header.guids[(*m)[3]]) == S_OK);
+    if ((*m)[1] == "class DECLSPEC_UUID") header.classes.push_back((*m)[3]);
   }
   const std::regex vtable(R"(typedef struct (\w+)Vtbl \{([^}]*)\} \1Vtbl;)");
   const std::regex member(R"(\(STDMETHODCALLTYPE \*(\w+)\))");
-  for (std::sregex_iterator m(text.begin(), text.end(), vtable), end; m != end; ++m) {
+  for (std::sregex_iterator m(text.begin(), text.end(), vtable); m != end; ++m) {
     const std::string body = (*m)[2];
-    std::vector<std::string>& members = header.vtables[(*m)[1]];
-    for (std::sregex_iterator f(body.begin(), body.end(), member); f != end; ++f) members.push_back((*f)[1]);
+    for (std::sregex_iterator f(body.begin(), body.end(), member); f != end; ++f)
+      header.vtables[(*m)[1]].push_back((*f)[1]);
   }
   return header;
 }
@@ -62,8 +50,7 @@ Header ReadHeader() {
 std::string NameOf(ITypeInfo* info, MEMBERID id = MEMBERID_NIL) {
   BSTR name = nullptr;
   info->GetDocumentation(id, &name, nullptr, nullptr, nullptr);
-  std::string result;
-  for (const wchar_t* c = name; c && *c; ++c) result += static_cast<char>(*c);
+  std::string result(name, name + SysStringLen(name));  // the names are ASCII
   SysFreeString(name);
   return result;
 }
@@ -72,23 +59,21 @@ std::string NameOf(ITypeInfo* info, MEMBERID id = MEMBERID_NIL) {
 std::vector<std::string> SlotNames(ITypeInfo* info) {
   TYPEATTR* attributes = nullptr;
   REQUIRE(info->GetTypeAttr(&attributes) == S_OK);
-  CHECK(attributes->typekind == TKIND_INTERFACE);
   CHECK((attributes->wTypeFlags & TYPEFLAG_FOLEAUTOMATION) != 0);
-  std::vector<std::string> slots(7 + attributes->cFuncs);
+  std::vector<std::string> slots = {"QueryInterface", "AddRef",        "Release", "GetTypeInfoCount",
+                                    "GetTypeInfo",    "GetIDsOfNames", "Invoke"};
+  slots.resize(7 + attributes->cFuncs);
   for (UINT i = 0; i < attributes->cFuncs; ++i) {
     FUNCDESC* f = nullptr;
     REQUIRE(info->GetFuncDesc(i, &f) == S_OK);
     CHECK(f->elemdescFunc.tdesc.vt == VT_HRESULT);
     const std::size_t slot = static_cast<std::size_t>(f->oVft) / sizeof(void*);
-    REQUIRE(slot < slots.size());
+    REQUIRE((slot >= 7 && slot < slots.size()));
     slots[slot] = (f->invkind == INVOKE_PROPERTYGET ? "get_" : f->invkind == INVOKE_PROPERTYPUT ? "put_" : "") +
                   NameOf(info, f->memid);
     info->ReleaseFuncDesc(f);
   }
   info->ReleaseTypeAttr(attributes);
-  const char* const dispatch[] = {"QueryInterface", "AddRef", "Release", "GetTypeInfoCount",
-                                  "GetTypeInfo", "GetIDsOfNames", "Invoke"};
-  for (std::size_t i = 0; i < 7; ++i) slots[i] = dispatch[i];
   return slots;
 }
 
@@ -99,10 +84,10 @@ TEST_CASE("the type library agrees with the generated header: classes, interface
   REQUIRE(header.classes.size() == 8);
   ITypeLib* library = nullptr;
   REQUIRE(LoadTypeLibEx(br::test::BuiltDllPath().c_str(), REGKIND_NONE, &library) == S_OK);
-  for (const auto& [name, clsid] : header.classes) {
+  for (const std::string& name : header.classes) {
     INFO("class ", name);
     ITypeInfo* coclass = nullptr;
-    REQUIRE(library->GetTypeInfoOfGuid(clsid, &coclass) == S_OK);
+    REQUIRE(library->GetTypeInfoOfGuid(header.guids.at(name), &coclass) == S_OK);
     CHECK(NameOf(coclass) == name);
     TYPEATTR* attributes = nullptr;
     REQUIRE(coclass->GetTypeAttr(&attributes) == S_OK);
@@ -110,7 +95,7 @@ TEST_CASE("the type library agrees with the generated header: classes, interface
     CHECK((attributes->wTypeFlags & TYPEFLAG_FCANCREATE) != 0);
     const UINT implemented = attributes->cImplTypes;
     coclass->ReleaseTypeAttr(attributes);
-    CHECK(implemented == 1 + header.guids.count("DIID__I" + name + "Events"));
+    CHECK(implemented == 1 + header.guids.count("_I" + name + "Events"));
     int duals = 0;
     for (UINT i = 0; i < implemented; ++i) {
       INT flags = 0;
@@ -126,9 +111,8 @@ TEST_CASE("the type library agrees with the generated header: classes, interface
       REQUIRE(face->GetTypeAttr(&attributes) == S_OK);
       CHECK(attributes->typekind == TKIND_DISPATCH);
       CHECK(((attributes->wTypeFlags & TYPEFLAG_FDUAL) != 0) == !source);
-      const auto declared = header.guids.find((source ? "DIID_" : "IID_") + faceName);
-      REQUIRE(declared != header.guids.end());
-      CHECK(IsEqualGUID(attributes->guid, declared->second));
+      REQUIRE(header.guids.count(faceName) == 1);
+      CHECK(IsEqualGUID(attributes->guid, header.guids.at(faceName)));
       face->ReleaseTypeAttr(attributes);
       if (!source) {
         ++duals;

@@ -2,80 +2,51 @@
 
 #include <windows.h>
 
-#include <sstream>
 #include <stdexcept>
 
 namespace br::test {
 
 namespace {
 
-std::wstring Wide(const std::string& text) {
-  if (text.empty()) return std::wstring();
-  const int n = MultiByteToWideChar(CP_UTF8, 0, text.data(), static_cast<int>(text.size()), nullptr, 0);
-  std::wstring wide(static_cast<std::size_t>(n), L'\0');
-  MultiByteToWideChar(CP_UTF8, 0, text.data(), static_cast<int>(text.size()), wide.data(), n);
-  return wide;
+// An inheritable scratch file for one of the child's streams, gone with its last handle.
+HANDLE CaptureFile() {
+  wchar_t folder[MAX_PATH + 1] = {}, name[MAX_PATH + 1] = {};
+  GetTempPathW(MAX_PATH, folder);
+  GetTempFileNameW(folder, L"bt", 0, name);
+  SECURITY_ATTRIBUTES inherit = {sizeof inherit, nullptr, TRUE};
+  const HANDLE file = CreateFileW(name, GENERIC_READ | GENERIC_WRITE, FILE_SHARE_READ | FILE_SHARE_WRITE | FILE_SHARE_DELETE,
+                                  &inherit, CREATE_ALWAYS, FILE_ATTRIBUTE_TEMPORARY | FILE_FLAG_DELETE_ON_CLOSE, nullptr);
+  if (file == INVALID_HANDLE_VALUE) throw std::runtime_error("cannot make a capture file");
+  return file;
 }
 
-// An inheritable scratch file the child writes one of its streams to.
-class CaptureFile {
-public:
-  explicit CaptureFile(const wchar_t* prefix) {
-    wchar_t folder[MAX_PATH + 1] = {};
-    wchar_t name[MAX_PATH + 1] = {};
-    GetTempPathW(MAX_PATH, folder);
-    GetTempFileNameW(folder, prefix, 0, name);
-    SECURITY_ATTRIBUTES inherit = {sizeof inherit, nullptr, TRUE};
-    // Gone with the last handle, even when the child's copy outlives ours for a moment.
-    handle_ = CreateFileW(name, GENERIC_READ | GENERIC_WRITE, FILE_SHARE_READ | FILE_SHARE_WRITE | FILE_SHARE_DELETE,
-                          &inherit, CREATE_ALWAYS, FILE_ATTRIBUTE_TEMPORARY | FILE_FLAG_DELETE_ON_CLOSE, nullptr);
-    if (handle_ == INVALID_HANDLE_VALUE) throw std::runtime_error("cannot make a capture file");
-  }
-  ~CaptureFile() { CloseHandle(handle_); }
-  CaptureFile(const CaptureFile&) = delete;
-  CaptureFile& operator=(const CaptureFile&) = delete;
-
-  HANDLE Handle() const { return handle_; }
-  std::string Contents() const {
-    std::string text;
-    SetFilePointer(handle_, 0, nullptr, FILE_BEGIN);
-    char buffer[4096];
-    DWORD got = 0;
-    while (ReadFile(handle_, buffer, sizeof buffer, &got, nullptr) && got > 0) text.append(buffer, got);
-    return text;
-  }
-
-private:
-  HANDLE handle_ = INVALID_HANDLE_VALUE;
-};
-
-std::wstring BuiltBrtidePath() {
-  std::vector<wchar_t> buffer(32768);
-  const DWORD n = GetModuleFileNameW(nullptr, buffer.data(), static_cast<DWORD>(buffer.size()));
-  std::wstring folder(buffer.data(), n);
-  for (std::size_t cut; (cut = folder.find_last_of(L"\\/")) != std::wstring::npos;) {
-    folder.resize(cut);
-    const std::wstring candidate = folder + L"\\host\\brtide\\brtide.exe";
-    if (GetFileAttributesW(candidate.c_str()) != INVALID_FILE_ATTRIBUTES) return candidate;
-  }
-  throw std::runtime_error("brtide.exe not found above the test program");
+std::string ReadAndClose(HANDLE file) {
+  std::string text;
+  SetFilePointer(file, 0, nullptr, FILE_BEGIN);
+  char buffer[4096];
+  for (DWORD got = 0; ReadFile(file, buffer, sizeof buffer, &got, nullptr) && got > 0;) text.append(buffer, got);
+  CloseHandle(file);
+  return text;
 }
 
 }  // namespace
 
 ProcessResult RunBrtide(const std::vector<std::string>& args) {
-  const std::wstring exe = BuiltBrtidePath();
+  // The test programs lie three folders below the build tree (tests/wine/<suite>).
+  wchar_t self[MAX_PATH] = {};
+  const std::wstring program(self, GetModuleFileNameW(nullptr, self, MAX_PATH));
+  const std::wstring exe = program.substr(0, program.find_last_of(L"\\")) + L"\\..\\..\\..\\host\\brtide\\brtide.exe";
   std::wstring line = L"\"" + exe + L"\"";
-  for (const std::string& arg : args) line += L" \"" + Wide(arg) + L"\"";
-
-  CaptureFile out(L"bto");
-  CaptureFile err(L"bte");
+  for (const std::string& arg : args) {
+    std::wstring wide(static_cast<std::size_t>(MultiByteToWideChar(CP_UTF8, 0, arg.c_str(), -1, nullptr, 0)), L'\0');
+    MultiByteToWideChar(CP_UTF8, 0, arg.c_str(), -1, wide.data(), static_cast<int>(wide.size()));
+    line += L" \"" + wide.substr(0, wide.size() - 1) + L"\"";
+  }
   STARTUPINFOW startup = {};
   startup.cb = sizeof startup;
   startup.dwFlags = STARTF_USESTDHANDLES;
-  startup.hStdInput = nullptr;
-  startup.hStdOutput = out.Handle();
-  startup.hStdError = err.Handle();
+  startup.hStdOutput = CaptureFile();
+  startup.hStdError = CaptureFile();
   PROCESS_INFORMATION process = {};
   if (!CreateProcessW(exe.c_str(), line.data(), nullptr, nullptr, TRUE, CREATE_NO_WINDOW, nullptr, nullptr, &startup,
                       &process)) {
@@ -86,16 +57,9 @@ ProcessResult RunBrtide(const std::vector<std::string>& args) {
   GetExitCodeProcess(process.hProcess, &result.exitCode);
   CloseHandle(process.hThread);
   CloseHandle(process.hProcess);
-  result.out = out.Contents();
-  result.err = err.Contents();
+  result.out = ReadAndClose(startup.hStdOutput);
+  result.err = ReadAndClose(startup.hStdError);
   return result;
-}
-
-std::vector<std::string> TextLines(const std::string& text) {
-  std::vector<std::string> lines;
-  std::istringstream in(text);
-  for (std::string line; std::getline(in, line);) lines.push_back(line);
-  return lines;
 }
 
 }  // namespace br::test

@@ -16,7 +16,4 @@ struct ProcessResult {
 // is quoted for the command line).
 ProcessResult RunBrtide(const std::vector<std::string>& args);
 
-// Lines of text without their line ends.
-std::vector<std::string> TextLines(const std::string& text);
-
 }  // namespace br::test

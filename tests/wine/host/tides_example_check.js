@@ -1,7 +1,6 @@
-// Runs examples/tides.js as a user would (cscript, output captured) and checks what it
-// printed against the same day read here through COM, and against brtide's CSV of that
-// day: three clients of the library must agree. Wine's cscript exits 0 after a script
-// error, so everything runs inside try and the exit status comes from the checks.
+// Runs examples/tides.js as a user would (cscript, output captured) and checks what it printed
+// against Brest's day read here through COM and against brtide's CSV of that day. Wine's cscript
+// exits 0 after a script error: everything runs inside try, the exit status comes from the checks.
 var failures = 0;
 function check(ok, what) {
   if (!ok) {
@@ -16,8 +15,7 @@ function capture(commandLine) {
   var file = fso.BuildPath(fso.GetSpecialFolder(2), fso.GetTempName());
   // cmd drops the first and last quote of what follows /c: the outer pair is for it.
   var status = shell.Run("cmd /c \"" + commandLine + " > \"" + file + "\"\"", 0, true);
-  var stream = fso.OpenTextFile(file, 1);
-  var text = stream.AtEndOfStream ? "" : stream.ReadAll();
+  var stream = fso.OpenTextFile(file, 1), text = stream.AtEndOfStream ? "" : stream.ReadAll();
   stream.Close();
   fso.DeleteFile(file);
   return {status: status, lines: text.replace(/\r/g, "").split("\n")};
@@ -63,9 +61,7 @@ try {
   check(out[4 + 24] == "  24:00  " + port.WavePoint(24).toFixed(3), "last point line: " + out[28]);
 
   // brtide, the C++ client, prints the same heights for the same station and day.
-  var win64 = shell.Environment("PROCESS")("BR_WIN64_DIR");
-  check(win64 != "", "BR_WIN64_DIR names the build");
-  var brtide = "Z:" + win64.replace(/\//g, "\\") + "\\host\\brtide\\brtide.exe";
+  var brtide = "Z:" + shell.Environment("PROCESS")("BR_WIN64_DIR").replace(/\//g, "\\") + "\\host\\brtide\\brtide.exe";
   var iso = now.getFullYear() + "-" + ("0" + (now.getMonth() + 1)).slice(-2) + "-" + ("0" + now.getDate()).slice(-2);
   var csv = capture("\"" + brtide + "\" day --folder \"" + folder + "\" --port " + number + " --date " + iso + " --csv");
   check(csv.status == 0, "brtide exits 0, got " + csv.status);
