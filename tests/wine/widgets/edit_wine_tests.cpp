@@ -33,6 +33,7 @@ TEST_CASE("characters typed reach the model; refused ones bubble, the edit's key
   const Row rows[] = {
       {kEditLatitude, nullptr, 0, -12.5, true, "nx", "12\xB0" "30.000'N", 1},  // 'n' taken, 'x' refused
       {kEditInteger, nullptr, 6, NAN, false, "1234567-", "123456", 2},
+      {kEditText, "-99:99", 0, NAN, false, "-1234", "-12:34", 0},
       {kEditText, nullptr, 0, NAN, false, "ab\t", "ab", 1},  // control characters are not text
   };
   for (const Row& row : rows) {
