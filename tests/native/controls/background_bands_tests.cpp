@@ -1,3 +1,4 @@
+// Event combinations beside the Wine port suite's day with all four sun times.
 #include "tides/controls/graph/background_bands.h"
 
 #include <doctest/doctest.h>
@@ -7,75 +8,37 @@
 
 using namespace br::tides::graph;
 
-namespace {
-
-GraphGeometry Plain() { return GraphGeometry(Rect{0, 0, 300, 200}, 8, 8); }
-
-SunEvents AllFour() {
-  SunEvents e;
-  e.twilightBegin = TimeOfDay{5, 30};
-  e.sunrise = TimeOfDay{6, 0};
-  e.sunset = TimeOfDay{18, 0};
-  e.twilightEnd = TimeOfDay{18, 30};
-  return e;
-}
-
-void CheckBand(const Band& band, int left, int right, int colour) {
-  CHECK((band.left == left && band.right == right && band.colour == colour));
-}
-
-}  // namespace
-
-TEST_CASE("twilight band, then daylight over it, each from the events there are") {
-  SunEvents noTwilight = AllFour(), noRiseSet = AllFour();
-  noTwilight.twilightBegin.reset();
-  noTwilight.twilightEnd.reset();
-  noRiseSet.sunrise.reset();
-  noRiseSet.sunset.reset();
-  // All four: 05:30 .. 18:30 and 06:00 .. 18:00. Without twilight: twilight over the whole plot.
+TEST_CASE("twilight band, then daylight over it, from the events there are; else polar day or night") {
+  SunEvents noTwilight, noRiseSet, noSunset, overMidnight, polar;
+  noTwilight.sunrise = noSunset.sunrise = TimeOfDay{6, 0};
+  noTwilight.sunset = TimeOfDay{18, 0};
+  noRiseSet.twilightBegin = noSunset.twilightBegin = TimeOfDay{5, 30};
+  noRiseSet.twilightEnd = noSunset.twilightEnd = TimeOfDay{18, 30};
+  overMidnight.twilightBegin = TimeOfDay{20, 0};  // through midnight to 02:00: at both ends of the plot
+  overMidnight.twilightEnd = TimeOfDay{2, 0};
+  polar.latitude = 78.2;
+  polar.month = 6;
   const struct {
     SunEvents events;
-    std::vector<std::array<int, 3>> bands;  // left, right, colour
-  } cases[] = {{AllFour(), {{8 + 65, 8 + 218, kTwilightColour}, {8 + 71, 8 + 213, kDaylightColour}}},
-               {noTwilight, {{8, 292, kTwilightColour}, {79, 221, kDaylightColour}}},
-               {noRiseSet, {{73, 226, kTwilightColour}}}};
+    std::vector<std::array<int, 3>> bands;  // left, right, colour on a 300 x 200 plot inside margins of 8
+  } cases[] = {{noTwilight, {{8, 292, kTwilightColour}, {79, 221, kDaylightColour}}},  // twilight over the whole plot
+               {noRiseSet, {{73, 226, kTwilightColour}}},
+               {noSunset, {}},  // any other combination leaves the night
+               {overMidnight, {{8 + 236, 292, kTwilightColour}, {8, 8 + 23, kTwilightColour}}},
+               {polar, {{8, 292, kDaylightColour}}}};
+  const GraphGeometry plot(Rect{0, 0, 300, 200}, 8, 8);
   for (const auto& c : cases) {
-    const std::vector<Band> bands = BackgroundBands(c.events, Plain());
+    const std::vector<Band> bands = BackgroundBands(c.events, plot);
     REQUIRE(bands.size() == c.bands.size());
-    for (std::size_t i = 0; i < bands.size(); ++i) CheckBand(bands[i], c.bands[i][0], c.bands[i][1], c.bands[i][2]);
+    for (std::size_t i = 0; i < bands.size(); ++i)
+      CHECK((bands[i].left == c.bands[i][0] && bands[i].right == c.bands[i][1] && bands[i].colour == c.bands[i][2]));
   }
-}
-
-TEST_CASE("no sun event: daylight all day in the polar summer, else night") {
-  SunEvents e;
-  e.latitude = 78.2;
-  e.month = 6;
-  std::vector<Band> bands = BackgroundBands(e, Plain());
-  REQUIRE(bands.size() == 1);
-  CheckBand(bands[0], 8, 292, kDaylightColour);
-  const std::pair<double, int> days[] = {{78.2, 12}, {-70.0, 12}, {-70.0, 7}, {0.0, 12}, {78.2, 0}};  // month 0: unread
-  const std::size_t bandCount[] = {0, 1, 0, 0, 0};
-  for (int i = 0; i < 5; ++i) {
-    e.latitude = days[i].first;
-    e.month = days[i].second;
-    if (!days[i].second) e.month.reset();
-    CHECK(BackgroundBands(e, Plain()).size() == bandCount[i]);
+  // Without events: day in the polar summer of either hemisphere, else (or with no month read) night.
+  const std::pair<double, int> days[] = {{78.2, 12}, {-70.0, 12}, {0.0, 12}, {78.2, 0}};
+  for (const auto& [latitude, month] : days) {
+    polar.latitude = latitude;
+    polar.month = month;
+    if (!month) polar.month.reset();
+    CHECK(BackgroundBands(polar, plot).size() == (latitude == -70.0 ? 1u : 0u));
   }
-}
-
-TEST_CASE("any other combination leaves the night") {
-  SunEvents noSunset = AllFour(), noTwilightEnd = AllFour();
-  noSunset.sunset.reset();
-  noTwilightEnd.twilightEnd.reset();
-  CHECK((BackgroundBands(noSunset, Plain()).empty() && BackgroundBands(noTwilightEnd, Plain()).empty()));
-}
-
-TEST_CASE("an interval over midnight is painted at both ends of the plot") {
-  SunEvents e;
-  e.twilightBegin = TimeOfDay{20, 0};  // twilight from 20:00 through midnight to 02:00
-  e.twilightEnd = TimeOfDay{2, 0};
-  const std::vector<Band> bands = BackgroundBands(e, Plain());
-  REQUIRE(bands.size() == 2);
-  CheckBand(bands[0], 8 + 236, 292, kTwilightColour);
-  CheckBand(bands[1], 8, 8 + 23, kTwilightColour);
 }

@@ -1,27 +1,42 @@
 #pragma once
-// Registry values restored after a test, scratch folders, small file helpers.
+// Registry values restored after a test, scratch folders, whole-file reads and writes.
 
 #include <windows.h>
+#include <shellapi.h>
 
+#include <fstream>
+#include <iterator>
 #include <string>
 #include <vector>
 
 // Saves a registry value (or its absence) and puts it back when destroyed.
 class SavedRegistryValue {
 public:
-  SavedRegistryValue(HKEY root, std::string path, std::string name);
-  ~SavedRegistryValue();
+  SavedRegistryValue(HKEY root, std::string path, std::string name)
+      : m_root(root), m_path(std::move(path)), m_name(std::move(name)) {
+    DWORD size = 0;
+    const DWORD flags = RRF_RT_ANY | RRF_NOEXPAND;
+    if (RegGetValueA(m_root, m_path.c_str(), m_name.c_str(), flags, &m_type, nullptr, &size) == ERROR_SUCCESS) {
+      m_data.resize(size);
+      m_existed = RegGetValueA(m_root, m_path.c_str(), m_name.c_str(), flags, &m_type, m_data.data(), &size) == 0;
+      m_data.resize(size);
+    }
+  }
+  ~SavedRegistryValue() { m_existed ? Set(m_type, m_data.data(), static_cast<DWORD>(m_data.size())) : Delete(); }
   SavedRegistryValue(const SavedRegistryValue&) = delete;
   SavedRegistryValue& operator=(const SavedRegistryValue&) = delete;
 
-  void SetString(const std::string& text, DWORD type = REG_SZ) const;
-  void SetDword(DWORD value) const;
-  void SetBinary(const std::vector<BYTE>& data) const;
-  void Delete() const;
+  // Creates the key when it is missing.
+  void Set(DWORD type, const void* data, DWORD size) const {
+    RegSetKeyValueA(m_root, m_path.c_str(), m_name.c_str(), type, data, size);
+  }
+  void SetString(const std::string& text, DWORD type = REG_SZ) const {
+    Set(type, text.c_str(), static_cast<DWORD>(text.size() + 1));
+  }
+  void SetDword(DWORD value) const { Set(REG_DWORD, &value, sizeof value); }
+  void Delete() const { RegDeleteKeyValueA(m_root, m_path.c_str(), m_name.c_str()); }
 
 private:
-  void Set(DWORD type, const BYTE* data, DWORD size) const;
-
   HKEY m_root;
   std::string m_path;
   std::string m_name;
@@ -33,8 +48,22 @@ private:
 // A fresh folder under the temporary folder, removed with its contents.
 class ScratchFolder {
 public:
-  ScratchFolder();
-  ~ScratchFolder();
+  ScratchFolder() {
+    char temp[MAX_PATH];
+    GetTempPathA(MAX_PATH, temp);
+    static unsigned counter = 0;
+    do {
+      m_path = std::string(temp) + "brtest_" + std::to_string(GetCurrentProcessId()) + "_" + std::to_string(++counter);
+    } while (!CreateDirectoryA(m_path.c_str(), nullptr));
+  }
+  ~ScratchFolder() {
+    const std::string from = m_path + '\0';  // double-terminated list for the shell's recursive delete
+    SHFILEOPSTRUCTA operation{};
+    operation.wFunc = FO_DELETE;
+    operation.pFrom = from.c_str();
+    operation.fFlags = FOF_NOCONFIRMATION | FOF_NOERRORUI | FOF_SILENT;
+    SHFileOperationA(&operation);
+  }
   ScratchFolder(const ScratchFolder&) = delete;
   ScratchFolder& operator=(const ScratchFolder&) = delete;
 
@@ -45,9 +74,11 @@ private:
   std::string m_path;
 };
 
-void WriteTextFile(const std::string& path, const std::string& text);
+inline void WriteTextFile(const std::string& path, const std::string& text) {
+  std::ofstream(path, std::ios::binary) << text;
+}
 // The file's bytes, or empty when it cannot be read.
-std::string ReadWholeFile(const std::string& path);
-bool FileExists(const std::string& path);
-// Lines ending in "\n" (any "\r" kept), the last partial line too.
-std::vector<std::string> SplitLines(const std::string& text);
+inline std::string ReadWholeFile(const std::string& path) {
+  std::ifstream file(path, std::ios::binary);
+  return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+}
