@@ -34,11 +34,9 @@ TEST_CASE("twilight band, then daylight over it, from the events there are; else
       CHECK((bands[i].left == c.bands[i][0] && bands[i].right == c.bands[i][1] && bands[i].colour == c.bands[i][2]));
   }
   // Without events: day in the polar summer of either hemisphere, else (or with no month read) night.
-  const std::pair<double, int> days[] = {{78.2, 12}, {-70.0, 12}, {0.0, 12}, {78.2, 0}};
-  for (const auto& [latitude, month] : days) {
+  for (const auto& [latitude, month] : {std::pair{78.2, 12}, {-70.0, 12}, {0.0, 12}, {78.2, 0}}) {
     polar.latitude = latitude;
-    polar.month = month;
-    if (!month) polar.month.reset();
+    polar.month = month ? std::optional<int>(month) : std::nullopt;
     CHECK(BackgroundBands(polar, plot).size() == (latitude == -70.0 ? 1u : 0u));
   }
 }

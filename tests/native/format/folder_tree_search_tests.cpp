@@ -1,5 +1,4 @@
-// The folder search rules on a tree held in memory; the Wine settings suite's volume and
-// store searches run the real lister (own files first, hidden files, the closing backslash).
+// The folder search rules in memory; the Wine settings suite's volume and store searches run the real lister.
 #include <doctest/doctest.h>
 
 #include <map>

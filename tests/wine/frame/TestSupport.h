@@ -14,17 +14,13 @@ class SavedRegistryValue {
 public:
   SavedRegistryValue(HKEY root, std::string path, std::string name)
       : m_root(root), m_path(std::move(path)), m_name(std::move(name)) {
-    DWORD size = 0;
-    const DWORD flags = RRF_RT_ANY | RRF_NOEXPAND;
-    if (RegGetValueA(m_root, m_path.c_str(), m_name.c_str(), flags, &m_type, nullptr, &size) == ERROR_SUCCESS) {
-      m_data.resize(size);
-      m_existed = RegGetValueA(m_root, m_path.c_str(), m_name.c_str(), flags, &m_type, m_data.data(), &size) == 0;
-      m_data.resize(size);
-    }
+    DWORD size = 1 << 16;
+    m_data.resize(size);
+    m_existed = RegGetValueA(m_root, m_path.c_str(), m_name.c_str(), RRF_RT_ANY | RRF_NOEXPAND, &m_type,
+                             m_data.data(), &size) == ERROR_SUCCESS;
+    m_data.resize(size);
   }
   ~SavedRegistryValue() { m_existed ? Set(m_type, m_data.data(), static_cast<DWORD>(m_data.size())) : Delete(); }
-  SavedRegistryValue(const SavedRegistryValue&) = delete;
-  SavedRegistryValue& operator=(const SavedRegistryValue&) = delete;
 
   // Creates the key when it is missing.
   void Set(DWORD type, const void* data, DWORD size) const {
@@ -58,14 +54,10 @@ public:
   }
   ~ScratchFolder() {
     const std::string from = m_path + '\0';  // double-terminated list for the shell's recursive delete
-    SHFILEOPSTRUCTA operation{};
-    operation.wFunc = FO_DELETE;
-    operation.pFrom = from.c_str();
-    operation.fFlags = FOF_NOCONFIRMATION | FOF_NOERRORUI | FOF_SILENT;
+    SHFILEOPSTRUCTA operation{nullptr, FO_DELETE, from.c_str(), nullptr,
+                              FOF_NOCONFIRMATION | FOF_NOERRORUI | FOF_SILENT, FALSE, nullptr, nullptr};
     SHFileOperationA(&operation);
   }
-  ScratchFolder(const ScratchFolder&) = delete;
-  ScratchFolder& operator=(const ScratchFolder&) = delete;
 
   const std::string& Path() const { return m_path; }  // without a closing backslash
   std::string operator/(const std::string& relative) const { return m_path + "\\" + relative; }
