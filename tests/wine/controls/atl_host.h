@@ -10,7 +10,7 @@ namespace br::test {
 class AtlHost {
 public:
   AtlHost();  // loads atl.dll; REQUIREs its entry points
-  ~AtlHost();
+  ~AtlHost() { FreeLibrary(module_); }
   AtlHost(const AtlHost&) = delete;
   AtlHost& operator=(const AtlHost&) = delete;
 
@@ -23,12 +23,9 @@ public:
   }
 
 private:
-  using WinInitEntry = BOOL(WINAPI*)();
-  using AttachEntry = HRESULT(WINAPI*)(IUnknown*, HWND, IUnknown**);
-
   HMODULE module_ = nullptr;
-  WinInitEntry winInit_ = nullptr;
-  AttachEntry attach_ = nullptr;
+  BOOL(WINAPI* winInit_)() = nullptr;
+  HRESULT(WINAPI* attach_)(IUnknown*, HWND, IUnknown**) = nullptr;
 };
 
 }  // namespace br::test

@@ -5,22 +5,15 @@
 namespace br::test {
 
 Canvas::Canvas(int width, int height, COLORREF background) : width_(width), height_(height) {
-  BITMAPINFO info{};
-  info.bmiHeader.biSize = sizeof(info.bmiHeader);
-  info.bmiHeader.biWidth = width;
-  info.bmiHeader.biHeight = -height;  // top-down rows
-  info.bmiHeader.biPlanes = 1;
-  info.bmiHeader.biBitCount = 32;
-  info.bmiHeader.biCompression = BI_RGB;
+  BITMAPINFO info{{sizeof(BITMAPINFOHEADER), width, -height, 1, 32, BI_RGB, 0, 0, 0, 0, 0}, {}};  // top-down rows
   dc_ = CreateCompatibleDC(nullptr);
   void* bits = nullptr;
   bitmap_ = CreateDIBSection(dc_, &info, DIB_RGB_COLORS, &bits, nullptr, 0);
   bits_ = static_cast<std::uint32_t*>(bits);
   old_ = SelectObject(dc_, bitmap_);
+  SetDCBrushColor(dc_, background);
   const RECT all{0, 0, width, height};
-  HBRUSH brush = CreateSolidBrush(background);
-  FillRect(dc_, &all, brush);
-  DeleteObject(brush);
+  FillRect(dc_, &all, static_cast<HBRUSH>(GetStockObject(DC_BRUSH)));
 }
 
 Canvas::~Canvas() {
@@ -50,12 +43,11 @@ bool Canvas::SamePixels(const Canvas& other) const {
   return std::memcmp(bits_, other.bits_, static_cast<std::size_t>(width_) * height_ * sizeof(std::uint32_t)) == 0;
 }
 
-HRESULT DrawControl(IUnknown* control, const Canvas& canvas, const RECT* bounds) {
+HRESULT DrawControl(IUnknown* control, const Canvas& canvas) {
   IViewObject* view = nullptr;
   HRESULT hr = control->QueryInterface(IID_IViewObject, reinterpret_cast<void**>(&view));
   if (FAILED(hr)) return hr;
-  const RECTL box = bounds ? RECTL{bounds->left, bounds->top, bounds->right, bounds->bottom}
-                           : RECTL{0, 0, canvas.Width(), canvas.Height()};
+  const RECTL box{0, 0, canvas.Width(), canvas.Height()};
   hr = view->Draw(DVASPECT_CONTENT, -1, nullptr, nullptr, nullptr, canvas.Dc(), &box, nullptr, nullptr, 0);
   view->Release();
   return hr;

@@ -14,8 +14,6 @@ public:
   // A canvas of width x height filled with background (0x00BBGGRR).
   Canvas(int width, int height, COLORREF background = RGB(0x12, 0x34, 0x56));
   ~Canvas();
-  Canvas(const Canvas&) = delete;
-  Canvas& operator=(const Canvas&) = delete;
 
   HDC Dc() const { return dc_; }
   int Width() const { return width_; }
@@ -35,8 +33,7 @@ private:
   std::uint32_t* bits_ = nullptr;
 };
 
-// Draws control (any interface of it) into the canvas at bounds (default: all of it)
-// through IViewObject::Draw.
-HRESULT DrawControl(IUnknown* control, const Canvas& canvas, const RECT* bounds = nullptr);
+// Draws control (any interface of it) over the whole canvas through IViewObject::Draw.
+HRESULT DrawControl(IUnknown* control, const Canvas& canvas);
 
 }  // namespace br::test

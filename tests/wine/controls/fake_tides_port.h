@@ -1,5 +1,6 @@
 // A port of another make for the control tests: its name and points are whatever the test
-// sets; sun times 05:30, 06:00, 18:00 and 18:30 of its day. Lives on the test's stack.
+// sets; at 48 N, sun times 05:30, 06:00, 18:00 and 18:30 of its day; no index, step or
+// zone. Lives on the test's stack.
 #pragma once
 
 #include "BR_Info.h"
@@ -23,12 +24,10 @@ public:
 
   STDMETHODIMP QueryInterface(REFIID riid, void** out) override {
     if (!out) return E_POINTER;
-    *out = nullptr;
-    if (!IsEqualIID(riid, IID_IUnknown) && !IsEqualIID(riid, IID_IDispatch) && !IsEqualIID(riid, IID_ITidesPort))
-      return E_NOINTERFACE;
-    *out = static_cast<ITidesPort*>(this);
-    AddRef();
-    return S_OK;
+    const bool port =
+        IsEqualIID(riid, IID_IUnknown) || IsEqualIID(riid, IID_IDispatch) || IsEqualIID(riid, IID_ITidesPort);
+    *out = port ? static_cast<ITidesPort*>(this) : nullptr;
+    return port ? (AddRef(), S_OK) : E_NOINTERFACE;
   }
   STDMETHODIMP_(ULONG) AddRef() override { return ++refs_; }
   STDMETHODIMP_(ULONG) Release() override { return --refs_; }
@@ -41,7 +40,7 @@ public:
   }
   // ITidesPort
   STDMETHODIMP get_PortName(BSTR* out) override { return Give(out, SysAllocString(name.c_str())); }
-  STDMETHODIMP GetPortPos(double* lat, double* lon) override { return lat && lon ? Give(lon, -4.5), Give(lat, 48.0) : E_POINTER; }
+  STDMETHODIMP GetPortPos(double* lat, double* lon) override { return Give(lon, -4.5), Give(lat, 48.0); }
   STDMETHODIMP Calculate(double, double) override { return S_OK; }
   STDMETHODIMP get_PredictionDate(double* value) override { return Give(value, predictionDate); }
   STDMETHODIMP get_NumPoints(LONG* count) override { return Give(count, points.size()); }
@@ -49,18 +48,20 @@ public:
     if (index < 0 || static_cast<std::size_t>(index) >= points.size()) return E_INVALIDARG;
     return Give(value, points[static_cast<std::size_t>(index)]);
   }
-  STDMETHODIMP get_MaxValueIndex(LONG* index) override { return Extreme(index, Highest() - points.begin()); }
-  STDMETHODIMP get_MinValueIndex(LONG* index) override { return Extreme(index, Lowest() - points.begin()); }
-  STDMETHODIMP get_MaxValue(double* value) override { return Extreme(value, points.empty() ? 0 : *Highest()); }
-  STDMETHODIMP get_MinValue(double* value) override { return Extreme(value, points.empty() ? 0 : *Lowest()); }
-  STDMETHODIMP get_Step(double* value) override {
-    return Give(value, points.size() > 1 ? 24.0 / static_cast<double>(points.size() - 1) : 0.0);
+  STDMETHODIMP get_MaxValue(double* value) override {
+    return points.empty() ? E_ACCESSDENIED : Give(value, *std::max_element(points.begin(), points.end()));
   }
+  STDMETHODIMP get_MinValue(double* value) override {
+    return points.empty() ? E_ACCESSDENIED : Give(value, *std::min_element(points.begin(), points.end()));
+  }
+  STDMETHODIMP get_MaxValueIndex(LONG*) override { return E_NOTIMPL; }
+  STDMETHODIMP get_MinValueIndex(LONG*) override { return E_NOTIMPL; }
+  STDMETHODIMP get_Step(double*) override { return E_NOTIMPL; }
+  STDMETHODIMP get_TimeZone(LONG*) override { return E_NOTIMPL; }
   STDMETHODIMP get_SunRise(double* value) override { return Give(value, predictionDate + 6.0 / 24.0); }
   STDMETHODIMP get_SunSet(double* value) override { return Give(value, predictionDate + 18.0 / 24.0); }
   STDMETHODIMP get_BeginTwilight(double* value) override { return Give(value, predictionDate + 5.5 / 24.0); }
   STDMETHODIMP get_EndTwilight(double* value) override { return Give(value, predictionDate + 18.5 / 24.0); }
-  STDMETHODIMP get_TimeZone(LONG* zone) override { return Give(zone, 0); }
 
 private:
   template <class T, class U>
@@ -69,12 +70,6 @@ private:
     *out = static_cast<T>(value);
     return S_OK;
   }
-  template <class T, class U>
-  HRESULT Extreme(T* out, U value) const {
-    return points.empty() ? E_ACCESSDENIED : Give(out, value);
-  }
-  std::vector<double>::const_iterator Highest() const { return std::max_element(points.begin(), points.end()); }
-  std::vector<double>::const_iterator Lowest() const { return std::min_element(points.begin(), points.end()); }
   ULONG refs_ = 0;
 };
 

@@ -13,7 +13,8 @@ std::vector<double> CosineDay() {
 }
 
 POINT CurvePoint(int k, double value, double maximum, double minimum) {
-  return POINT{static_cast<int>(8 + k * 284.0 / 24), static_cast<int>(192 - (value - minimum) * 184 / (maximum - minimum))};
+  const double y = 192 - (value - minimum) * 184 / (maximum - minimum);
+  return POINT{static_cast<int>(8 + k * 284.0 / 24), static_cast<int>(y)};
 }
 
 void CheckBandRow(const Canvas& canvas, int y, int dayFrom, int dayTo, int twilightFrom, int twilightTo) {

@@ -1,13 +1,11 @@
-// What the TidesWindow suites share: the graph's colours, a control made from the built
-// DLL, and the picture's positions by the graph's own rules (x of a time, hour lines,
-// curve points), written out independently of the library's code.
+// What the TidesWindow suites share: the graph's colours, a control made from the built DLL,
+// and the picture's positions by the graph's own rules, written out independently of its code.
 #pragma once
 
 #include "tests/wine/common/dll_under_test.h"
 #include "tests/wine/controls/canvas.h"
 #include "tests/wine/controls/fake_tides_port.h"
 
-#include "BR_Info.h"
 #include "BR_Private.h"
 
 #include <vector>
@@ -33,14 +31,11 @@ POINT CurvePoint(int k, double value, double maximum, double minimum);
 // [dayFrom, dayTo) over twilight [twilightFrom, twilightTo) over night.
 void CheckBandRow(const Canvas& canvas, int y, int dayFrom, int dayTo, int twilightFrom, int twilightTo);
 
-// A TidesWindow from the built DLL.
+// A TidesWindow from the built DLL, released at the latest at its end.
 class GraphControl {
 public:
   explicit GraphControl(const DllUnderTest& dll);
   ~GraphControl() { Release(); }
-  GraphControl(const GraphControl&) = delete;
-  GraphControl& operator=(const GraphControl&) = delete;
-
   ITidesWindow* operator->() const { return window_; }
   ITidesWindow* Get() const { return window_; }
   HRESULT SetDrawText(long value);

@@ -22,7 +22,7 @@ TEST_CASE("a calculated day of a real port: sun bands where the port's times say
   REQUIRE(graph->Calculate(1.0, 45098.0) == S_OK);  // 2023-06-21, hourly
   long count = 0;
   REQUIRE(port->get_NumPoints(&count) == S_OK);
-  REQUIRE(count == 25);
+  REQUIRE(count == 25);  // the window's Calculate reached the port
   double high = 0.0, low = 0.0;
   REQUIRE(port->get_MaxValue(&high) == S_OK);
   REQUIRE(port->get_MinValue(&low) == S_OK);
@@ -34,23 +34,16 @@ TEST_CASE("a calculated day of a real port: sun bands where the port's times say
   Canvas canvas(300, 200);
   REQUIRE(DrawControl(graph.Get(), canvas) == S_OK);
 
-  int minutes[4] = {};  // twilight begins, sunrise, sunset, twilight ends
-  HRESULT (STDMETHODCALLTYPE ITidesPort::*getters[4])(double*) = {
-      &ITidesPort::get_BeginTwilight, &ITidesPort::get_SunRise, &ITidesPort::get_SunSet,
-      &ITidesPort::get_EndTwilight};
-  for (int i = 0; i < 4; ++i) {
+  int minutes[4] = {}, i = 0;  // twilight begins, sunrise, sunset, twilight ends
+  for (auto getter : {&ITidesPort::get_BeginTwilight, &ITidesPort::get_SunRise, &ITidesPort::get_SunSet,
+                      &ITidesPort::get_EndTwilight}) {
     double date = 0.0;
     SYSTEMTIME time{};
-    REQUIRE((port->*getters[i])(&date) == S_OK);
+    REQUIRE((port->*getter)(&date) == S_OK);
     REQUIRE(VariantTimeToSystemTime(date, &time));
-    minutes[i] = time.wHour * 60 + time.wMinute;
+    minutes[i++] = time.wHour * 60 + time.wMinute;
   }
-  // A midsummer day at 48 N: dawn before 5, dusk after 19 (universal time at 4.5 W).
-  INFO("minutes: ", minutes[0], " ", minutes[1], " ", minutes[2], " ", minutes[3]);
-  REQUIRE(minutes[0] < minutes[1]);
-  REQUIRE(minutes[1] < 6 * 60);
-  REQUIRE(minutes[2] > 19 * 60);
-  REQUIRE(minutes[2] < minutes[3]);
+  // (Which times a day has: the native sun-event suite.)
   CheckBandRow(canvas, 137, XOfMinutes(minutes[1]), XOfMinutes(minutes[2]), XOfMinutes(minutes[0]),
                XOfMinutes(minutes[3]));
   for (long k = 0; k < count; ++k) {

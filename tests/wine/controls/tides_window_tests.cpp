@@ -1,5 +1,5 @@
-// TidesWindow as a container and a program see it: interfaces, extent, drawing refusals,
-// persistence, the data object, quick activation, its own window in Wine's ATL host,
+// TidesWindow as a container and a program see it: interfaces, extent and persistence,
+// drawing refusals, the data object, quick activation, its own window in Wine's ATL host,
 // verbs, MouseAction, the automatic scale and the shared palette.
 #include "tests/wine/common/event_sink.h"
 #include "tests/wine/controls/atl_host.h"
@@ -10,6 +10,7 @@
 #include <olectl.h>
 
 #include <algorithm>
+#include <memory>
 
 using namespace br::test;
 
@@ -36,14 +37,15 @@ struct Graph {
     if (host) DestroyWindow(host);
     ReleaseAndNull(site);
   }
+  // An interface of the graph (or of another control), released with the pointer.
   template <class I>
-  I* Face() const { return Query<I>(graph.Get()); }
+  std::unique_ptr<I, void (*)(I*)> Face(IUnknown* of = nullptr) const {
+    return {Query<I>(of ? of : graph.Get()), [](I* face) { face->Release(); }};
+  }
   void Host() {
     REQUIRE((host = AtlHost::MakeWindow(300, 200)) != nullptr);
     REQUIRE(atl.Attach(graph.Get(), host, &site) == S_OK);
-    IOleWindow* ole = Face<IOleWindow>();
-    CHECK(ole->GetWindow(&window) == S_OK);
-    ole->Release();
+    CHECK(Face<IOleWindow>()->GetWindow(&window) == S_OK);
     REQUIRE(window != nullptr);
   }
   HRESULT Finish() {
@@ -60,7 +62,8 @@ struct Graph {
 }  // namespace
 
 // (IObjectSafety is refused in the boundary suite.)
-TEST_CASE("a control answers every control interface, one object behind them all") {
+TEST_CASE("a control answers every control interface, one object behind them all; quick activation takes the sink") {
+  EventSink sink(DIID__ITidesWindowEvents);
   Graph g;
   const IID* answered[] = {&IID_IDispatch, &IID_ITidesWindow, &IID_IViewObjectEx, &IID_IViewObject2,
                            &IID_IViewObject, &IID_IOleInPlaceObjectWindowless, &IID_IOleInPlaceObject,
@@ -69,181 +72,109 @@ TEST_CASE("a control answers every control interface, one object behind them all
                            &IID_ISpecifyPropertyPages, &IID_IQuickActivate, &IID_IPersistStorage, &IID_IDataObject,
                            &IID_IProvideClassInfo, &IID_IProvideClassInfo2, &IID_IEmbeddedControl,
                            &IID_IUnitsOption};
-  IUnknown* identity = g.Face<IUnknown>();
+  auto identity = g.Face<IUnknown>();
   for (const IID* iid : answered) {
     IUnknown* face = nullptr;
     REQUIRE(g.graph->QueryInterface(*iid, reinterpret_cast<void**>(&face)) == S_OK);
-    IUnknown* back = Query<IUnknown>(face);
-    CHECK(back == identity);
-    back->Release();
+    CHECK(g.Face<IUnknown>(face).get() == identity.get());
     face->Release();
   }
-  identity->Release();
-  CHECK(g.Finish() == S_OK);
-}
-
-TEST_CASE("extent: 300 x 200 pixels at first, then what the container sets; what Draw refuses") {
-  Graph g;
-  IOleObject* ole = g.Face<IOleObject>();
-  HDC screen = GetDC(nullptr);
-  SIZEL extent{};
-  CHECK(ole->GetExtent(DVASPECT_CONTENT, &extent) == S_OK);
-  CHECK(extent.cx == MulDiv(300, 2540, GetDeviceCaps(screen, LOGPIXELSX)));
-  CHECK(extent.cy == MulDiv(200, 2540, GetDeviceCaps(screen, LOGPIXELSY)));
-  ReleaseDC(nullptr, screen);
-  CHECK(ole->GetExtent(DVASPECT_ICON, &extent) == DV_E_DVASPECT);
-  SIZEL wanted{5000, 4000};
-  CHECK(ole->SetExtent(DVASPECT_CONTENT, &wanted) == S_OK);
-  ole->Release();
-  IViewObjectEx* view = g.Face<IViewObjectEx>();
-  CHECK(view->GetExtent(DVASPECT_CONTENT, -1, nullptr, &extent) == S_OK);
-  CHECK(extent.cx == 5000);
-  CHECK(extent.cy == 4000);
-  Canvas canvas(50, 50);
-  const RECTL bounds{0, 0, 50, 50};
-  CHECK(view->Draw(DVASPECT_CONTENT, -1, nullptr, nullptr, nullptr, nullptr, &bounds, nullptr, nullptr, 0) ==
-        E_INVALIDARG);
-  CHECK(view->Draw(DVASPECT_CONTENT, -1, nullptr, nullptr, nullptr, canvas.Dc(), nullptr, nullptr, nullptr, 0) ==
-        E_INVALIDARG);
-  CHECK(view->Draw(DVASPECT_ICON, -1, nullptr, nullptr, nullptr, canvas.Dc(), &bounds, nullptr, nullptr, 0) ==
-        DV_E_DVASPECT);
-  view->Release();
-  CHECK(g.Finish() == S_OK);
-}
-
-TEST_CASE("the saved state carries the extent through a stream; bad streams are refused") {
-  Graph g;
-  GraphControl second(g.dll);
-  IOleObject* ole = g.Face<IOleObject>();
-  SIZEL extent{6123, 3456};
-  REQUIRE(ole->SetExtent(DVASPECT_CONTENT, &extent) == S_OK);
-  ole->Release();
-  IPersistStreamInit* saver = g.Face<IPersistStreamInit>();
-  CHECK(saver->IsDirty() == S_OK);
-  IStream* stream = nullptr;
-  REQUIRE(CreateStreamOnHGlobal(nullptr, TRUE, &stream) == S_OK);
-  CHECK(saver->Save(stream, TRUE) == S_OK);
-  CHECK(saver->IsDirty() == S_FALSE);
-  saver->Release();
-  IPersistStreamInit* loader = Query<IPersistStreamInit>(second.Get());
-  stream->Seek(LARGE_INTEGER{}, STREAM_SEEK_SET, nullptr);
-  CHECK(loader->Load(stream) == S_OK);
-  CHECK(loader->Load(stream) == E_FAIL);  // nothing left to read
-  CHECK(loader->Load(nullptr) == E_POINTER);
-  loader->Release();
-  stream->Release();
-  IOleObject* secondOle = Query<IOleObject>(second.Get());
-  extent = SIZEL{};
-  CHECK(secondOle->GetExtent(DVASPECT_CONTENT, &extent) == S_OK);
-  CHECK(extent.cx == 6123);
-  CHECK(extent.cy == 3456);
-  secondOle->Release();
-  second.Release();
-  CHECK(g.Finish() == S_OK);
-}
-
-TEST_CASE("the data object gives the picture Draw gives as an enhanced metafile, only in that medium") {
-  Graph g;
-  IDataObject* data = g.Face<IDataObject>();
-  FORMATETC enhanced{CF_ENHMETAFILE, nullptr, DVASPECT_CONTENT, -1, TYMED_ENHMF};
-  FORMATETC text{CF_TEXT, nullptr, DVASPECT_CONTENT, -1, TYMED_HGLOBAL};
-  FORMATETC wrongMedium{CF_ENHMETAFILE, nullptr, DVASPECT_CONTENT, -1, TYMED_HGLOBAL};
-  CHECK(data->QueryGetData(&wrongMedium) == DV_E_TYMED);
-  STGMEDIUM medium{};
-  CHECK(data->GetData(&text, &medium) == DV_E_FORMATETC);
-  REQUIRE(data->GetData(&enhanced, &medium) == S_OK);
-  REQUIRE(medium.tymed == TYMED_ENHMF);
-  Canvas played(300, 200);
-  const RECT all{0, 0, 300, 200};
-  CHECK(PlayEnhMetaFile(played.Dc(), medium.hEnhMetaFile, &all));
-  ReleaseStgMedium(&medium);
-  data->Release();
-  Canvas drawn(300, 200);
-  REQUIRE(DrawControl(g.graph.Get(), drawn) == S_OK);
-  CHECK(played.SamePixels(drawn));
-  CHECK(played.At(100, 137) == kDaylightColour);
-  CHECK(g.Finish() == S_OK);
-}
-
-TEST_CASE("quick activation takes the site and connects the event sink") {
-  Graph g;
-  EventSink sink(DIID__ITidesWindowEvents);
-  IQuickActivate* quick = g.Face<IQuickActivate>();
+  identity.reset();
   QACONTAINER container{};
   container.cbSize = sizeof(container);
   container.pUnkEventSink = static_cast<IDispatch*>(&sink);
   QACONTROL control{};
   control.cbSize = sizeof(control);
   control.dwPointerActivationPolicy = 77;
-  CHECK(quick->QuickActivate(&container, &control) == S_OK);
+  CHECK(g.Face<IQuickActivate>()->QuickActivate(&container, &control) == S_OK);
   CHECK(control.dwMiscStatus == 131473);
   CHECK(control.dwViewStatus == (VIEWSTATUS_OPAQUE | VIEWSTATUS_SOLIDBKGND));
   CHECK(control.dwPointerActivationPolicy == 0);
+  CHECK(control.dwEventCookie != 0);
   CHECK(sink.References() == 1);
-  CHECK(quick->QuickActivate(nullptr, &control) == E_POINTER);
+  CHECK(g.Face<IQuickActivate>()->QuickActivate(nullptr, &control) == E_POINTER);
   QACONTROL tooSmall{};
   tooSmall.cbSize = 8;
-  CHECK(quick->QuickActivate(&container, &tooSmall) == E_INVALIDARG);
-  quick->Release();
-  CHECK(control.dwEventCookie != 0);
+  CHECK(g.Face<IQuickActivate>()->QuickActivate(&container, &tooSmall) == E_INVALIDARG);
   CHECK(g.Finish() == S_OK);
   CHECK(sink.References() == 0);  // the control let the sink go
 }
 
-TEST_CASE("in the ATL host: a window of its own, a child sized to the site, that paints the picture Draw gives") {
+TEST_CASE("extent: 300 x 200 pixels at first, then the container's, carried through a saved stream; the picture") {
+  Graph g;
+  GraphControl second(g.dll);
+  HDC screen = GetDC(nullptr);
+  SIZEL extent{};
+  CHECK(g.Face<IOleObject>()->GetExtent(DVASPECT_CONTENT, &extent) == S_OK);
+  CHECK(extent.cx == MulDiv(300, 2540, GetDeviceCaps(screen, LOGPIXELSX)));
+  CHECK(extent.cy == MulDiv(200, 2540, GetDeviceCaps(screen, LOGPIXELSY)));
+  ReleaseDC(nullptr, screen);
+  CHECK(g.Face<IOleObject>()->GetExtent(DVASPECT_ICON, &extent) == DV_E_DVASPECT);
+  // At that extent: Draw refuses what it cannot draw on; the data object gives its picture as an
+  // enhanced metafile only.
+  Canvas drawn(300, 200);
+  const RECTL bounds{0, 0, 300, 200};
+  const auto draw = [&](DWORD aspect, HDC dc, const RECTL* box) {
+    return g.Face<IViewObject>()->Draw(aspect, -1, nullptr, nullptr, nullptr, dc, box, nullptr, nullptr, 0);
+  };
+  CHECK(draw(DVASPECT_CONTENT, nullptr, &bounds) == E_INVALIDARG);
+  CHECK(draw(DVASPECT_CONTENT, drawn.Dc(), nullptr) == E_INVALIDARG);
+  CHECK(draw(DVASPECT_ICON, drawn.Dc(), &bounds) == DV_E_DVASPECT);
+  REQUIRE(draw(DVASPECT_CONTENT, drawn.Dc(), &bounds) == S_OK);
+
+  FORMATETC enhanced{CF_ENHMETAFILE, nullptr, DVASPECT_CONTENT, -1, TYMED_ENHMF};
+  FORMATETC text{CF_TEXT, nullptr, DVASPECT_CONTENT, -1, TYMED_HGLOBAL};
+  FORMATETC wrongMedium{CF_ENHMETAFILE, nullptr, DVASPECT_CONTENT, -1, TYMED_HGLOBAL};
+  CHECK(g.Face<IDataObject>()->QueryGetData(&wrongMedium) == DV_E_TYMED);
+  STGMEDIUM medium{};
+  CHECK(g.Face<IDataObject>()->GetData(&text, &medium) == DV_E_FORMATETC);
+  REQUIRE(g.Face<IDataObject>()->GetData(&enhanced, &medium) == S_OK);
+  REQUIRE(medium.tymed == TYMED_ENHMF);
+  Canvas played(300, 200);
+  const RECT all{0, 0, 300, 200};
+  CHECK(PlayEnhMetaFile(played.Dc(), medium.hEnhMetaFile, &all));
+  ReleaseStgMedium(&medium);
+  CHECK(played.SamePixels(drawn));
+  CHECK(played.At(100, 137) == kDaylightColour);
+
+  SIZEL wanted{6123, 3456};
+  CHECK(g.Face<IOleObject>()->SetExtent(DVASPECT_CONTENT, &wanted) == S_OK);
+  CHECK(g.Face<IViewObjectEx>()->GetExtent(DVASPECT_CONTENT, -1, nullptr, &extent) == S_OK);
+  CHECK(extent.cx == 6123);
+  CHECK(extent.cy == 3456);
+
+  CHECK(g.Face<IPersistStreamInit>()->IsDirty() == S_OK);
+  IStream* stream = nullptr;
+  REQUIRE(CreateStreamOnHGlobal(nullptr, TRUE, &stream) == S_OK);
+  CHECK(g.Face<IPersistStreamInit>()->Save(stream, TRUE) == S_OK);
+  CHECK(g.Face<IPersistStreamInit>()->IsDirty() == S_FALSE);
+  stream->Seek(LARGE_INTEGER{}, STREAM_SEEK_SET, nullptr);
+  CHECK(g.Face<IPersistStreamInit>(second.Get())->Load(stream) == S_OK);
+  CHECK(g.Face<IPersistStreamInit>(second.Get())->Load(stream) == E_FAIL);  // nothing left to read
+  CHECK(g.Face<IPersistStreamInit>(second.Get())->Load(nullptr) == E_POINTER);
+  stream->Release();
+  extent = SIZEL{};
+  CHECK(g.Face<IOleObject>(second.Get())->GetExtent(DVASPECT_CONTENT, &extent) == S_OK);
+  CHECK(extent.cx == 6123);
+  CHECK(extent.cy == 3456);
+  second.Release();
+  CHECK(g.Finish() == S_OK);
+}
+
+// The readout's arithmetic, and no reading without points or a port: the native graph suite.
+TEST_CASE("in the ATL host: a child window of its own paints Draw's picture; MouseAction; verbs") {
   Graph g;
   g.Host();
   CHECK(GetParent(g.window) == g.host);
   // The site offered windowless activation; the control still has its window and says so.
   LRESULT result = -1;
-  IOleInPlaceObjectWindowless* windowless = g.Face<IOleInPlaceObjectWindowless>();
-  CHECK(windowless->OnWindowMessage(WM_MOUSEMOVE, 0, 0, &result) == S_FALSE);
-  windowless->Release();
+  CHECK(g.Face<IOleInPlaceObjectWindowless>()->OnWindowMessage(WM_MOUSEMOVE, 0, 0, &result) == S_FALSE);
   Canvas drawn(300, 200);
   REQUIRE(DrawControl(g.graph.Get(), drawn) == S_OK);
   Canvas printed(300, 200);
   SendMessageW(g.window, WM_PRINTCLIENT, reinterpret_cast<WPARAM>(printed.Dc()), PRF_CLIENT);
   CHECK(printed.SamePixels(drawn));
-  const HCURSOR expected = LoadCursorW(g.dll.Handle(), MAKEINTRESOURCEW(203));
-  REQUIRE(expected != nullptr);
-  SetCursor(LoadCursor(nullptr, IDC_ARROW));
-  CHECK(SendMessageW(g.window, WM_SETCURSOR, reinterpret_cast<WPARAM>(g.window), MAKELPARAM(HTCLIENT, WM_MOUSEMOVE)) ==
-        TRUE);
-  CHECK(GetCursor() == expected);
-  CHECK(g.Finish() == S_OK);
-}
-
-TEST_CASE("verbs: UI activation takes the focus, hide and show, the verbs a control has not; Close") {
-  Graph g;
-  g.Host();
-  IOleObject* ole = g.Face<IOleObject>();
-  IOleClientSite* site = nullptr;
-  REQUIRE(ole->GetClientSite(&site) == S_OK);
-  RECT position{0, 0, 300, 200};
-  const auto verb = [&](LONG v) { return ole->DoVerb(v, nullptr, site, 0, g.host, &position); };
-  CHECK(verb(OLEIVERB_UIACTIVATE) == S_OK);
-  CHECK(GetFocus() == g.window);
-  CHECK(verb(OLEIVERB_HIDE) == S_OK);
-  CHECK_FALSE(IsWindowVisible(g.window));
-  CHECK(verb(OLEIVERB_SHOW) == S_OK);
-  CHECK(IsWindowVisible(g.window));
-  CHECK(verb(OLEIVERB_OPEN) == OLEOBJ_S_CANNOT_DOVERB_NOW);
-  CHECK(verb(OLEIVERB_PROPERTIES) == E_NOTIMPL);
-  CHECK(verb(7) == OLEOBJ_S_INVALIDVERB);
-  // Closing deactivates: the window goes, the site stays until the host lets it go.
-  CHECK(ole->Close(OLECLOSE_NOSAVE) == S_OK);
-  CHECK_FALSE(IsWindow(g.window));
-  site->Release();
-  ole->Release();
-  CHECK(g.Finish() == S_OK);
-}
-
-// The readout's arithmetic, and no reading without points or a port: the native graph suite.
-TEST_CASE("MouseAction reports the time and height under the pointer, inside the plot only") {
-  Graph g;
-  g.Host();
-  Canvas painted(300, 200);
-  SendMessageW(g.window, WM_PRINTCLIENT, reinterpret_cast<WPARAM>(painted.Dc()), PRF_CLIENT);  // W = 284
+  // The pointer in the plot (W = 284) and past it.
   EventSink sink(DIID__ITidesWindowEvents);
   REQUIRE(sink.Connect(g.graph.Get()));
   const auto move = [&](int x) { SendMessageW(g.window, WM_MOUSEMOVE, 0, MAKELPARAM(x, 100)); };
@@ -262,11 +193,55 @@ TEST_CASE("MouseAction reports the time and height under the pointer, inside the
   move(296);
   CHECK(sink.calls == 2);
   sink.Disconnect();
+  // Verbs: UI activation takes the focus, hide and show, the verbs a control has not; Close.
+  IOleClientSite* site = nullptr;
+  REQUIRE(g.Face<IOleObject>()->GetClientSite(&site) == S_OK);
+  RECT position{0, 0, 300, 200};
+  const auto verb = [&](LONG v) { return g.Face<IOleObject>()->DoVerb(v, nullptr, site, 0, g.host, &position); };
+  CHECK(verb(OLEIVERB_UIACTIVATE) == S_OK);
+  CHECK(GetFocus() == g.window);
+  CHECK(verb(OLEIVERB_HIDE) == S_OK);
+  CHECK_FALSE(IsWindowVisible(g.window));
+  CHECK(verb(OLEIVERB_SHOW) == S_OK);
+  CHECK(IsWindowVisible(g.window));
+  CHECK(verb(OLEIVERB_OPEN) == OLEOBJ_S_CANNOT_DOVERB_NOW);
+  CHECK(verb(OLEIVERB_PROPERTIES) == E_NOTIMPL);
+  CHECK(verb(7) == OLEOBJ_S_INVALIDVERB);
+  // Closing deactivates: the window goes, the site stays until the host lets it go.
+  CHECK(g.Face<IOleObject>()->Close(OLECLOSE_NOSAVE) == S_OK);
+  CHECK_FALSE(IsWindow(g.window));
+  site->Release();
   CHECK(g.Finish() == S_OK);
 }
 
-TEST_CASE("SetScale with a maximum of 0 spans the day's lowest and highest heights, whatever the minimum") {
+// Arrays of other shapes and by-reference forms: the boundary suite. (Last: the palette
+// stays changed for the module's life.)
+TEST_CASE("a palette given through IEmbeddedControl recolours every band of every control; the automatic scale") {
   Graph g;
+  GraphControl other(g.dll);
+  REQUIRE(other->SetPort(&g.port) == S_OK);
+  REQUIRE(other->SetScale(1.0, 0.0) == S_OK);
+  REQUIRE(other.SetDrawText(0) == S_OK);
+  VARIANT palette;
+  palette.vt = VT_ARRAY | VT_I4;
+  palette.parray = SafeArrayCreateVector(VT_I4, 0, 20);
+  for (LONG i = 0; i < 20; ++i) {
+    LONG value = RGB(10 * i, 3, 5);
+    SafeArrayPutElement(palette.parray, &i, &value);
+  }
+  CHECK(g.Face<IEmbeddedControl>()->SetPalette(palette) == S_OK);
+  VariantClear(&palette);
+  Canvas recoloured(300, 200);
+  REQUIRE(DrawControl(other.Get(), recoloured) == S_OK);
+  CHECK(recoloured.At(40, 137) == RGB(170, 3, 5));  // night: 17
+  CHECK(recoloured.At(75, 137) == RGB(120, 3, 5));  // twilight: 12
+  CHECK(recoloured.At(100, 137) == RGB(50, 3, 5));  // daylight: 5
+  CHECK(recoloured.At(4, 100) == RGB(70, 3, 5));    // frame: 7
+  const POINT first = CurvePoint(0, g.port.points[0], 1.0, 0.0);
+  CHECK(recoloured.At(first.x, first.y) == RGB(100, 3, 5));  // curve: 10
+  other.Release();
+
+  // SetScale with a maximum of 0: the day's lowest and highest heights span the plot, whatever the minimum.
   REQUIRE(g.graph->SetScale(0.0, -1.0) == S_OK);
   Canvas canvas(300, 200);
   REQUIRE(DrawControl(g.graph.Get(), canvas) == S_OK);
@@ -274,39 +249,7 @@ TEST_CASE("SetScale with a maximum of 0 spans the day's lowest and highest heigh
   const auto [low, high] = std::minmax_element(values.begin(), values.end());
   const int highX = CurvePoint(static_cast<int>(high - values.begin()), *high, *high, *low).x;
   const int lowX = CurvePoint(static_cast<int>(low - values.begin()), *low, *high, *low).x;
-  CHECK(canvas.Count(kCurveColour, highX - 1, 7, highX + 2, 10) > 0);    // around the top row, 8
-  CHECK(canvas.Count(kCurveColour, lowX - 1, 190, lowX + 2, 193) > 0);  // around the bottom row, 191
-  CHECK(g.Finish() == S_OK);
-}
-
-// Arrays of other shapes and by-reference forms: the boundary suite. (Last: the palette
-// stays changed for the module's life.)
-TEST_CASE("a palette given through IEmbeddedControl recolours every band of every control") {
-  Graph g;
-  GraphControl other(g.dll);
-  REQUIRE(other->SetPort(&g.port) == S_OK);
-  REQUIRE(other->SetScale(1.0, 0.0) == S_OK);
-  REQUIRE(other.SetDrawText(0) == S_OK);
-  VARIANT palette;
-  VariantInit(&palette);
-  palette.vt = VT_ARRAY | VT_I4;
-  palette.parray = SafeArrayCreateVector(VT_I4, 0, 20);
-  for (LONG i = 0; i < 20; ++i) {
-    LONG value = RGB(10 * i, 3, 5);
-    SafeArrayPutElement(palette.parray, &i, &value);
-  }
-  IEmbeddedControl* embedded = g.Face<IEmbeddedControl>();
-  CHECK(embedded->SetPalette(palette) == S_OK);
-  embedded->Release();
-  VariantClear(&palette);
-  Canvas canvas(300, 200);
-  REQUIRE(DrawControl(other.Get(), canvas) == S_OK);
-  CHECK(canvas.At(40, 137) == RGB(170, 3, 5));   // night: 17
-  CHECK(canvas.At(75, 137) == RGB(120, 3, 5));   // twilight: 12
-  CHECK(canvas.At(100, 137) == RGB(50, 3, 5));   // daylight: 5
-  CHECK(canvas.At(4, 100) == RGB(70, 3, 5));     // frame: 7
-  const POINT first = CurvePoint(0, g.port.points[0], 1.0, 0.0);
-  CHECK(canvas.At(first.x, first.y) == RGB(100, 3, 5));  // curve: 10
-  other.Release();
+  CHECK(canvas.Count(RGB(100, 3, 5), highX - 1, 7, highX + 2, 10) > 0);    // around the top row, 8
+  CHECK(canvas.Count(RGB(100, 3, 5), lowX - 1, 190, lowX + 2, 193) > 0);  // around the bottom row, 191
   CHECK(g.Finish() == S_OK);
 }

@@ -101,13 +101,15 @@ struct PortList {
 
 }  // namespace
 
-TEST_CASE("ports in a window: shown by name, the first selected and fired once, clicks mapped to the ports given") {
+// Filling at the window's making is a mended fault (the table is laid out with the window).
+TEST_CASE("ports set before the window fill the table when it is made; rows by name, clicks and keys; colour 7") {
   FakeTidesPort havre(L"Le Havre"), anvers(L"Anvers"), brest(L"Brest");
   NotAPort stranger;
   PortList p;
-  p.Host();
   CHECK(p.SetPorts({&havre, &stranger, &anvers, &brest}) == S_OK);
   CHECK(stranger.References() == 1);  // kept at its index, not shown
+  CHECK(p.names.empty());
+  p.Host();
   REQUIRE(p.names.size() == 1);
   CHECK(p.names[0] == L"Anvers");
   CHECK(p.sink.lastId == 1);
@@ -129,27 +131,11 @@ TEST_CASE("ports in a window: shown by name, the first selected and fired once, 
   CHECK(p.names.size() == 3);
   CHECK(havre.References() == 0);
   CHECK(stranger.References() == 0);
-  CHECK(p.Finish() == S_OK);
-}
 
-TEST_CASE("ports set before the window fill the table when it is made") {
-  FakeTidesPort havre(L"Le Havre"), anvers(L"Anvers");
-  PortList p;
-  p.SetPorts({&havre, &anvers});
-  CHECK(p.names.empty());
-  p.Host();
-  REQUIRE(p.names.size() == 1);
-  CHECK(p.names[0] == L"Anvers");
-  CHECK(p.Selected() == L"Anvers");
-  CHECK(p.Finish() == S_OK);
-  CHECK(havre.References() == 0);
-}
-
-TEST_CASE("navigation keys given to the accelerator translation reach the focused table; the background is colour 7") {
-  FakeTidesPort havre(L"Le Havre"), anvers(L"Anvers"), brest(L"Brest");
-  PortList p;
-  p.Host();
-  p.SetPorts({&havre, &anvers, &brest});
+  // Ports set in the window: the first fired once; keys through accelerator translation.
+  CHECK(p.SetPorts({&havre, &anvers, &brest}) == S_OK);
+  REQUIRE(p.names.size() == 4);
+  CHECK(p.names[3] == L"Anvers");
   SetFocus(p.table);
   IOleInPlaceActiveObject* active = Query<IOleInPlaceActiveObject>(p.list);
   MSG down{p.table, WM_KEYDOWN, VK_DOWN, 1, 0, {0, 0}};
@@ -161,6 +147,7 @@ TEST_CASE("navigation keys given to the accelerator translation reach the focuse
   CHECK(active->TranslateAccelerator(&up) == S_OK);
   active->Release();
 
+  // The background is palette colour 7.
   VARIANT palette;
   palette.vt = VT_ARRAY | VT_I4;
   palette.parray = SafeArrayCreateVector(VT_I4, 0, 20);
