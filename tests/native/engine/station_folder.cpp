@@ -15,9 +15,8 @@ namespace fs = std::filesystem;
 TempFolder::TempFolder(const std::string& hint) {
   static std::atomic<int> serial{0};
   std::random_device rd;
-  path_ = fs::temp_directory_path() /
-          ("br_" + hint + "_" + std::to_string(getpid()) + "_" + std::to_string(serial++) + "_" +
-           std::to_string(rd() % 100000));
+  path_ = fs::temp_directory_path() / ("br_" + hint + "_" + std::to_string(getpid()) + "_" +
+                                       std::to_string(serial++) + "_" + std::to_string(rd() % 100000));
   fs::create_directories(path_);
 }
 
@@ -34,17 +33,11 @@ void WriteBytes(const fs::path& file, const std::vector<std::uint8_t>& bytes) {
 
 void WriteStationFolder(const fs::path& folder, const std::vector<TestStation>& stations) {
   fs::create_directories(folder);
-  std::vector<std::uint8_t> data;
+  std::vector<std::uint8_t> data, numbers, coordinates;
   std::vector<StationIndexRecord> index;
   for (std::size_t i = 0; i < stations.size(); ++i) {
     const TestStation& s = stations[i];
-    StationIndexRecord r;
-    r.station = static_cast<std::uint16_t>(i);
-    r.latitude = s.latitude;
-    r.longitude = s.longitude;
-    r.offset = static_cast<std::uint32_t>(data.size());
-    index.push_back(r);
-
+    index.push_back({static_cast<std::uint16_t>(i), s.latitude, s.longitude, static_cast<std::uint32_t>(data.size())});
     StationHeader h;
     SetStationName(h, s.name);
     h.latitude = s.latitude;
@@ -58,20 +51,15 @@ void WriteStationFolder(const fs::path& folder, const std::vector<TestStation>& 
       data.insert(data.end(), cb.begin(), cb.end());
     }
   }
-  auto encode = [](const std::vector<StationIndexRecord>& records) {
-    std::vector<std::uint8_t> bytes;
-    for (const StationIndexRecord& r : records) {
-      const auto b = EncodeStationIndexRecord(r);
-      bytes.insert(bytes.end(), b.begin(), b.end());
-    }
-    return bytes;
-  };
   std::vector<StationIndexRecord> sorted = index;
-  std::stable_sort(sorted.begin(), sorted.end(), [](const StationIndexRecord& a, const StationIndexRecord& b) {
-    return StationKey(a) < StationKey(b);
-  });
-  WriteBytes(folder / kStationIndexFileName, encode(index));
-  WriteBytes(folder / kCoordinateIndexFileName, encode(sorted));
+  std::stable_sort(sorted.begin(), sorted.end(), [](const auto& a, const auto& b) { return StationKey(a) < StationKey(b); });
+  for (std::size_t i = 0; i < index.size(); ++i) {
+    const auto n = EncodeStationIndexRecord(index[i]), c = EncodeStationIndexRecord(sorted[i]);
+    numbers.insert(numbers.end(), n.begin(), n.end());
+    coordinates.insert(coordinates.end(), c.begin(), c.end());
+  }
+  WriteBytes(folder / kStationIndexFileName, numbers);
+  WriteBytes(folder / kCoordinateIndexFileName, coordinates);
   WriteBytes(folder / kStationDataFileName, data);
 }
 

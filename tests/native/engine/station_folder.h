@@ -16,8 +16,7 @@ struct TestStation {
   std::int16_t longitude = 0;  // minutes
   std::int8_t zone = 0;
   std::vector<ConstituentRecord> constituents;
-  // Header count byte; when unset, the number of constituents.
-  bool overrideCount = false;
+  bool overrideCount = false;  // header count byte: count, else the number of constituents
   std::int8_t count = 0;
 };
 
@@ -38,11 +37,7 @@ class TempFolder {
 // Writes the three files of stations into folder (created if missing): "td_num.ntx" in the
 // given order, "td_crd.ntx" sorted by StationKey, blocks in "td_pnt.dat" in the given order.
 void WriteStationFolder(const std::filesystem::path& folder, const std::vector<TestStation>& stations);
-
-// Cuts a file down to size bytes.
 void TruncateFile(const std::filesystem::path& file, std::uintmax_t size);
-
-// Writes raw bytes as a file.
 void WriteBytes(const std::filesystem::path& file, const std::vector<std::uint8_t>& bytes);
 
 // An index record that only carries a position, as the search takes it.
@@ -53,15 +48,9 @@ inline StationIndexRecord Key(std::int16_t lat, std::int16_t lon) {
   return r;
 }
 
-// A station at (lat, lon) minutes; an empty name becomes "S<lat>_<lon>".
-inline TestStation Station(std::int16_t lat, std::int16_t lon,
-                           std::vector<ConstituentRecord> records = {{0, 0, 1234}}, std::string name = {}) {
-  TestStation s;
-  s.name = name.empty() ? "S" + std::to_string(lat) + "_" + std::to_string(lon) : std::move(name);
-  s.latitude = lat;
-  s.longitude = lon;
-  s.constituents = std::move(records);
-  return s;
+// A station at (lat, lon) minutes, named "S<lat>_<lon>".
+inline TestStation Station(std::int16_t lat, std::int16_t lon, std::vector<ConstituentRecord> records = {{0, 0, 1234}}) {
+  return {"S" + std::to_string(lat) + "_" + std::to_string(lon), lat, lon, 0, std::move(records)};
 }
 
 // Closes the tide files at the end of a test case.

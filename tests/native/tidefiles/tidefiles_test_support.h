@@ -1,36 +1,48 @@
 // Helpers shared by the tidefiles suites: folder images made from JSON text and the tool run in-process.
 #pragma once
 
-#include <filesystem>
+#include <doctest/doctest.h>
+
+#include <sstream>
 #include <string>
 #include <vector>
 
 #include "tests/native/engine/station_folder.h"
-#include "tides/engine/station_files.h"
-#include "tools/tidefiles/diagnostics.h"
-#include "tools/tidefiles/folder_image.h"
+#include "tools/tidefiles/command_line.h"
+#include "tools/tidefiles/folder_builder.h"
+#include "tools/tidefiles/station_json.h"
 
 namespace br::tidefiles::test {
 
-// A temporary folder removed with everything in it (the engine suites' helper).
-using TemporaryFolder = br::tides::testing::TempFolder;
-
 // JSON text -> folder image; fails the test when the build refuses it.
-FolderImage BuildFromJson(const std::string& json, Diagnostics& diagnostics);
-FolderImage BuildFromJson(const std::string& json);
+inline FolderImage BuildFromJson(const std::string& json, Diagnostics& diagnostics) {
+  const std::vector<StationEntry> stations = ReadStationsJson(json, diagnostics);
+  REQUIRE_FALSE(diagnostics.HasErrors());
+  std::optional<FolderImage> image = BuildFolderImage(stations, diagnostics);
+  REQUIRE(image.has_value());
+  return *image;
+}
+inline FolderImage BuildFromJson(const std::string& json) {
+  Diagnostics diagnostics;
+  return BuildFromJson(json, diagnostics);
+}
 
-std::vector<br::tides::StationIndexRecord> IndexRecords(const std::vector<std::uint8_t>& bytes);
-br::tides::StationHeader HeaderAt(const FolderImage& image, std::uint32_t offset);
-std::vector<br::tides::ConstituentRecord> RecordsAt(const FolderImage& image, std::uint32_t offset);
-
-// True when some message of that severity contains text.
-bool Mentions(const Diagnostics& diagnostics, Severity severity, const std::string& text);
+// Some message of that severity contains text.
+inline bool Mentions(const Diagnostics& diagnostics, Severity severity, const std::string& text) {
+  for (const Diagnostic& d : diagnostics.All())
+    if (d.severity == severity && d.text.find(text) != std::string::npos) return true;
+  return false;
+}
 
 struct ToolRun {
   int status = 0;
-  std::string out;
-  std::string err;
+  std::string out, err;
 };
-ToolRun RunTool(const std::vector<std::string>& args, const std::string& input = "");
+inline ToolRun RunTool(const std::vector<std::string>& args, const std::string& input = "") {
+  std::istringstream in(input);
+  std::ostringstream out, err;
+  const int status = RunTidefiles(args, in, out, err);
+  return {status, out.str(), err.str()};
+}
 
 }  // namespace br::tidefiles::test
