@@ -1,4 +1,4 @@
-// The tidefiles command line: help, bad arguments, build/check/dump on disk, predict.
+// The tidefiles command line: build/check/dump on disk, predict, bad arguments, malformed JSON, missing files.
 #include <doctest/doctest.h>
 
 #include <filesystem>
