@@ -7,15 +7,13 @@ namespace br::test::boundary {
 namespace {
 
 SAFEARRAY* Checked(SAFEARRAY* array) {
-  if (!array) throw std::runtime_error("SAFEARRAY not made");
-  return array;
+  return array ? array : throw std::runtime_error("SAFEARRAY not made");
 }
 
 SAFEARRAY* Descriptor(UINT dimensions, ULONG elementSize) {
   SAFEARRAY* array = nullptr;
-  if (FAILED(SafeArrayAllocDescriptor(dimensions, &array))) throw std::runtime_error("no descriptor");
-  array->cbElements = elementSize;
-  return array;
+  SafeArrayAllocDescriptor(dimensions, &array);
+  return Checked(array)->cbElements = elementSize, array;
 }
 
 }  // namespace
@@ -82,32 +80,6 @@ bool Outs::Untouched() const {
          unknown == kUntouchedUnknown && variant.vt == VT_I2 && variant.iVal == -3;
 }
 
-LateCall::LateCall(IDispatch* target, DISPID id, WORD flags) : target_(target), id_(id), flags_(flags) {
-  VariantInit(&result);
-}
-
-LateCall::~LateCall() {
-  VariantClear(&result);
-  SysFreeString(exception.bstrSource);
-  SysFreeString(exception.bstrDescription);
-  SysFreeString(exception.bstrHelpFile);
-}
-
-HRESULT LateCall::Run() {
-  // DISPPARAMS holds the arguments last first; shallow copies, the Variants keep ownership.
-  std::vector<VARIANT> reversed;
-  for (auto it = args_.rbegin(); it != args_.rend(); ++it) reversed.push_back(it->get());
-  DISPID namedPut = DISPID_PROPERTYPUT;
-  DISPPARAMS params = {reversed.empty() ? nullptr : reversed.data(), nullptr, static_cast<UINT>(reversed.size()), 0};
-  if (flags_ & (DISPATCH_PROPERTYPUT | DISPATCH_PROPERTYPUTREF)) {
-    params.rgdispidNamedArgs = &namedPut;
-    params.cNamedArgs = 1;
-  }
-  VariantClear(&result);
-  UINT argumentError = 0;
-  return target_->Invoke(id_, iid_, LOCALE_USER_DEFAULT, flags_, &params, &result, &exception, &argumentError);
-}
-
 std::vector<TestStation> ThreeStations() {
   return {{"Charlie", 600, 600, 0, {{0, 1000, 0}, {29, 500, 100}}},
           {"Alpha", 610, 610, 0, {{0, 1000, 0}, {36, 300, 900}}},
@@ -119,41 +91,16 @@ OpenTides::OpenTides(const std::vector<TestStation>& stations, bool open) : fold
   if (open) REQUIRE(db->Initialize(Variant::Bstr(folder.Path()).get().bstrVal) == S_OK);
 }
 
-IUnknown* OpenTides::Unknown(long index) const {
-  IUnknown* port = nullptr;
-  REQUIRE(db->GetPort(index, &port) == S_OK);
-  REQUIRE(port != nullptr);
-  return port;
-}
-
 const std::vector<IUnknown*>& OpenTides::Ports(long count) {
-  for (long i = 0; i < count; ++i) ports.push_back(Unknown(i));
+  for (long i = 0; i < count; ++i) ports.push_back(Port(i));  // as IUnknown: one object, one identity
   return ports;
-}
-
-long Points(ITidesPort* port) {
-  long n = -1;
-  REQUIRE(port->get_NumPoints(&n) == S_OK);
-  return n;
-}
-
-std::wstring NameOf(IUnknown* port) {
-  if (!port) return L"<none>";
-  ITidesPort* typed = nullptr;
-  if (FAILED(port->QueryInterface(IID_ITidesPort, reinterpret_cast<void**>(&typed)))) return L"<not a port>";
-  BSTR name = nullptr;
-  typed->get_PortName(&name);
-  std::wstring text = name ? name : L"";
-  SysFreeString(name);
-  typed->Release();
-  return text;
 }
 
 std::wstring SelectedName(ITidesPortList* list) {
   IUnknown* port = kUntouchedUnknown;
   REQUIRE(list->get_Selected(&port) == S_OK);
   REQUIRE(port != kUntouchedUnknown);
-  const std::wstring name = NameOf(port);
+  const std::wstring name = PortName(port);
   if (port) port->Release();
   return name;
 }

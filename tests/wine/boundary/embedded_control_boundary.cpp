@@ -4,8 +4,6 @@
 
 #include "BR_Private.h"
 
-#include <olectl.h>
-
 #include <algorithm>
 #include <climits>
 
@@ -18,11 +16,6 @@ constexpr int kFrameColour = 7;  // fills the frame of a TidesWindow without a p
 const std::pair<const char*, const CLSID*> kControls[] = {{"TidesWindow", &CLSID_TidesWindow},
                                                           {"TidesPortList", &CLSID_TidesPortList}};
 
-std::vector<LONG> Colours(int seed) {
-  std::vector<LONG> colours;
-  for (int i = 0; i < 20; ++i) colours.push_back(RGB(seed + i, 2 * i + 1, 255 - seed));
-  return colours;
-}
 
 // The shared palette's colour 7 as an unhosted TidesWindow without a port draws it.
 COLORREF FrameColour(IUnknown* probe) {
@@ -31,9 +24,10 @@ COLORREF FrameColour(IUnknown* probe) {
   return canvas.At(4, 4);
 }
 
-// An array of count elements of the type, the 4-byte ones holding the colours.
+// An array of count elements of the type (VT_EMPTY: 4 bytes, no type), the 4-byte ones
+// holding the colours.
 SAFEARRAY* Filled(VARTYPE type, const std::vector<LONG>& colours, ULONG count = 20) {
-  SAFEARRAY* array = MakeArray(type, {{count, 0}});
+  SAFEARRAY* array = type == VT_EMPTY ? MakeRawArray(4, count) : MakeArray(type, {{count, 0}});
   if (SafeArrayGetElemsize(array) == 4)
     std::copy_n(colours.begin(), std::min<ULONG>(count, 20), static_cast<LONG*>(array->pvData));
   return array;
@@ -50,12 +44,7 @@ std::vector<PaletteRow> PaletteRows() {
   return {
       {"VT_ARRAY|VT_I4, 20 from 0", [](C c) { return Variant::Array(VT_I4, MakeLongArray(c)); }, true},
       {"VT_ARRAY|VT_UI4", [](C c) { return Variant::Array(VT_UI4, Filled(VT_UI4, c)); }, true},
-      {"20 elements of 4 bytes with no element type",
-       [](C c) {
-         SAFEARRAY* array = MakeRawArray(4, 20);
-         std::copy(c.begin(), c.end(), static_cast<LONG*>(array->pvData));
-         return Variant::Array(VT_I4, array);
-       },
+      {"20 elements of 4 bytes with no element type", [](C c) { return Variant::Array(VT_I4, Filled(VT_EMPTY, c)); },
        true},
       {"19 elements", [](C c) { return Variant::Array(VT_I4, Filled(VT_I4, c, 19)); }},
       {"no elements", [](C) { return Variant::Array(VT_I4, MakeLongArray({})); }},
@@ -76,7 +65,8 @@ TEST_CASE("IEmbeddedControl palette: only a one-dimensional array of 20 four-byt
   DllUnderTest dll;
   IUnknown* probe = nullptr;
   REQUIRE(dll.Create(CLSID_TidesWindow, IID_IUnknown, reinterpret_cast<void**>(&probe)) == S_OK);
-  const std::vector<LONG> before = Colours(10), given = Colours(90);
+  std::vector<LONG> before, given;
+  for (int i = 0; i < 20; ++i) before.push_back(RGB(10 + i, 2 * i + 1, 245)), given.push_back(RGB(90 + i, 2 * i, 165));
   for (const auto& [name, clsid] : kControls) {
     HostedControl hosted(dll, *clsid);
     IEmbeddedControl* embedded = hosted.Query<IEmbeddedControl>();
@@ -91,16 +81,12 @@ TEST_CASE("IEmbeddedControl palette: only a one-dimensional array of 20 four-byt
       INFO(name << ": " << row.what);
       CHECK(replaced(row.make(given).get()) == row.replaces);
     }
-    // References: to an array, and to a VARIANT that holds one (one level only).
+    // References: to an array, and to a VARIANT that holds one.
     SAFEARRAY* array = MakeLongArray(given);
     Variant inner = Variant::Array(VT_I4, array);
-    SAFEARRAY* nothing = nullptr;
-    Variant nested = Variant::RefVariant(&inner.get());
     std::tuple<const char*, Variant, bool> refs[] = {
         {"VT_BYREF|VT_ARRAY|VT_I4", Variant::RefArray(VT_I4, &array), true},
         {"VT_BYREF|VT_VARIANT holding the array", Variant::RefVariant(&inner.get()), true},
-        {"a reference to a reference", Variant::RefVariant(&nested.get()), false},
-        {"VT_BYREF|VT_ARRAY to a null array", Variant::RefArray(VT_I4, &nothing), false},
         {"VT_BYREF|VT_VARIANT to nothing", Variant::RefVariant(nullptr), false},
     };
     for (auto& [what, value, replaces] : refs) {
@@ -112,81 +98,17 @@ TEST_CASE("IEmbeddedControl palette: only a one-dimensional array of 20 four-byt
     CHECK(replaced(inner.get()));
     CHECK(array->cLocks == 1);
     SafeArrayUnlock(array);
-    embedded->Release();
-  }
-  probe->Release();
-  CHECK(dll.CanUnloadNow() == S_OK);
-}
-
-namespace {
-
-#define BR_NOT_IMPLEMENTED(name, argument) \
-  STDMETHODIMP name(argument) override { return E_NOTIMPL; }
-
-// A font object that fails to give a handle, or gives one that is no font.
-struct BadFont : IFont {
-  HRESULT handleResult;
-  HFONT handle;
-  BadFont(HRESULT result, HFONT h) : handleResult(result), handle(h) {}
-  STDMETHODIMP QueryInterface(REFIID riid, void** out) override {
-    const bool font = IsEqualIID(riid, IID_IUnknown) || IsEqualIID(riid, IID_IFont);
-    *out = font ? this : nullptr;
-    return font ? S_OK : E_NOINTERFACE;
-  }
-  STDMETHODIMP_(ULONG) AddRef() override { return 2; }
-  STDMETHODIMP_(ULONG) Release() override { return 1; }
-  STDMETHODIMP get_hFont(HFONT* out) override {
-    if (out) *out = handle;
-    return handleResult;
-  }
-  BR_NOT_IMPLEMENTED(get_Name, BSTR*) BR_NOT_IMPLEMENTED(put_Name, BSTR)
-  BR_NOT_IMPLEMENTED(get_Size, CY*) BR_NOT_IMPLEMENTED(put_Size, CY)
-  BR_NOT_IMPLEMENTED(get_Bold, BOOL*) BR_NOT_IMPLEMENTED(put_Bold, BOOL)
-  BR_NOT_IMPLEMENTED(get_Italic, BOOL*) BR_NOT_IMPLEMENTED(put_Italic, BOOL)
-  BR_NOT_IMPLEMENTED(get_Underline, BOOL*) BR_NOT_IMPLEMENTED(put_Underline, BOOL)
-  BR_NOT_IMPLEMENTED(get_Strikethrough, BOOL*) BR_NOT_IMPLEMENTED(put_Strikethrough, BOOL)
-  BR_NOT_IMPLEMENTED(get_Weight, SHORT*) BR_NOT_IMPLEMENTED(put_Weight, SHORT)
-  BR_NOT_IMPLEMENTED(get_Charset, SHORT*) BR_NOT_IMPLEMENTED(put_Charset, SHORT)
-  BR_NOT_IMPLEMENTED(Clone, IFont**) BR_NOT_IMPLEMENTED(IsEqual, IFont*) BR_NOT_IMPLEMENTED(SetHdc, HDC)
-  BR_NOT_IMPLEMENTED(QueryTextMetrics, TEXTMETRICOLE*) BR_NOT_IMPLEMENTED(AddRefHfont, HFONT)
-  BR_NOT_IMPLEMENTED(ReleaseHfont, HFONT)
-  STDMETHODIMP SetRatio(LONG, LONG) override { return E_NOTIMPL; }
-};
-
-}  // namespace
-
-TEST_CASE("IEmbeddedControl reserved, font and size slots with odd and missing arguments") {
-  DllUnderTest dll;
-  HFONT deleted = CreateFontW(12, 0, 0, 0, FW_NORMAL, 0, 0, 0, 0, 0, 0, 0, 0, L"Arial");
-  DeleteObject(deleted);
-  BadFont failing(E_FAIL, nullptr), stale(S_OK, deleted);
-  FONTDESC description = {sizeof(FONTDESC), const_cast<LPOLESTR>(L"Arial"), {{120000, 0}}, FW_BOLD, ANSI_CHARSET,
-                          FALSE, FALSE, FALSE};
-  IFont* real = nullptr;
-  REQUIRE(OleCreateFontIndirect(&description, IID_IFont, reinterpret_cast<void**>(&real)) == S_OK);
-  for (const auto& [name, clsid] : kControls) {
-    INFO(name);
-    HostedControl hosted(dll, *clsid);
-    IEmbeddedControl* embedded = hosted.Query<IEmbeddedControl>();
-    CHECK(embedded->Reserved(0, 0) == S_OK);
-    CHECK(embedded->Reserved(LONG_MIN, LONG_MAX) == S_OK);
-    for (IFont* font : std::initializer_list<IFont*>{nullptr, &failing, &stale, real, nullptr}) {
-      CHECK(embedded->SetFont(-1, font, LONG_MAX) == S_OK);
-      Canvas canvas(300, 200);
-      CHECK(DrawControl(hosted.Control(), canvas) == S_OK);
-      hosted.Paint();
-    }
+    // The other slots: missing out-pointers, a null font, extreme reserved values.
     LONG width = kUntouchedLong, height = kUntouchedLong;
-    CHECK(embedded->GetPreferredSize(nullptr, nullptr) == E_POINTER);
     CHECK(embedded->GetPreferredSize(&width, nullptr) == E_POINTER);
     CHECK(embedded->GetPreferredSize(nullptr, &height) == E_POINTER);
     CHECK(width == kUntouchedLong);
     CHECK(height == kUntouchedLong);
-    CHECK(embedded->GetPreferredSize(&width, &height) == S_OK);
-    CHECK(width == 300);
-    CHECK(height == 200);
+    CHECK(embedded->SetFont(-1, nullptr, LONG_MAX) == S_OK);
+    CHECK(embedded->Reserved(LONG_MIN, LONG_MAX) == S_OK);
+    hosted.Paint();
     embedded->Release();
   }
-  real->Release();
+  probe->Release();
   CHECK(dll.CanUnloadNow() == S_OK);
 }

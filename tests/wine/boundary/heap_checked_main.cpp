@@ -25,37 +25,28 @@ bool SetGlobalFlagForThisProgram() {
          ERROR_SUCCESS;
 }
 
-// Runs this program again with the same command line; its exit code, or -1. A child that
-// fails without a word says nothing of why, so its code is printed here.
+// Runs this program again with the same command line, in a job that ends it with this
+// process; its exit code, printed when not 0 (a child that fails silently says nothing).
 int RunChild() {
   SetEnvironmentVariableW(kChildMark, L"1");
   STARTUPINFOW startup = {};
   startup.cb = sizeof startup;
   PROCESS_INFORMATION process = {};
   std::wstring commandLine = GetCommandLineW();
-  // The child ends with this process (a test runner that gives up on us kills only us).
   HANDLE job = CreateJobObjectW(nullptr, nullptr);
   JOBOBJECT_EXTENDED_LIMIT_INFORMATION limits = {};
   limits.BasicLimitInformation.LimitFlags = JOB_OBJECT_LIMIT_KILL_ON_JOB_CLOSE;
   SetInformationJobObject(job, JobObjectExtendedLimitInformation, &limits, sizeof limits);
   if (!CreateProcessW(nullptr, &commandLine[0], nullptr, nullptr, TRUE, CREATE_SUSPENDED, nullptr, nullptr, &startup,
-                      &process)) {
-    std::fprintf(stderr, "heap-checked run: the suite could not be started (error %lu)\n",
-                 static_cast<unsigned long>(GetLastError()));
-    return -1;
-  }
+                      &process))
+    return std::fprintf(stderr, "heap-checked run: no child (error %lu)\n", GetLastError()), -1;
   AssignProcessToJobObject(job, process.hProcess);
   ResumeThread(process.hThread);
   const DWORD waited = WaitForSingleObject(process.hProcess, INFINITE);
-  if (waited != WAIT_OBJECT_0)
-    std::fprintf(stderr, "heap-checked run: waiting for the suite gave %lu (error %lu)\n",
-                 static_cast<unsigned long>(waited), static_cast<unsigned long>(GetLastError()));
   DWORD code = static_cast<DWORD>(-1);
   GetExitCodeProcess(process.hProcess, &code);
-  CloseHandle(process.hThread);
-  CloseHandle(process.hProcess);
-  CloseHandle(job);
-  if (code != 0) std::fprintf(stderr, "heap-checked run: the suite ended with code %08lX\n", static_cast<unsigned long>(code));
+  if (code != 0) std::fprintf(stderr, "heap-checked run: wait %lu, child exit code %08lX\n", waited, code);
+  for (HANDLE h : {process.hThread, process.hProcess, job}) CloseHandle(h);
   return static_cast<int>(code);
 }
 

@@ -1,7 +1,6 @@
 // ITidesPort with bad input: a failed getter writes nothing, changes nothing and fires nothing.
 #include "tests/wine/boundary/boundary_support.h"
 
-#include <climits>
 #include <cmath>
 
 using namespace br::test;
@@ -9,11 +8,8 @@ using namespace br::test::boundary;
 
 namespace {
 
-constexpr double kDay = 36526.0;            // 2000-01-01
-constexpr double kFirstDate = -657434.0;    // 0100-01-01
-constexpr double kPastLastDate = 2958466.0;  // the day after 9999-12-31
-
-enum DispId : DISPID { kGetPortPos = 2, kCalculate, kWavePoint = 6 };
+constexpr double kDay = 36526.0, kFirstDate = -657434.0;  // 2000-01-01, 0100-01-01
+constexpr double kPastLastDate = 2958466.0;                // the day after 9999-12-31
 
 // The getters that need points (one of the two pointers set).
 struct Getter {
@@ -34,25 +30,17 @@ HRESULT Call(ITidesPort* p, const Getter& g, Outs* o) {
   return g.real ? (p->*g.real)(o ? &o->value : nullptr) : (p->*g.whole)(o ? &o->number : nullptr);
 }
 
-// Everything a port shows, each getter's result and value (read after the call).
+// The day a port shows: each getter's result and value, and the last point.
 std::vector<std::pair<HRESULT, double>> Read(ITidesPort* port) {
   std::vector<std::pair<HRESULT, double>> f;
-  auto keep = [&f](HRESULT hr, const auto& v) { f.emplace_back(hr, hr == S_OK ? static_cast<double>(v) : 0.0); };
-  BSTR name = nullptr;
-  const HRESULT named = port->get_PortName(&name);
-  keep(named, name ? SysStringLen(name) : 0u);
-  SysFreeString(name);
   Outs o;
-  const HRESULT position = port->GetPortPos(&o.value, &o.second);
-  keep(position, o.value);
-  keep(position, o.second);
-  keep(port->get_NumPoints(&o.number), o.number);
-  const long last = o.number > 0 ? o.number - 1 : 0;
-  keep(port->get_WavePoint(0, &o.value), o.value);
-  keep(port->get_WavePoint(last, &o.value), o.value);
+  const HRESULT counted = port->get_NumPoints(&o.number);
+  f.emplace_back(counted, o.number);
+  const HRESULT last = port->get_WavePoint(o.number - 1, &o.value);
+  f.emplace_back(last, o.value);
   for (const Getter& g : kPointGetters) {
-    const HRESULT hr = Call(port, g, &o);
-    g.real ? keep(hr, o.value) : keep(hr, o.number);
+    const HRESULT hr = Call(port, g, &o);  // before reading what it wrote
+    f.emplace_back(hr, g.real ? o.value : o.number);
   }
   return f;
 }
@@ -73,12 +61,10 @@ std::vector<Row> Rows(const State& s, Outs& o) {
   std::vector<Row> rows = {
       {"PortName(null)", [=] { return p->get_PortName(nullptr); }, s.plainNull},
       {"GetPortPos(null, lon)", [=, &o] { return p->GetPortPos(nullptr, &o.second); }, s.plainNull},
-      {"GetPortPos(lat, null)", [=, &o] { return p->GetPortPos(&o.value, nullptr); }, s.plainNull},
       {"NumPoints(null)", [=] { return p->get_NumPoints(nullptr); }, s.plainNull},
       {"WavePoint(0, null)", [=] { return p->get_WavePoint(0, nullptr); }, s.pointsNull},
-      {"WavePoint(-1, null)", [=] { return p->get_WavePoint(-1, nullptr); }, s.pointsNull},
   };
-  for (long k : {-1L, s.points, LONG_MIN, 65536L})
+  for (long k : {-1L, s.points, 65536L})
     rows.push_back({"WavePoint(" + std::to_string(k) + ")", [=, &o] { return p->get_WavePoint(k, &o.value); },
                     s.outside});
   for (const Getter& g : kPointGetters) {
@@ -133,10 +119,9 @@ TEST_CASE("ITidesPort Calculate: NaN, infinite, tiny and huge steps and dates al
   const CalculateRow rows[] = {
       {"NaN step", kNaN, kDay, 0},
       {"infinite step", kInfinity, kDay, 1},
-      // Finer than a point a second is refused (1e-7 asked for 240 million points).
+      // Finer than a point a second is refused.
       {"one point a second", 1.0 / 3600.0, kDay, 86401},
       {"a step finer than a second", 1.0 / 3601.0, kDay, 0},
-      {"a step of 1e-7 hour", 1e-7, kDay, 0},
       {"NaN date", 1.0, kNaN, 0},
       {"infinite date", 1.0, kInfinity, 0},
       {"first platform date", 1.0, kFirstDate, 25},
@@ -154,43 +139,16 @@ TEST_CASE("ITidesPort Calculate: NaN, infinite, tiny and huge steps and dates al
     CHECK(Points(port) == row.points);
     o.Reset();
     if (row.points > 0) {
-      CHECK(port->get_Step(&o.value) == S_OK);
-      CHECK(o.value == row.step);
-      CHECK(port->get_PredictionDate(&o.value) == S_OK);
-      CHECK(o.value == std::trunc(row.date));
-      CHECK(port->get_WavePoint(row.points - 1, &o.value) == S_OK);
-      CHECK(std::isfinite(o.value));
+      const auto day = Read(port);  // count, last point, PredictionDate, ..., Step at 7
+      for (const auto& answer : day) CHECK(answer.first == S_OK);
+      CHECK(std::isfinite(day[1].second));
+      CHECK(day[2].second == std::trunc(row.date));
+      CHECK(day[7].second == row.step);
     } else {
       for (const Getter& g : kPointGetters) CHECK(Call(port, g, &o) == E_ACCESSDENIED);
       CHECK(o.Untouched());
     }
   }
-  sink.Disconnect();
-  port->Release();
-  CHECK(t.Finish() == S_OK);
-}
-
-TEST_CASE("ITidesPort late bound: a refused index changes nothing and fires nothing; script hosts' forms work") {
-  OpenTides t({kHarbour});
-  ITidesPort* port = t.Port(0);
-  REQUIRE(port->Calculate(1.0, kDay) == S_OK);
-  EventSink sink(DIID__ITidesPortEvents);
-  REQUIRE(sink.Connect(port));
-  auto point = [&] { return LateCall(port, kWavePoint, DISPATCH_PROPERTYGET).Arg(Variant::I4(-1)).Result(); };
-  RunRows({{"WavePoint(-1)", point, E_INVALIDARG}},
-          [&] { return std::make_pair(Read(port), sink.calls); });
-
-  // What script hosts do pass: coercible types and by-reference doubles.
-  double step = 0.5, latitude = kUntouchedDouble, longitude = kUntouchedDouble;
-  LateCall calculate(port, kCalculate);
-  const int calls = sink.calls;
-  CHECK(calculate.Arg(Variant::RefR8(&step)).Arg(Variant::Bstr(L"36527")).Run() == S_OK);
-  CHECK(sink.calls == calls + 1);
-  CHECK(Points(port) == 49);
-  LateCall position(port, kGetPortPos);
-  CHECK(position.Arg(Variant::RefR8(&latitude)).Arg(Variant::RefR8(&longitude)).Run() == S_OK);
-  CHECK(latitude == Degrees(1200));
-  CHECK(longitude == Degrees(-300));
   sink.Disconnect();
   port->Release();
   CHECK(t.Finish() == S_OK);

@@ -25,12 +25,11 @@ DllUnderTest::DllUnderTest() : path_(BuiltDllPath()) {
   comInitialised_ = SUCCEEDED(CoInitializeEx(nullptr, COINIT_APARTMENTTHREADED));
   module_ = LoadLibraryW(path_.c_str());
   if (!module_) throw std::runtime_error("BR_Info.dll cannot be loaded");
-  canUnloadNow_ = reinterpret_cast<Entry0>(reinterpret_cast<void*>(GetProcAddress(module_, "DllCanUnloadNow")));
-  getClassObject_ = reinterpret_cast<GetClassObjectEntry>(
-      reinterpret_cast<void*>(GetProcAddress(module_, "DllGetClassObject")));
-  registerServer_ = reinterpret_cast<Entry0>(reinterpret_cast<void*>(GetProcAddress(module_, "DllRegisterServer")));
-  unregisterServer_ =
-      reinterpret_cast<Entry0>(reinterpret_cast<void*>(GetProcAddress(module_, "DllUnregisterServer")));
+  auto entry = [this](const char* name) { return reinterpret_cast<void*>(GetProcAddress(module_, name)); };
+  canUnloadNow_ = reinterpret_cast<Entry0>(entry("DllCanUnloadNow"));
+  getClassObject_ = reinterpret_cast<GetClassObjectEntry>(entry("DllGetClassObject"));
+  registerServer_ = reinterpret_cast<Entry0>(entry("DllRegisterServer"));
+  unregisterServer_ = reinterpret_cast<Entry0>(entry("DllUnregisterServer"));
   if (!canUnloadNow_ || !getClassObject_ || !registerServer_ || !unregisterServer_) {
     FreeLibrary(module_);
     throw std::runtime_error("BR_Info.dll lacks an entry point");

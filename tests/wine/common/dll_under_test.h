@@ -1,6 +1,5 @@
-// The built BR_Info.dll, loaded by path for one test: its entry points, objects made
-// through its class objects (no registration needed), and, at the end, the check that it
-// can unload and the unload itself, which resets the library's process-wide state.
+// The built BR_Info.dll loaded by path for one test: objects through its class objects, and
+// at the end the check that it can unload and the unload, which resets its process state.
 #pragma once
 
 #include <windows.h>
@@ -29,7 +28,6 @@ public:
   HRESULT RegisterServer() const { return registerServer_(); }
   HRESULT UnregisterServer() const { return unregisterServer_(); }
 
-  // A new object of clsid through its class object, asked for riid.
   HRESULT Create(REFCLSID clsid, REFIID riid, void** out) const;
   template <class I>
   HRESULT Create(REFCLSID clsid, I** out) const {
@@ -52,8 +50,7 @@ private:
   Entry0 unregisterServer_ = nullptr;
 };
 
-// A TidesDatabase of the loaded DLL opened on a station folder, and one of its ports as
-// ITidesPort (both REQUIREd; the caller releases them).
+// A database opened on a folder, and its port as ITidesPort (REQUIREd; the caller releases).
 ITidesDatabase* OpenedDatabase(const DllUnderTest& dll, const std::wstring& folder);
 ITidesPort* PortAt(ITidesDatabase* database, long index);
 
@@ -69,16 +66,22 @@ I* Query(IUnknown* object) {
 // Releases an interface pointer and nulls it.
 template <class I>
 void ReleaseAndNull(I*& p) {
-  if (p) {
-    p->Release();
-    p = nullptr;
-  }
+  if (p) p->Release(), p = nullptr;
 }
 
 // Current reference count of an object (AddRef then Release).
-inline ULONG RefCount(IUnknown* p) {
-  p->AddRef();
-  return p->Release();
+inline ULONG RefCount(IUnknown* p) { return p->AddRef(), p->Release(); }
+
+// NumPoints of a port and NumPorts of a database, REQUIREd to answer.
+inline long Points(ITidesPort* port) {
+  long n = -1;
+  REQUIRE(port->get_NumPoints(&n) == S_OK);
+  return n;
+}
+inline long CountOf(ITidesDatabase* database) {
+  long n = -1;
+  REQUIRE(database->get_NumPorts(&n) == S_OK);
+  return n;
 }
 
 }  // namespace br::test

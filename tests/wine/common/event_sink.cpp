@@ -29,26 +29,10 @@ void EventSink::Disconnect() {
 
 STDMETHODIMP EventSink::QueryInterface(REFIID riid, void** out) {
   if (!out) return E_POINTER;
-  if (IsEqualIID(riid, IID_IUnknown) || IsEqualIID(riid, IID_IDispatch) || IsEqualIID(riid, events_)) {
-    *out = static_cast<IDispatch*>(this);
-    AddRef();
-    return S_OK;
-  }
-  *out = nullptr;
-  return E_NOINTERFACE;
+  const bool ours = IsEqualIID(riid, IID_IUnknown) || IsEqualIID(riid, IID_IDispatch) || IsEqualIID(riid, events_);
+  *out = ours ? static_cast<IDispatch*>(this) : nullptr;
+  return ours ? (AddRef(), S_OK) : E_NOINTERFACE;
 }
-
-STDMETHODIMP EventSink::GetTypeInfoCount(UINT* count) {
-  if (count) *count = 0;
-  return S_OK;
-}
-
-STDMETHODIMP EventSink::GetTypeInfo(UINT, LCID, ITypeInfo** out) {
-  if (out) *out = nullptr;
-  return E_NOTIMPL;
-}
-
-STDMETHODIMP EventSink::GetIDsOfNames(REFIID, LPOLESTR*, UINT, LCID, DISPID*) { return E_NOTIMPL; }
 
 STDMETHODIMP EventSink::Invoke(DISPID id, REFIID riid, LCID locale, WORD flags, DISPPARAMS* params,
                                VARIANT* result, EXCEPINFO*, UINT*) {
@@ -59,13 +43,9 @@ STDMETHODIMP EventSink::Invoke(DISPID id, REFIID riid, LCID locale, WORD flags, 
   lastIidNull = IsEqualIID(riid, IID_NULL) != 0;
   lastDoubles.clear();
   lastArgumentCount = params ? params->cArgs : 0;
-  if (params) {
-    for (UINT i = params->cArgs; i > 0; --i) {  // DISPPARAMS holds the arguments in reverse
-      const VARIANT& v = params->rgvarg[i - 1];
-      if (v.vt == VT_R8) lastDoubles.push_back(v.dblVal);
-    }
-  }
-  if (params && params->cArgs > 0) {
+  for (UINT i = lastArgumentCount; i > 0; --i)  // DISPPARAMS holds the arguments in reverse
+    if (params->rgvarg[i - 1].vt == VT_R8) lastDoubles.push_back(params->rgvarg[i - 1].dblVal);
+  if (lastArgumentCount > 0) {
     const VARIANT& first = params->rgvarg[params->cArgs - 1];
     argumentTypes.push_back(first.vt);
     if (recordPortNames)
@@ -80,11 +60,8 @@ std::wstring PortName(IUnknown* port) {
   ITidesPort* tides = nullptr;
   if (!port || FAILED(port->QueryInterface(IID_ITidesPort, reinterpret_cast<void**>(&tides)))) return L"";
   BSTR name = nullptr;
-  std::wstring out;
-  if (SUCCEEDED(tides->get_PortName(&name)) && name) out = name;
-  SysFreeString(name);
-  tides->Release();
-  return out;
+  const std::wstring out = SUCCEEDED(tides->get_PortName(&name)) && name ? name : L"";
+  return SysFreeString(name), tides->Release(), out;
 }
 
 }  // namespace br::test

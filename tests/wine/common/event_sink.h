@@ -1,5 +1,5 @@
-// A test sink for an events dispinterface: counts the calls, keeps the last dispatch id
-// and arguments, and can run an action from inside a call (to disconnect or release).
+// A test sink for an events dispinterface: counts the calls, keeps the last call's id and
+// arguments, and can run an action from inside a call.
 #pragma once
 
 #include <windows.h>
@@ -16,7 +16,6 @@ class EventSink final : public IDispatch {
 public:
   explicit EventSink(const IID& events) : events_(events) {}
 
-  // Connects to source's connection point for the events interface; false on failure.
   bool Connect(IUnknown* source);
   void Disconnect();
 
@@ -37,14 +36,13 @@ public:
   STDMETHODIMP QueryInterface(REFIID riid, void** out) override;
   STDMETHODIMP_(ULONG) AddRef() override { return ++refs_; }
   STDMETHODIMP_(ULONG) Release() override { return --refs_; }  // lives on the test's stack
-  STDMETHODIMP GetTypeInfoCount(UINT* count) override;
-  STDMETHODIMP GetTypeInfo(UINT, LCID, ITypeInfo** out) override;
-  STDMETHODIMP GetIDsOfNames(REFIID, LPOLESTR*, UINT, LCID, DISPID*) override;
+  STDMETHODIMP GetTypeInfoCount(UINT* count) override { return count ? (*count = 0, S_OK) : S_OK; }
+  STDMETHODIMP GetTypeInfo(UINT, LCID, ITypeInfo** out) override { return out ? (*out = nullptr, E_NOTIMPL) : E_NOTIMPL; }
+  STDMETHODIMP GetIDsOfNames(REFIID, LPOLESTR*, UINT, LCID, DISPID*) override { return E_NOTIMPL; }
   STDMETHODIMP Invoke(DISPID id, REFIID riid, LCID locale, WORD flags, DISPPARAMS* params, VARIANT* result,
                       EXCEPINFO*, UINT*) override;
 
   ULONG References() const { return refs_; }
-  DWORD Cookie() const { return cookie_; }
 
 private:
   const IID& events_;

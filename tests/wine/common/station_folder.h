@@ -5,7 +5,6 @@
 
 #include <cstdint>
 #include <memory>
-#include <set>
 #include <string>
 #include <vector>
 
@@ -29,16 +28,9 @@ struct TestStation {
   std::vector<TestConstituent> constituents;
 };
 
-struct FolderOptions {
-  bool withoutDataFile = false;             // leave "td_pnt.dat" out
-  // Stations whose "td_crd.ntx" record is replaced by one at a position no station has, so
-  // the coordinate search cannot find them (the index keeps its full count).
-  std::set<std::size_t> notInCoordinateIndex;
-};
-
 class StationFolder {
 public:
-  explicit StationFolder(const std::vector<TestStation>& stations, const FolderOptions& options = {});
+  explicit StationFolder(const std::vector<TestStation>& stations, bool withoutDataFile = false);  // no td_pnt.dat
   ~StationFolder();
   StationFolder(const StationFolder&) = delete;
   StationFolder& operator=(const StationFolder&) = delete;
