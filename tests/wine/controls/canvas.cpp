@@ -2,6 +2,8 @@
 
 #include <cstring>
 
+#include "BR_Private.h"
+
 namespace br::test {
 
 Canvas::Canvas(int width, int height, COLORREF background) : width_(width), height_(height) {
@@ -50,6 +52,23 @@ HRESULT DrawControl(IUnknown* control, const Canvas& canvas) {
   const RECTL box{0, 0, canvas.Width(), canvas.Height()};
   hr = view->Draw(DVASPECT_CONTENT, -1, nullptr, nullptr, nullptr, canvas.Dc(), &box, nullptr, nullptr, 0);
   view->Release();
+  return hr;
+}
+
+HRESULT SetRampPalette(IUnknown* control) {
+  IEmbeddedControl* embedded = nullptr;
+  HRESULT hr = control->QueryInterface(IID_IEmbeddedControl, reinterpret_cast<void**>(&embedded));
+  if (FAILED(hr)) return hr;
+  VARIANT palette;
+  palette.vt = VT_ARRAY | VT_I4;
+  palette.parray = SafeArrayCreateVector(VT_I4, 0, 20);
+  for (LONG i = 0; i < 20; ++i) {
+    LONG value = RampColour(i);
+    SafeArrayPutElement(palette.parray, &i, &value);
+  }
+  hr = embedded->SetPalette(palette);
+  VariantClear(&palette);
+  embedded->Release();
   return hr;
 }
 

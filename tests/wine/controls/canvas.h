@@ -36,4 +36,9 @@ private:
 // Draws control (any interface of it) over the whole canvas through IViewObject::Draw.
 HRESULT DrawControl(IUnknown* control, const Canvas& canvas);
 
+// Colour i of the ramp palette: each of the 20 slots told apart on a canvas.
+inline COLORREF RampColour(int i) { return RGB(10 * i, 3, 5); }
+// Hands the ramp palette to control through IEmbeddedControl::SetPalette.
+HRESULT SetRampPalette(IUnknown* control);
+
 }  // namespace br::test

@@ -222,23 +222,15 @@ TEST_CASE("a palette given through IEmbeddedControl recolours every band of ever
   REQUIRE(other->SetPort(&g.port) == S_OK);
   REQUIRE(other->SetScale(1.0, 0.0) == S_OK);
   REQUIRE(other.SetDrawText(0) == S_OK);
-  VARIANT palette;
-  palette.vt = VT_ARRAY | VT_I4;
-  palette.parray = SafeArrayCreateVector(VT_I4, 0, 20);
-  for (LONG i = 0; i < 20; ++i) {
-    LONG value = RGB(10 * i, 3, 5);
-    SafeArrayPutElement(palette.parray, &i, &value);
-  }
-  CHECK(g.Face<IEmbeddedControl>()->SetPalette(palette) == S_OK);
-  VariantClear(&palette);
+  CHECK(SetRampPalette(g.graph.Get()) == S_OK);
   Canvas recoloured(300, 200);
   REQUIRE(DrawControl(other.Get(), recoloured) == S_OK);
-  CHECK(recoloured.At(40, 137) == RGB(170, 3, 5));  // night: 17
-  CHECK(recoloured.At(75, 137) == RGB(120, 3, 5));  // twilight: 12
-  CHECK(recoloured.At(100, 137) == RGB(50, 3, 5));  // daylight: 5
-  CHECK(recoloured.At(4, 100) == RGB(70, 3, 5));    // frame: 7
+  CHECK(recoloured.At(40, 137) == RampColour(17));  // night
+  CHECK(recoloured.At(75, 137) == RampColour(12));  // twilight
+  CHECK(recoloured.At(100, 137) == RampColour(5));  // daylight
+  CHECK(recoloured.At(4, 100) == RampColour(7));    // frame
   const POINT first = CurvePoint(0, g.port.points[0], 1.0, 0.0);
-  CHECK(recoloured.At(first.x, first.y) == RGB(100, 3, 5));  // curve: 10
+  CHECK(recoloured.At(first.x, first.y) == RampColour(10));  // curve
   other.Release();
 
   // SetScale with a maximum of 0: the day's lowest and highest heights span the plot, whatever the minimum.
@@ -249,7 +241,7 @@ TEST_CASE("a palette given through IEmbeddedControl recolours every band of ever
   const auto [low, high] = std::minmax_element(values.begin(), values.end());
   const int highX = CurvePoint(static_cast<int>(high - values.begin()), *high, *high, *low).x;
   const int lowX = CurvePoint(static_cast<int>(low - values.begin()), *low, *high, *low).x;
-  CHECK(canvas.Count(RGB(100, 3, 5), highX - 1, 7, highX + 2, 10) > 0);    // around the top row, 8
-  CHECK(canvas.Count(RGB(100, 3, 5), lowX - 1, 190, lowX + 2, 193) > 0);  // around the bottom row, 191
+  CHECK(canvas.Count(RampColour(10), highX - 1, 7, highX + 2, 10) > 0);    // around the top row, 8
+  CHECK(canvas.Count(RampColour(10), lowX - 1, 190, lowX + 2, 193) > 0);  // around the bottom row, 191
   CHECK(g.Finish() == S_OK);
 }

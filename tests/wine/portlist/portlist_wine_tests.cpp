@@ -148,19 +148,9 @@ TEST_CASE("ports set before the window fill the table when it is made; rows by n
   active->Release();
 
   // The background is palette colour 7.
-  VARIANT palette;
-  palette.vt = VT_ARRAY | VT_I4;
-  palette.parray = SafeArrayCreateVector(VT_I4, 0, 20);
-  for (LONG i = 0; i < 20; ++i) {
-    LONG value = RGB(10 * i, 3, 5);
-    SafeArrayPutElement(palette.parray, &i, &value);
-  }
-  IEmbeddedControl* embedded = Query<IEmbeddedControl>(p.list);
-  CHECK(embedded->SetPalette(palette) == S_OK);
-  embedded->Release();
-  SafeArrayDestroy(palette.parray);
+  CHECK(SetRampPalette(p.list) == S_OK);
   Canvas erased(300, 200);
   CHECK(SendMessageA(p.window, WM_ERASEBKGND, reinterpret_cast<WPARAM>(erased.Dc()), 0) != 0);
-  CHECK(erased.Count(RGB(70, 3, 5), 0, 0, 300, 200) == 300 * 200);
+  CHECK(erased.Count(RampColour(7), 0, 0, 300, 200) == 300 * 200);
   CHECK(p.Finish() == S_OK);
 }
