@@ -34,7 +34,6 @@ public:
     return Create(clsid, __uuidof(I), reinterpret_cast<void**>(out));
   }
 
-  HMODULE Handle() const { return module_; }
   const std::wstring& Path() const { return path_; }
 
 private:
