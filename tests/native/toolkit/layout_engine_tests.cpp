@@ -7,6 +7,7 @@
 #include "toolkit/layout/BorderLayout.h"
 #include "toolkit/layout/GridLayout.h"
 #include "toolkit/layout/LayoutEngine.h"
+#include "toolkit/layout/SplitterLayout.h"
 
 using namespace toolkit;
 
@@ -119,3 +120,16 @@ TEST_CASE("grid: gaps, equal shares and row heights by mode") {
   CHECK(engine.preferredSize() == Size{2 * (4 + 10), 30 + 30});
 }
 
+
+// Regression: an unset split (0 / 0) shares the extent instead of dividing by zero.
+TEST_CASE("splitter: a set split places the first pane; an unset one shares the extent") {
+  Items items;
+  for (int i = 0; i < 2; ++i) items.add(20, 30);
+  SplitterLayout split(kSplitSideBySide, 4);
+  LayoutEngine(items, split).layOut(Rect{0, 0, 400, 100});
+  CheckBounds(items, {{0, 0, 198, 100}, {202, 0, 198, 100}});
+  split.splitNumerator = 1;  // first = 1 * 400 / 4 - 4 / 2
+  split.splitDenominator = 4;
+  LayoutEngine(items, split).layOut(Rect{0, 0, 400, 100});
+  CheckBounds(items, {{0, 0, 98, 100}, {102, 0, 298, 100}});
+}

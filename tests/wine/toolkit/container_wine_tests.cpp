@@ -126,3 +126,18 @@ TEST_CASE("a container lends its font (lent or an OLE font) down the tree; child
   font->Release();
 }
 
+
+// Regression: a child left behind by its container forgets it (no dangling parent).
+TEST_CASE("children outlive their container and forget it") {
+  HostWindow host;
+  Probe child;
+  {
+    Panel root;
+    REQUIRE(root.create(host.hwnd()));
+    root.add(&child);
+    REQUIRE(child.isValid());
+  }
+  CHECK(child.getParent() == nullptr);
+  CHECK_FALSE(child.isValid());  // its window went with the container's
+  CHECK(child.fireAction() == 0);
+}

@@ -1,6 +1,7 @@
 // Messages to events, bubbling, the subclassed native procedure, focus, deletion in a handler.
 #include <doctest/doctest.h>
 
+#include <memory>
 #include <utility>
 #include <vector>
 
@@ -125,3 +126,32 @@ TEST_CASE("a handler that deletes its own component ends the dispatch safely") {
   CHECK(ToolkitWindows::componentOf(h) == nullptr);
 }
 
+
+// Regressions: WM_ENABLE passes the platform's flag on; a posted event reaches the component
+// through the message loop; a subclassed window has its own procedure back for WM_NCDESTROY.
+TEST_CASE("platform enabling, posted events and the end of a subclassed window") {
+  HostWindow host;
+  Probe p;
+  REQUIRE(p.createWindow(0, nativeClassName(), "", WS_CHILD | WS_VISIBLE, 0, 0, 50, 20, host.hwnd(), 0));
+  HWND h = p.getHandle();
+  EnableWindow(h, FALSE);
+  CHECK_FALSE(p.getEnabledFlag());
+  EnableWindow(h, TRUE);
+  CHECK(p.getEnabledFlag());
+
+  p.seen.clear();
+  auto posted = std::make_unique<ToolkitEvent>(&p, 40, h);
+  posted->params[0] = 99;
+  REQUIRE(p.postEvent(std::move(posted)));
+  CHECK(p.seen.empty());
+  pump(20);
+  REQUIRE(p.last(40));
+  CHECK(p.last(40)->params[0] == 99);
+
+  nativeCalls().clear();
+  const size_t before = ToolkitWindows::windowCount();
+  DestroyWindow(h);
+  CHECK(nativeCount(WM_NCDESTROY) == 1);
+  CHECK(ToolkitWindows::windowCount() == before - 1);
+  CHECK_FALSE(p.isValid());
+}
