@@ -6,7 +6,7 @@
 
 set(BR_DOCTEST_MAIN ${BR_ROOT}/tests/doctest_main.cpp)
 if(BR_WINDOWS)
-  set(BR_CRASH_REPORT ${BR_ROOT}/tests/support/crash_report.cpp)
+  set(BR_CRASH_REPORT ${BR_ROOT}/tests/wine/common/crash_report.cpp)
   list(APPEND BR_DOCTEST_MAIN ${BR_CRASH_REPORT})
 endif()
 

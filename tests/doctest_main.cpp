@@ -2,7 +2,7 @@
 #include <doctest/doctest.h>
 
 #ifdef _WIN32
-#include "tests/support/crash_report.h"
+#include "tests/wine/common/crash_report.h"
 #endif
 
 int main(int argc, char** argv) {

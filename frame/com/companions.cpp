@@ -1,6 +1,6 @@
 #include "frame/com/companions.h"
 
-#include "frame/com/type_library.h"
+#include "frame/com/TypeLibrary.h"
 
 namespace br::com {
 

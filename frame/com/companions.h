@@ -3,7 +3,7 @@
 // owner's reference count and interface table govern them.
 #pragma once
 
-#include "frame/com/class_identity.h"
+#include "frame/com/ClassIdentity.h"
 
 #include <ocidl.h>
 

@@ -1,7 +1,7 @@
 // Error information for automation clients (IErrorInfo through SetErrorInfo).
 #pragma once
 
-#include "frame/com/class_identity.h"
+#include "frame/com/ClassIdentity.h"
 
 #include <string>
 

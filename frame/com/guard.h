@@ -7,7 +7,7 @@
 // Usage:  STDMETHODIMP Foo::Bar(long x) { return Guarded(kClass, [&] { ...; return S_OK; }); }
 #pragma once
 
-#include "frame/com/class_identity.h"
+#include "frame/com/ClassIdentity.h"
 #include "frame/errors/cComError.h"
 #include "frame/errors/cErr.h"
 

@@ -4,6 +4,8 @@
 
 #include <cstdint>
 
+namespace br {
+
 // The fixed part of a guarded operation's place: its source file, name and
 // first line. BR_ERR_PLACE("Name") fills it at the operation's first line.
 struct ErrPlace {
@@ -12,7 +14,7 @@ struct ErrPlace {
   std::int32_t firstLine;
 };
 
-#define BR_ERR_PLACE(function) (ErrPlace{__FILE__, (function), __LINE__})
+#define BR_ERR_PLACE(function) (::br::ErrPlace{__FILE__, (function), __LINE__})
 
 struct ErrRecord {
   const char* file = "";
@@ -39,3 +41,5 @@ struct ErrRecord {
 
   bool failed() const { return result != 0; }
 };
+
+}  // namespace br

@@ -4,11 +4,15 @@
 
 #include <cstdint>
 
+namespace br {
+
 class cComError {
 public:
-  explicit cComError(std::int32_t hr) noexcept : m_hr(hr) {}
-  std::int32_t Error() const noexcept { return m_hr; }
+  explicit cComError(std::int32_t hr) noexcept : hr_(hr) {}
+  std::int32_t Error() const noexcept { return hr_; }
 
 private:
-  std::int32_t m_hr;
+  std::int32_t hr_;
 };
+
+}  // namespace br

@@ -4,6 +4,8 @@
 
 #include <cstdint>
 
+namespace br {
+
 // Codes thrown by the low-level file, registry and array routines.
 enum : std::uint32_t {
   BR_ERR_REG_NO_KEY = 0xE0030002u,       // registry value queried without an open key
@@ -16,9 +18,11 @@ enum : std::uint32_t {
 
 class cErr {
 public:
-  explicit cErr(std::uint32_t code) noexcept : m_code(code) {}
-  std::uint32_t code() const noexcept { return m_code; }
+  explicit cErr(std::uint32_t code) noexcept : code_(code) {}
+  std::uint32_t code() const noexcept { return code_; }
 
 private:
-  std::uint32_t m_code;
+  std::uint32_t code_;
 };
+
+}  // namespace br

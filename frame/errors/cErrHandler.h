@@ -6,6 +6,8 @@
 
 #include "frame/errors/ErrRecord.h"
 
+namespace br {
+
 class cErrHandler {
 public:
   virtual ~cErrHandler() = default;
@@ -23,3 +25,5 @@ public:
     return Report(className, record);
   }
 };
+
+}  // namespace br

@@ -3,10 +3,12 @@
 #include <cstdio>
 #include <cstdlib>
 
-#include "frame/format/DateTimeFormat.h"
-#include "frame/settings/Settings.h"
+#include "frame/format/date_time_format.h"
+#include "frame/settings/settings.h"
 #include "frame/settings/cRegKeyReader.h"
 #include "frame/settings/cRegSettings.h"
+
+namespace br {
 
 namespace {
 
@@ -37,7 +39,7 @@ PathParts SplitPath(const std::string& path) {
 
 }  // namespace
 
-cErrReporter::cErrReporter() : m_mask(CachedLogMask()) {}
+cErrReporter::cErrReporter() : mask_(CachedLogMask()) {}
 
 std::uint32_t cErrReporter::ReadLogMask(HKEY root, const char* keyPath) {
   cRegKeyReader key(root, keyPath);
@@ -140,7 +142,7 @@ bool cErrReporter::ReportUnguarded(const char* className, ErrRecord& record) {
     lastError = record.code | LIBRARY_ERROR_BIT;
     SetLastError(lastError);
   }
-  m_mask = CurrentMask();
+  mask_ = CurrentMask();
 
   std::string systemText;
   const bool hasSystemText = SystemMessage(record.result, systemText);
@@ -149,7 +151,7 @@ bool cErrReporter::ReportUnguarded(const char* className, ErrRecord& record) {
   context.threadId = GetCurrentThreadId();
   context.systemText = hasSystemText ? systemText.c_str() : nullptr;
 
-  if ((m_mask & LOG_TO_FILE) != 0) {
+  if ((mask_ & LOG_TO_FILE) != 0) {
     SYSTEMTIME now;
     GetLocalTime(&now);
     context.date = FormatDate(now, DATE_PATTERN);
@@ -158,7 +160,7 @@ bool cErrReporter::ReportUnguarded(const char* className, ErrRecord& record) {
   }
 
   bool goOn = true;
-  if ((m_mask & LOG_TO_BOX) != 0) {
+  if ((mask_ & LOG_TO_BOX) != 0) {
     switch (ShowBox(FormatErrBoxText(record, context))) {
       case IDRETRY:
         goOn = false;
@@ -174,3 +176,5 @@ bool cErrReporter::ReportUnguarded(const char* className, ErrRecord& record) {
   SetLastError(lastError);
   return goOn;
 }
+
+}  // namespace br

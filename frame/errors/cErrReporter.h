@@ -8,8 +8,10 @@
 #include <cstdint>
 #include <string>
 
-#include "frame/errors/ErrText.h"
+#include "frame/errors/err_text.h"
 #include "frame/errors/cErrHandler.h"
+
+namespace br {
 
 class cErrReporter : public cErrHandler {
 public:
@@ -19,7 +21,7 @@ public:
 
   cErrReporter();
 
-  std::uint32_t Mask() const { return m_mask; }
+  std::uint32_t Mask() const { return mask_; }
 
   // Clears the thread's last-error value.
   void BeginAttempt() noexcept override;
@@ -48,5 +50,7 @@ private:
   bool ReportUnguarded(const char* className, ErrRecord& record);
   static void AppendToLog(const std::string& line);
 
-  std::uint32_t m_mask;
+  std::uint32_t mask_;
 };
+
+}  // namespace br

@@ -4,9 +4,9 @@
 #include "frame/module/class_rows.h"
 
 #include "tides/controls/TidesPortList.h"
-#include "tides/controls/tides_window.h"
-#include "tides/objects/tides_database.h"
-#include "tides/objects/tides_port.h"
+#include "tides/controls/TidesWindow.h"
+#include "tides/objects/TidesDatabase.h"
+#include "tides/objects/TidesPort.h"
 
 namespace br::module {
 namespace {

@@ -1,7 +1,7 @@
 // The module's class table (class_rows.cpp) as DllMain and the entry points see it.
 #pragma once
 
-#include "frame/module/class_table.h"
+#include "frame/module/ClassTable.h"
 
 namespace br::module {
 

@@ -1,9 +1,9 @@
 // The four exported entry points and DllMain of BR_Info.dll.
-#include "frame/com/module.h"
-#include "frame/com/type_library.h"
+#include "frame/com/Module.h"
+#include "frame/com/TypeLibrary.h"
 #include "frame/module/class_rows.h"
 #include "frame/module/registration.h"
-#include "tides/objects/tides_database.h"
+#include "tides/objects/TidesDatabase.h"
 #include "toolkit/core/ToolkitWindows.h"
 #include "toolkit/widgets/Tooltip.h"
 

@@ -11,7 +11,7 @@
 // CLSID itself is never touched.
 #pragma once
 
-#include "frame/module/class_entry.h"
+#include "frame/module/ClassEntry.h"
 
 #include <string>
 

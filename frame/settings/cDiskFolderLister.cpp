@@ -2,6 +2,8 @@
 
 #include <windows.h>
 
+namespace br {
+
 std::vector<FolderEntry> cDiskFolderLister::List(const std::string& folder) const {
   std::vector<FolderEntry> entries;
   const std::string pattern = JoinFolderPath(folder, "*.*");
@@ -28,3 +30,5 @@ std::vector<FolderEntry> cDiskFolderLister::List(const std::string& folder) cons
 bool cDiskFolderLister::SameName(const std::string& entryName, const std::string& wanted) const {
   return lstrcmpiA(entryName.c_str(), wanted.c_str()) == 0;
 }
+
+}  // namespace br

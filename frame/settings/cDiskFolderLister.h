@@ -1,7 +1,9 @@
 #pragma once
 // Folder listings from the file system, through the platform's directory search.
 
-#include "frame/settings/FolderTreeSearch.h"
+#include "frame/settings/folder_tree_search.h"
+
+namespace br {
 
 class cDiskFolderLister : public cFolderLister {
 public:
@@ -11,3 +13,5 @@ public:
   // The platform's case-blind comparison, for letters beyond ASCII too.
   bool SameName(const std::string& entryName, const std::string& wanted) const override;
 };
+
+}  // namespace br

@@ -4,21 +4,23 @@
 
 #include "frame/errors/cErr.h"
 
+namespace br {
+
 cRegKeyReader::cRegKeyReader(HKEY root, const char* path) {
   HKEY key = nullptr;
   if (RegOpenKeyExA(root, path, 0, KEY_QUERY_VALUE, &key) == ERROR_SUCCESS) {
-    m_key = key;
+    key_ = key;
   }
 }
 
 cRegKeyReader::~cRegKeyReader() {
-  if (m_key != nullptr) {
-    RegCloseKey(m_key);
+  if (key_ != nullptr) {
+    RegCloseKey(key_);
   }
 }
 
 void cRegKeyReader::RequireOpen() const {
-  if (m_key == nullptr) {
+  if (key_ == nullptr) {
     throw cErr(BR_ERR_REG_NO_KEY);
   }
 }
@@ -28,7 +30,7 @@ bool cRegKeyReader::ReadDword(const char* name, DWORD& value) const {
   DWORD type = 0;
   DWORD data = 0;
   DWORD size = sizeof data;
-  if (RegQueryValueExA(m_key, name, nullptr, &type, reinterpret_cast<BYTE*>(&data), &size) !=
+  if (RegQueryValueExA(key_, name, nullptr, &type, reinterpret_cast<BYTE*>(&data), &size) !=
           ERROR_SUCCESS ||
       type != REG_DWORD || size != sizeof data) {
     return false;
@@ -45,7 +47,7 @@ bool cRegKeyReader::ReadString(const char* name, std::string& value, DWORD maxBy
   std::vector<char> buffer(maxBytes + 1, '\0');  // one spare for a value stored unterminated
   DWORD type = 0;
   DWORD size = maxBytes;
-  if (RegQueryValueExA(m_key, name, nullptr, &type, reinterpret_cast<BYTE*>(buffer.data()),
+  if (RegQueryValueExA(key_, name, nullptr, &type, reinterpret_cast<BYTE*>(buffer.data()),
                        &size) != ERROR_SUCCESS ||
       type != REG_SZ) {
     return false;
@@ -53,3 +55,5 @@ bool cRegKeyReader::ReadString(const char* name, std::string& value, DWORD maxBy
   value.assign(buffer.data());  // up to the first terminator
   return true;
 }
+
+}  // namespace br

@@ -6,6 +6,8 @@
 
 #include <string>
 
+namespace br {
+
 class cRegKeyReader {
 public:
   cRegKeyReader(HKEY root, const char* path);
@@ -13,7 +15,7 @@ public:
   cRegKeyReader(const cRegKeyReader&) = delete;
   cRegKeyReader& operator=(const cRegKeyReader&) = delete;
 
-  bool IsOpen() const { return m_key != nullptr; }
+  bool IsOpen() const { return key_ != nullptr; }
 
   // False for a missing value or one of another type. Both throw
   // cErr(BR_ERR_REG_NO_KEY) when no key is open.
@@ -24,5 +26,7 @@ public:
 private:
   void RequireOpen() const;
 
-  HKEY m_key = nullptr;
+  HKEY key_ = nullptr;
 };
+
+}  // namespace br

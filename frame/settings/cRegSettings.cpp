@@ -2,28 +2,30 @@
 
 #include <vector>
 
+namespace br {
+
 namespace {
 
 // Closes the key on every way out.
 class OpenKey {
 public:
   OpenKey(HKEY root, const std::string& path, REGSAM access) {
-    if (RegOpenKeyExA(root, path.c_str(), 0, access, &m_key) != ERROR_SUCCESS) {
-      m_key = nullptr;
+    if (RegOpenKeyExA(root, path.c_str(), 0, access, &key_) != ERROR_SUCCESS) {
+      key_ = nullptr;
     }
   }
-  explicit OpenKey(HKEY key) : m_key(key) {}
+  explicit OpenKey(HKEY key) : key_(key) {}
   ~OpenKey() {
-    if (m_key != nullptr) {
-      RegCloseKey(m_key);
+    if (key_ != nullptr) {
+      RegCloseKey(key_);
     }
   }
   OpenKey(const OpenKey&) = delete;
   OpenKey& operator=(const OpenKey&) = delete;
-  HKEY get() const { return m_key; }
+  HKEY get() const { return key_; }
 
 private:
-  HKEY m_key = nullptr;
+  HKEY key_ = nullptr;
 };
 
 // Another writer may grow the value between asking its size and reading it.
@@ -41,7 +43,7 @@ std::string cRegSettings::FullPath(const char* subkey) {
 }
 
 DWORD cRegSettings::ReadDword(const char* subkey, const char* name, DWORD defaultValue) const {
-  OpenKey key(m_root, FullPath(subkey), KEY_QUERY_VALUE);
+  OpenKey key(root_, FullPath(subkey), KEY_QUERY_VALUE);
   if (key.get() == nullptr) {
     return defaultValue;
   }
@@ -58,7 +60,7 @@ DWORD cRegSettings::ReadDword(const char* subkey, const char* name, DWORD defaul
 
 std::string cRegSettings::ReadString(const char* subkey, const char* name,
                                      const std::string& defaultText) const {
-  OpenKey key(m_root, FullPath(subkey), KEY_QUERY_VALUE);
+  OpenKey key(root_, FullPath(subkey), KEY_QUERY_VALUE);
   if (key.get() == nullptr) {
     return defaultText;
   }
@@ -87,7 +89,7 @@ std::string cRegSettings::ReadString(const char* subkey, const char* name,
 
 bool cRegSettings::WriteDword(const char* subkey, const char* name, DWORD value) const {
   HKEY created = nullptr;
-  if (RegCreateKeyExA(m_root, FullPath(subkey).c_str(), 0, nullptr, REG_OPTION_NON_VOLATILE,
+  if (RegCreateKeyExA(root_, FullPath(subkey).c_str(), 0, nullptr, REG_OPTION_NON_VOLATILE,
                       KEY_SET_VALUE, nullptr, &created, nullptr) != ERROR_SUCCESS) {
     return false;
   }
@@ -95,3 +97,5 @@ bool cRegSettings::WriteDword(const char* subkey, const char* name, DWORD value)
   return RegSetValueExA(key.get(), name, 0, REG_DWORD, reinterpret_cast<const BYTE*>(&value),
                         sizeof value) == ERROR_SUCCESS;
 }
+
+}  // namespace br

@@ -7,16 +7,18 @@
 
 #include <string>
 
+namespace br {
+
 class cRegSettings {
 public:
   static constexpr const char* BASE_PATH = "SOFTWARE\\Brine";
 
   // HKEY_LOCAL_MACHINE or HKEY_CURRENT_USER.
-  explicit cRegSettings(HKEY root) : m_root(root) {}
+  explicit cRegSettings(HKEY root) : root_(root) {}
   static cRegSettings Machine() { return cRegSettings(HKEY_LOCAL_MACHINE); }
   static cRegSettings User() { return cRegSettings(HKEY_CURRENT_USER); }
 
-  HKEY Root() const { return m_root; }
+  HKEY Root() const { return root_; }
 
   // subkey is relative to the base path; null or empty names the base key.
   DWORD ReadDword(const char* subkey, const char* name, DWORD defaultValue) const;
@@ -30,5 +32,7 @@ public:
   static std::string FullPath(const char* subkey);
 
 private:
-  HKEY m_root;
+  HKEY root_;
 };
+
+}  // namespace br

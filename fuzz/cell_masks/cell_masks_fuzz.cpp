@@ -11,7 +11,7 @@
 #include <string>
 
 #include "fuzz/common/fuzz_check.h"
-#include "toolkit/table/logic/CellMask.h"
+#include "toolkit/table/logic/cell_mask.h"
 
 using namespace toolkit::table;
 

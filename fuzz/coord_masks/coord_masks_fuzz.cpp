@@ -16,10 +16,12 @@
 #include <string>
 #include <string_view>
 
-#include "frame/format/CoordFormat.h"
+#include "frame/format/coord_format.h"
 #include "fuzz/common/fuzz_check.h"
 #include "toolkit/widgets/edit/CoordText.h"
 #include "toolkit/widgets/edit/MonthPicture.h"
+
+using namespace br;
 
 namespace {
 
@@ -76,7 +78,7 @@ void CheckDate(const toolkit::CivilDate& d) {
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
-  br::fuzz::InputReader in(data, size);
+  fuzz::InputReader in(data, size);
   const std::uint8_t kindByte = in.U8();
   const std::uint8_t options = in.U8();
   const std::uint64_t bits = in.U64();

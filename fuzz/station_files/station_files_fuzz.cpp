@@ -22,7 +22,7 @@
 #include "tides/engine/prediction.h"
 #include "tides/engine/station_files.h"
 #include "tides/engine/sun_events.h"
-#include "tides/engine/tide_engine.h"
+#include "tides/engine/TideEngine.h"
 
 using namespace br::tides;
 

@@ -12,7 +12,7 @@
 
 #include "fuzz/common/fuzz_check.h"
 #include "tides/engine/station_files.h"
-#include "tools/tidefiles/diagnostics.h"
+#include "tools/tidefiles/Diagnostics.h"
 #include "tools/tidefiles/folder_builder.h"
 #include "tools/tidefiles/folder_check.h"
 #include "tools/tidefiles/folder_dump.h"

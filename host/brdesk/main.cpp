@@ -1,6 +1,6 @@
 // brdesk: the tide desk. Interactive by default; with --screenshot it lays out,
 // selects the row, writes the whole window to a PNG file and exits.
-#include "host/brdesk/desk_window.h"
+#include "host/brdesk/DeskWindow.h"
 
 #include <shellapi.h>
 

@@ -1,7 +1,7 @@
 #include "host/brtide/brtide_app.h"
 
-#include "host/brtide/day_extension.h"
-#include "host/brtide/tide_service.h"
+#include "host/brtide/DayExtension.h"
+#include "host/brtide/TideService.h"
 #include "host/brtide/usage.h"
 
 namespace br::brtide {

@@ -1,4 +1,4 @@
-#include "host/brtide/day_extension.h"
+#include "host/brtide/DayExtension.h"
 
 #include "host/brtide/day_picture.h"
 

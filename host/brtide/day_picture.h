@@ -3,7 +3,7 @@
 // a bitmap) and written as a PNG picture.
 #pragma once
 
-#include "host/brtide/day_extension.h"
+#include "host/brtide/DayExtension.h"
 
 namespace br::brtide {
 

@@ -1,6 +1,6 @@
 #include "host/brtide/position_text.h"
 
-#include "frame/format/CoordFormat.h"
+#include "frame/format/coord_format.h"
 
 namespace br::brtide {
 

@@ -7,7 +7,7 @@
 #include <string>
 #include <vector>
 
-#include "host/brtide/argument_parser.h"
+#include "host/brtide/ArgumentParser.h"
 #include "host/brtide/station_positions.h"
 #include "tides/engine/calendar.h"
 

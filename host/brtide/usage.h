@@ -4,7 +4,7 @@
 #include <ostream>
 #include <vector>
 
-#include "host/brtide/argument_parser.h"
+#include "host/brtide/ArgumentParser.h"
 
 namespace br::brtide {
 

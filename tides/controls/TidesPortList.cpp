@@ -1,7 +1,7 @@
 #include "tides/controls/TidesPortList.h"
 
 #include "frame/com/bstr_text.h"
-#include "frame/control/owner_hold.h"
+#include "frame/control/OwnerHold.h"
 #include "toolkit/core/Palette.h"
 #include "toolkit/core/ToolkitWindows.h"
 

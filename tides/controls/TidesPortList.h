@@ -3,7 +3,7 @@
 // by name, and fires SelectChanged with the port of the row the user picks.
 #pragma once
 
-#include "frame/control/control_object.h"
+#include "frame/control/ControlObject.h"
 #include "tides/controls/TidesPortListPanel.h"
 
 #include "BR_Info.h"

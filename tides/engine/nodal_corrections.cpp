@@ -2,7 +2,7 @@
 
 #include <cmath>
 
-#include "tides/engine/tide_engine.h"
+#include "tides/engine/TideEngine.h"
 
 namespace br::tides {
 

@@ -12,7 +12,7 @@
 #include "tides/engine/calendar.h"
 #include "tides/engine/station_files.h"
 #include "tides/engine/sun_events.h"
-#include "tides/engine/tide_engine.h"
+#include "tides/engine/TideEngine.h"
 
 namespace br::tides {
 

@@ -7,7 +7,7 @@
 #include <memory>
 #include <vector>
 
-#include "tides/engine/tide_engine.h"
+#include "tides/engine/TideEngine.h"
 
 namespace br::tides {
 

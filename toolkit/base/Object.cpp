@@ -1,6 +1,6 @@
 #include "toolkit/base/Object.h"
 
-#include "toolkit/base/ClassRecords.h"
+#include "toolkit/base/class_records.h"
 
 namespace toolkit {
 

@@ -5,7 +5,7 @@
 #include <algorithm>
 #include <cstring>
 
-#include "toolkit/base/ClassRecords.h"
+#include "toolkit/base/class_records.h"
 #include "toolkit/core/ContainerItems.h"
 #include "toolkit/core/Palette.h"
 #include "toolkit/layout/LayoutEngine.h"

@@ -1,6 +1,6 @@
 #include "toolkit/core/ContainerItems.h"
 
-#include "toolkit/base/ClassRecords.h"
+#include "toolkit/base/class_records.h"
 #include "toolkit/core/Container.h"
 
 namespace toolkit {

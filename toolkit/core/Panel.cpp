@@ -1,6 +1,6 @@
 #include "toolkit/core/Panel.h"
 
-#include "toolkit/base/ClassRecords.h"
+#include "toolkit/base/class_records.h"
 #include "toolkit/layout/BorderLayout.h"
 
 namespace toolkit {

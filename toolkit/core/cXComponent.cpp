@@ -2,10 +2,10 @@
 
 #include <cstring>
 
-#include "toolkit/base/ClassRecords.h"
+#include "toolkit/base/class_records.h"
 #include "toolkit/core/Container.h"
 #include "toolkit/core/Palette.h"
-#include "toolkit/core/ToolkitError.h"
+#include "toolkit/core/toolkit_error.h"
 #include "toolkit/core/ToolkitWindows.h"
 #include "toolkit/widgets/Tooltip.h"
 

@@ -1,6 +1,6 @@
 #include "toolkit/layout/BorderLayout.h"
 
-#include "toolkit/base/ClassRecords.h"
+#include "toolkit/base/class_records.h"
 
 namespace toolkit {
 

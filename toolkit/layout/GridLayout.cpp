@@ -2,7 +2,7 @@
 
 #include <cstdlib>
 
-#include "toolkit/base/ClassRecords.h"
+#include "toolkit/base/class_records.h"
 
 namespace toolkit {
 

@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <cstdint>
 
-#include "toolkit/base/ClassRecords.h"
+#include "toolkit/base/class_records.h"
 #include "toolkit/layout/BorderLayout.h"
 #include "toolkit/layout/GridLayout.h"
 #include "toolkit/layout/TabLayout.h"

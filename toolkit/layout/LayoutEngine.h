@@ -8,7 +8,7 @@
 
 #include <vector>
 
-#include "toolkit/base/Geometry.h"
+#include "toolkit/base/geometry.h"
 #include "toolkit/layout/Layout.h"
 #include "toolkit/layout/LayoutItems.h"
 

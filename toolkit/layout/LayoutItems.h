@@ -5,7 +5,7 @@
 
 #include <string>
 
-#include "toolkit/base/Geometry.h"
+#include "toolkit/base/geometry.h"
 
 namespace toolkit {
 

@@ -4,10 +4,10 @@
 
 #include <algorithm>
 
-#include "frame/format/CoordFormat.h"
-#include "toolkit/base/ClassRecords.h"
-#include "toolkit/table/logic/CellKinds.h"
-#include "toolkit/table/logic/CellMask.h"
+#include "frame/format/coord_format.h"
+#include "toolkit/base/class_records.h"
+#include "toolkit/table/logic/cell_kinds.h"
+#include "toolkit/table/logic/cell_mask.h"
 #include "toolkit/widgets/cXEdit2.h"
 #include "toolkit/widgets/support/MeasuringDC.h"
 
@@ -265,10 +265,10 @@ std::string Table::getCellText(int row, int column) const {
     case kCellDouble:
       return formatDoubleCell(mask, cells->number(kValue, row));
     case kCellLatitude:
-      return FormatCoord(mask.empty() ? COORD_MASK_LAT_MINUTES : mask.c_str(), COORD_LATITUDE,
+      return br::FormatCoord(mask.empty() ? br::COORD_MASK_LAT_MINUTES : mask.c_str(), br::COORD_LATITUDE,
                          cells->number(kValue, row));
     case kCellLongitude:
-      return FormatCoord(mask.empty() ? COORD_MASK_LON_MINUTES : mask.c_str(), COORD_LONGITUDE,
+      return FormatCoord(mask.empty() ? br::COORD_MASK_LON_MINUTES : mask.c_str(), br::COORD_LONGITUDE,
                          cells->number(kValue, row));
     case kCellDateTime:
       return dateText(mask, cells->number(kValue, row));

@@ -3,7 +3,7 @@
 
 #include <algorithm>
 
-#include "toolkit/table/logic/CellKinds.h"
+#include "toolkit/table/logic/cell_kinds.h"
 #include "toolkit/widgets/cXEdit2.h"
 
 namespace toolkit {

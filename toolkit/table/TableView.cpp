@@ -4,7 +4,7 @@
 #include <algorithm>
 
 #include "toolkit/core/Palette.h"
-#include "toolkit/table/logic/CellKinds.h"
+#include "toolkit/table/logic/cell_kinds.h"
 
 namespace toolkit {
 

@@ -1,6 +1,6 @@
 #include "toolkit/widgets/AXComponent.h"
 
-#include "toolkit/base/ClassRecords.h"
+#include "toolkit/base/class_records.h"
 #include "toolkit/core/ToolkitWindows.h"
 
 namespace toolkit {

@@ -1,6 +1,6 @@
 #include "toolkit/widgets/Button.h"
 
-#include "toolkit/base/ClassRecords.h"
+#include "toolkit/base/class_records.h"
 #include "toolkit/core/Container.h"
 #include "toolkit/widgets/support/TextExtent.h"
 

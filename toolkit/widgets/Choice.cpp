@@ -2,7 +2,7 @@
 
 #include <algorithm>
 
-#include "toolkit/base/ClassRecords.h"
+#include "toolkit/base/class_records.h"
 #include "toolkit/core/ToolkitWindows.h"
 #include "toolkit/widgets/support/MeasuringDC.h"
 

@@ -1,7 +1,7 @@
 #include "toolkit/widgets/ContainedWindow.h"
 
-#include "toolkit/base/ClassRecords.h"
-#include "toolkit/core/ToolkitError.h"
+#include "toolkit/base/class_records.h"
+#include "toolkit/core/toolkit_error.h"
 #include "toolkit/core/ToolkitWindows.h"
 
 namespace toolkit {

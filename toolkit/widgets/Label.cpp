@@ -1,6 +1,6 @@
 #include "toolkit/widgets/Label.h"
 
-#include "toolkit/base/ClassRecords.h"
+#include "toolkit/base/class_records.h"
 #include "toolkit/widgets/support/MeasuringDC.h"
 #include "toolkit/widgets/support/TextExtent.h"
 

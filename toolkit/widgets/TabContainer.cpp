@@ -3,9 +3,9 @@
 #include <windows.h>
 #include <commctrl.h>
 
-#include "toolkit/base/ClassRecords.h"
+#include "toolkit/base/class_records.h"
 #include "toolkit/core/ContainerItems.h"
-#include "toolkit/core/ToolkitError.h"
+#include "toolkit/core/toolkit_error.h"
 #include "toolkit/core/ToolkitWindows.h"
 #include "toolkit/layout/LayoutEngine.h"
 #include "toolkit/layout/TabLayout.h"

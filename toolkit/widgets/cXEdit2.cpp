@@ -5,7 +5,7 @@
 #include <algorithm>
 #include <vector>
 
-#include "toolkit/base/ClassRecords.h"
+#include "toolkit/base/class_records.h"
 #include "toolkit/widgets/support/MeasuringDC.h"
 #include "toolkit/widgets/support/WindowsClipboard.h"
 

@@ -8,7 +8,7 @@
 #include <sstream>
 
 #include "tools/tidefiles/day_report.h"
-#include "tools/tidefiles/diagnostics.h"
+#include "tools/tidefiles/Diagnostics.h"
 #include "tools/tidefiles/folder_builder.h"
 #include "tools/tidefiles/folder_check.h"
 #include "tools/tidefiles/folder_dump.h"

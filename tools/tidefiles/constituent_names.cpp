@@ -4,7 +4,7 @@
 #include <string>
 #include <vector>
 
-#include "tides/engine/tide_engine.h"
+#include "tides/engine/TideEngine.h"
 
 namespace br::tidefiles {
 namespace {

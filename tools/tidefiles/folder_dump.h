@@ -3,7 +3,7 @@
 
 #include <vector>
 
-#include "tools/tidefiles/diagnostics.h"
+#include "tools/tidefiles/Diagnostics.h"
 #include "tools/tidefiles/folder_image.h"
 #include "tools/tidefiles/station_entry.h"
 

@@ -13,7 +13,7 @@
 #include <string_view>
 #include <vector>
 
-#include "tools/tidefiles/diagnostics.h"
+#include "tools/tidefiles/Diagnostics.h"
 #include "tools/tidefiles/station_entry.h"
 
 namespace br::tidefiles {

@@ -1,7 +1,7 @@
 // brtide's text: the command line, dates and positions, the day as text and as CSV.
 #include <doctest/doctest.h>
 
-#include "host/brtide/argument_parser.h"
+#include "host/brtide/ArgumentParser.h"
 #include "host/brtide/clock_text.h"
 #include "host/brtide/day_report.h"
 #include "host/brtide/position_text.h"

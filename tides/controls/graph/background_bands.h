@@ -2,7 +2,7 @@
 // bands from the day's sun events. Portable.
 #pragma once
 
-#include "tides/controls/graph/graph_geometry.h"
+#include "tides/controls/graph/GraphGeometry.h"
 
 #include <optional>
 #include <vector>

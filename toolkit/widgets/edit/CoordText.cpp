@@ -2,7 +2,7 @@
 
 #include <cmath>
 
-#include "toolkit/widgets/edit/EditTypes.h"
+#include "toolkit/widgets/edit/edit_types.h"
 
 namespace toolkit {
 

@@ -7,7 +7,7 @@
 #include <cstdio>
 #include <cstdlib>
 
-#include "frame/format/CoordFormat.h"
+#include "frame/format/coord_format.h"
 #include "toolkit/widgets/edit/CoordText.h"
 
 namespace toolkit {
@@ -59,7 +59,7 @@ bool EditModel::setEditType(int type, std::string_view mask) {
     case kEditLongitude:
       mask_ = mask.empty() ? (type == kEditLatitude ? kDefaultLatitudeMask : kDefaultLongitudeMask)
                            : std::string(mask);
-      text_ = FormatCoord(mask_.c_str(), type, 0.0);
+      text_ = br::FormatCoord(mask_.c_str(), type, 0.0);
       overwrite_ = true;
       noPaste_ = false;
       break;
@@ -116,7 +116,7 @@ bool EditModel::setValue(double value) {
     text.resize(static_cast<size_t>(needed));
     text_ = std::move(text);
   } else if (isCoordinate()) {
-    text_ = FormatCoord(mask_.c_str(), type_, clampCoordinate(type_, value));
+    text_ = br::FormatCoord(mask_.c_str(), type_, clampCoordinate(type_, value));
   } else {
     return false;
   }

@@ -13,7 +13,7 @@
 
 #include "toolkit/widgets/edit/EditClipboard.h"
 #include "toolkit/widgets/edit/EditPositions.h"
-#include "toolkit/widgets/edit/EditTypes.h"
+#include "toolkit/widgets/edit/edit_types.h"
 #include "toolkit/widgets/edit/MonthPicture.h"
 
 namespace toolkit {

@@ -3,7 +3,7 @@
 #include <algorithm>
 
 #include "toolkit/widgets/edit/CoordText.h"
-#include "toolkit/widgets/edit/EditTypes.h"
+#include "toolkit/widgets/edit/edit_types.h"
 
 namespace toolkit {
 
