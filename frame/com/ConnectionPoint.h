@@ -1,13 +1,11 @@
-// Outgoing events: one connection point per class (its default source dispinterface)
-// and the container that hands it out. Events go synchronously to every sink through
-// IDispatch::Invoke.
+// Outgoing events: the one connection point of a class (its default source
+// dispinterface). Events go synchronously to every sink through IDispatch::Invoke.
 #pragma once
 
-#include "frame/com/companions.h"
+#include "frame/com/Companion.h"
 
 #include <olectl.h>
 
-#include <memory>
 #include <vector>
 
 namespace br::com {
@@ -43,21 +41,6 @@ private:
   const IID& events_;
   std::vector<Connection> connections_;
   DWORD nextCookie_ = 1;
-};
-
-class ConnectionPointContainer final : public Companion<IConnectionPointContainer> {
-public:
-  // events null: a container without connection points.
-  ConnectionPointContainer(IUnknown& owner, const IID* events);
-
-  STDMETHODIMP EnumConnectionPoints(IEnumConnectionPoints** out) override;
-  STDMETHODIMP FindConnectionPoint(REFIID riid, IConnectionPoint** out) override;
-
-  // The class's one connection point, or null when it has no events.
-  ConnectionPoint* Point() noexcept { return point_.get(); }
-
-private:
-  std::unique_ptr<ConnectionPoint> point_;
 };
 
 }  // namespace br::com

@@ -10,8 +10,9 @@
 #pragma once
 
 #include "frame/com/ClassIdentity.h"
-#include "frame/com/companions.h"
-#include "frame/com/ConnectionPoint.h"
+#include "frame/com/ClassInfoProvider.h"
+#include "frame/com/ConnectionPointContainer.h"
+#include "frame/com/ErrorInfoSupport.h"
 #include "frame/com/error_info.h"
 #include "frame/com/guard.h"
 #include "frame/com/Module.h"

@@ -2,7 +2,7 @@
 // metafile picture (CF_METAFILEPICT), drawn at the control's extent.
 #pragma once
 
-#include "frame/com/companions.h"
+#include "frame/com/Companion.h"
 
 #include <objidl.h>
 

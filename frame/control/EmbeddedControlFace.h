@@ -2,7 +2,7 @@
 // font and preferred size. The control's hooks give the answers.
 #pragma once
 
-#include "frame/com/companions.h"
+#include "frame/com/Companion.h"
 
 #include "BR_Private.h"
 

@@ -2,7 +2,7 @@
 // control is UI-active (accelerators, activation of the frame and document windows).
 #pragma once
 
-#include "frame/com/companions.h"
+#include "frame/com/Companion.h"
 
 #include <oleidl.h>
 

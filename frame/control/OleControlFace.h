@@ -2,7 +2,7 @@
 // come (the controls read no ambient properties); event freezing is counted.
 #pragma once
 
-#include "frame/com/companions.h"
+#include "frame/com/Companion.h"
 
 #include <ocidl.h>
 

@@ -2,7 +2,7 @@
 // sinks and the registry-backed descriptions of the class.
 #pragma once
 
-#include "frame/com/companions.h"
+#include "frame/com/Companion.h"
 
 #include <oleidl.h>
 

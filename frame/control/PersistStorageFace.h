@@ -2,7 +2,7 @@
 // named "Contents" of the container's storage.
 #pragma once
 
-#include "frame/com/companions.h"
+#include "frame/com/Companion.h"
 
 #include <objidl.h>
 

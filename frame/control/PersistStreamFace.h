@@ -3,7 +3,7 @@
 // something to save and load.
 #pragma once
 
-#include "frame/com/companions.h"
+#include "frame/com/Companion.h"
 
 #include <ocidl.h>
 

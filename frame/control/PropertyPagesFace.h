@@ -1,7 +1,7 @@
 // ISpecifyPropertyPages of a control: the controls have no property pages.
 #pragma once
 
-#include "frame/com/companions.h"
+#include "frame/com/Companion.h"
 
 #include <ocidl.h>
 

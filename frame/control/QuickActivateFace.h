@@ -2,7 +2,7 @@
 // in one call and learns the control's status flags.
 #pragma once
 
-#include "frame/com/companions.h"
+#include "frame/com/Companion.h"
 
 #include <ocidl.h>
 

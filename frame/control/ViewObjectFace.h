@@ -3,7 +3,7 @@
 // advise sink.
 #pragma once
 
-#include "frame/com/companions.h"
+#include "frame/com/Companion.h"
 
 #include <ocidl.h>
 

@@ -1,7 +1,7 @@
 // IUnitsOption of TidesWindow: height labels in feet.
 #pragma once
 
-#include "frame/com/companions.h"
+#include "frame/com/Companion.h"
 
 #include "BR_Private.h"
 

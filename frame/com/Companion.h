@@ -3,8 +3,6 @@
 // owner's reference count and interface table govern them.
 #pragma once
 
-#include "frame/com/ClassIdentity.h"
-
 #include <ocidl.h>
 
 namespace br::com {
@@ -26,29 +24,6 @@ protected:
 
 private:
   IUnknown& owner_;
-};
-
-// IProvideClassInfo2: the class's coclass type info and its default source interface.
-class ClassInfoProvider final : public Companion<IProvideClassInfo2> {
-public:
-  ClassInfoProvider(IUnknown& owner, const ClassIdentity& cls) noexcept : Companion(owner), class_(cls) {}
-
-  STDMETHODIMP GetClassInfo(ITypeInfo** out) override;
-  STDMETHODIMP GetGUID(DWORD kind, GUID* out) override;
-
-private:
-  const ClassIdentity& class_;
-};
-
-// ISupportErrorInfo: the class's dual interface leaves error information on failure.
-class ErrorInfoSupport final : public Companion<ISupportErrorInfo> {
-public:
-  ErrorInfoSupport(IUnknown& owner, const ClassIdentity& cls) noexcept : Companion(owner), class_(cls) {}
-
-  STDMETHODIMP InterfaceSupportsErrorInfo(REFIID riid) override;
-
-private:
-  const ClassIdentity& class_;
 };
 
 }  // namespace br::com

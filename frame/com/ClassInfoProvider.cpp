@@ -1,4 +1,4 @@
-#include "frame/com/companions.h"
+#include "frame/com/ClassInfoProvider.h"
 
 #include "frame/com/TypeLibrary.h"
 
@@ -17,10 +17,6 @@ STDMETHODIMP ClassInfoProvider::GetGUID(DWORD kind, GUID* out) {
   }
   *out = class_.events ? *class_.events : GUID_NULL;
   return S_OK;
-}
-
-STDMETHODIMP ErrorInfoSupport::InterfaceSupportsErrorInfo(REFIID riid) {
-  return class_.dual && IsEqualIID(riid, *class_.dual) ? S_OK : S_FALSE;
 }
 
 }  // namespace br::com
