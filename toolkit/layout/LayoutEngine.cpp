@@ -77,82 +77,81 @@ void LayoutEngine::placeChild(int index, int x, int y, int width, int height) {
 Size LayoutEngine::preferredSize(bool initializeSplit) {
   const Measure all = measure();
   if (all.count == 0) return {};
-  const int hgap = layout_.hgap, vgap = layout_.vgap;
-
   switch (kind()) {
-    case kFlow:
-      return {all.count * (hgap + all.maxWidth), all.maxHeight};
-
-    case kBorder: {
-      const Measure west = measure("West"), east = measure("East");
-      const Measure north = measure("North"), south = measure("South");
-      Size w{west.maxWidth, west.sumHeight + west.count * vgap};
-      Size e{east.maxWidth, east.sumHeight + east.count * vgap};
-      Size n{north.sumWidth + north.count * hgap, north.maxHeight};
-      Size s{south.sumWidth + south.count * hgap, south.maxHeight};
-      Size c;
-      std::vector<int> center = presentChildren("Center");
-      if (!center.empty()) c = items_.preferredSize(center.back());
-      // The gaps count whether or not the regions are occupied.
-      return {std::max({n.width, s.width, w.width + c.width + 2 * hgap + e.width}),
-              n.height + s.height + 2 * vgap + std::max({w.height, e.height, c.height})};
-    }
-
-    case kGrid: {
-      const std::vector<int> kids = presentChildren();
-      const int rows = atLeastOne(layout_.rows), columns = atLeastOne(layout_.columns);
-      const size_t n = kids.size();
-      int width = 0, height = 0;
-      size_t next = 0;
-      for (int row = 0; row < rows && next < n; ++row) {
-        const size_t rowStart = next;
-        const size_t rowEnd = std::min(n, rowStart + static_cast<size_t>(columns));
-        int rowHeight = all.maxHeight;
-        if (layout_.mode != kAlignCenter) {
-          rowHeight = 0;
-          for (size_t k = rowStart; k < rowEnd; ++k)
-            rowHeight = std::max(rowHeight, items_.preferredSize(kids[k]).height);
-        }
-        width = std::max(width, static_cast<int>(rowEnd - rowStart) * (hgap + all.maxWidth));
-        height += rowHeight;
-        next = rowEnd;
-      }
-      return {width, height};
-    }
-
-    case kTab: {
-      const auto& tabs = static_cast<const TabLayout&>(layout_);
-      if (tabs.selectedIndex == -1) return {};
-      if (tabs.preferredOfAll) return {all.maxWidth, all.maxHeight};
-      if (tabs.selectedIndex < 0 || tabs.selectedIndex >= items_.count() ||
-          !items_.isPresent(tabs.selectedIndex))
-        return {};
-      return items_.preferredSize(tabs.selectedIndex);
-    }
-
-    case kSplitter: {
-      std::vector<int> panes = presentChildren();
-      if (panes.size() > 3) panes.resize(3);
-      const bool stacked = layout_.mode == kSplitStacked;
-      int along = 0, across = 0, firstAlong = 0;
-      for (size_t k = 0; k < panes.size(); ++k) {
-        Size pref = items_.preferredSize(panes[k]);
-        int a = stacked ? pref.height : pref.width;
-        if (k == 0) firstAlong = a;
-        along += a;
-        across = std::max(across, stacked ? pref.width : pref.height);
-      }
-      if (panes.size() > 1) along += hgap;
-      if (initializeSplit && panes.size() >= 2 && along != 0) {
-        layout_.splitNumerator = hgap / 2 + firstAlong;
-        layout_.splitDenominator = along;
-      }
-      return stacked ? Size{across, along} : Size{along, across};
-    }
-
-    default:
-      return {};
+    case kFlow: return {all.count * (layout_.hgap + all.maxWidth), all.maxHeight};
+    case kBorder: return preferredBorderSize();
+    case kGrid: return preferredGridSize(all);
+    case kTab: return preferredTabSize(all);
+    case kSplitter: return preferredSplitterSize(initializeSplit);
+    default: return {};
   }
+}
+
+Size LayoutEngine::preferredBorderSize() {
+  const int hgap = layout_.hgap, vgap = layout_.vgap;
+  const Measure west = measure("West"), east = measure("East");
+  const Measure north = measure("North"), south = measure("South");
+  const Size w{west.maxWidth, west.sumHeight + west.count * vgap};
+  const Size e{east.maxWidth, east.sumHeight + east.count * vgap};
+  const Size n{north.sumWidth + north.count * hgap, north.maxHeight};
+  const Size s{south.sumWidth + south.count * hgap, south.maxHeight};
+  Size c;
+  const std::vector<int> center = presentChildren("Center");
+  if (!center.empty()) c = items_.preferredSize(center.back());
+  // The gaps count whether or not the regions are occupied.
+  return {std::max({n.width, s.width, w.width + c.width + 2 * hgap + e.width}),
+          n.height + s.height + 2 * vgap + std::max({w.height, e.height, c.height})};
+}
+
+Size LayoutEngine::preferredGridSize(const Measure& all) {
+  const std::vector<int> kids = presentChildren();
+  const int rows = atLeastOne(layout_.rows), columns = atLeastOne(layout_.columns);
+  const size_t n = kids.size();
+  int width = 0, height = 0;
+  size_t next = 0;
+  for (int row = 0; row < rows && next < n; ++row) {
+    const size_t rowStart = next;
+    const size_t rowEnd = std::min(n, rowStart + static_cast<size_t>(columns));
+    int rowHeight = all.maxHeight;
+    if (layout_.mode != kAlignCenter) {
+      rowHeight = 0;
+      for (size_t k = rowStart; k < rowEnd; ++k)
+        rowHeight = std::max(rowHeight, items_.preferredSize(kids[k]).height);
+    }
+    width = std::max(width, static_cast<int>(rowEnd - rowStart) * (layout_.hgap + all.maxWidth));
+    height += rowHeight;
+    next = rowEnd;
+  }
+  return {width, height};
+}
+
+Size LayoutEngine::preferredTabSize(const Measure& all) {
+  const auto& tabs = static_cast<const TabLayout&>(layout_);
+  if (tabs.selectedIndex == -1) return {};
+  if (tabs.preferredOfAll) return {all.maxWidth, all.maxHeight};
+  if (tabs.selectedIndex < 0 || tabs.selectedIndex >= items_.count() || !items_.isPresent(tabs.selectedIndex))
+    return {};
+  return items_.preferredSize(tabs.selectedIndex);
+}
+
+Size LayoutEngine::preferredSplitterSize(bool initializeSplit) {
+  std::vector<int> panes = presentChildren();
+  if (panes.size() > 3) panes.resize(3);
+  const bool stacked = layout_.mode == kSplitStacked;
+  int along = 0, across = 0, firstAlong = 0;
+  for (size_t k = 0; k < panes.size(); ++k) {
+    const Size pref = items_.preferredSize(panes[k]);
+    const int a = stacked ? pref.height : pref.width;
+    if (k == 0) firstAlong = a;
+    along += a;
+    across = std::max(across, stacked ? pref.width : pref.height);
+  }
+  if (panes.size() > 1) along += layout_.hgap;
+  if (initializeSplit && panes.size() >= 2 && along != 0) {
+    layout_.splitNumerator = layout_.hgap / 2 + firstAlong;
+    layout_.splitDenominator = along;
+  }
+  return stacked ? Size{across, along} : Size{along, across};
 }
 
 Size LayoutEngine::preferredSizeIn(const Rect& area) {

@@ -51,6 +51,10 @@ public:
   Size layoutSplitter(const Rect& area, int orientation, bool place);
 
 private:
+  Size preferredBorderSize();
+  Size preferredGridSize(const Measure& all);
+  Size preferredTabSize(const Measure& all);
+  Size preferredSplitterSize(bool initializeSplit);
   std::vector<int> presentChildren(const char* region = nullptr) const;
   void placeChild(int index, int x, int y, int width, int height);
 
