@@ -287,12 +287,13 @@ void EditModel::moveCaret(int target, bool forward, bool extend) {
   const EditPositions places = positions();
   int position;
   if (places.restricted()) {
-    if (target < 0 || target >= length()) {
-      position = caret_;  // nothing further that way: stay
-    } else {
-      position = places.editable(target) ? target
-                 : forward ? places.nextAfter(target) : places.previousBefore(target);
-      if (position < 0) position = caret_;
+    // Nothing further that way: back to position 0 (normalize then settles on the first
+    // place when 0 itself cannot be typed over).
+    position = 0;
+    if (target >= 0 && target < length()) {
+      const int found = places.editable(target) ? target
+                        : forward ? places.nextAfter(target) : places.previousBefore(target);
+      if (found >= 0) position = found;
     }
   } else {
     position = std::clamp(target, 0, length());

@@ -6,7 +6,8 @@
 // The selection runs from the caret over `selectionLength` characters; a
 // negative length extends to the left of the caret. Coordinate and date fields
 // never have a selection, and their caret, like that of masked text, rests only
-// on places the user can type over (EditPositions).
+// on places the user can type over (EditPositions); a caret key with no such place
+// left in its direction sends it back to position 0.
 
 #include <string>
 #include <string_view>

@@ -42,3 +42,40 @@ TEST_CASE("restricted fields snap a click to the nearest place and never drag-se
   edit.placeCaret(0, true);
   CHECK(edit.selectionLength() == 0);
 }
+
+// A move with no editable place left in its direction goes back to position 0 (and, where 0
+// itself cannot be typed over, on to the first place that can).
+TEST_CASE("restricted fields: a caret move past the last place goes to position 0") {
+  FakeClipboard clip;
+  EditModel latitude;
+  REQUIRE(latitude.setEditType(kEditLatitude, ""));
+  REQUIRE(latitude.setValue(-12.5));
+  REQUIRE((latitude.pressKey(EditKey::End, false, false, clip) && latitude.caret() == 10));
+  CHECK((latitude.pressKey(EditKey::Right, false, false, clip) && latitude.caret() == 0));
+  CHECK((latitude.pressKey(EditKey::Left, false, false, clip) && latitude.caret() == 0));
+  latitude.setCaret(4, 0);
+  CHECK((latitude.pressKey(EditKey::Right, false, false, clip) && latitude.caret() == 6));  // over the '.'
+
+  EditModel month;
+  REQUIRE(month.setEditType(kEditMonth, ""));
+  REQUIRE(month.setDateText("05-2024", 45427.0));
+  month.setCaret(6, 0);
+  CHECK((month.pressKey(EditKey::Right, false, false, clip) && month.caret() == 0));
+
+  EditModel masked;
+  REQUIRE(masked.setEditType(kEditText, "(999)"));
+  masked.setCaret(3, 0);
+  CHECK((masked.pressKey(EditKey::Right, false, false, clip) && masked.caret() == 1));
+  CHECK((masked.pressKey(EditKey::Left, false, false, clip) && masked.caret() == 1));
+}
+
+// Kept on purpose: a value outside the coordinate ranges would not fit the mask's degree
+// field, and the caret places and the value read back follow the mask.
+TEST_CASE("coordinate values are held to +-90 and +-180 degrees") {
+  EditModel edit;
+  REQUIRE(edit.setEditType(kEditLatitude, ""));
+  CHECK((edit.setValue(95.0) && edit.text() == "90\xB0" "00.000'N"));
+  REQUIRE(edit.setEditType(kEditLongitude, ""));
+  CHECK((edit.setValue(-1000.0) && edit.text() == "180\xB0" "00.000'W"));
+  CHECK(edit.getValue() == doctest::Approx(-180.0));
+}
