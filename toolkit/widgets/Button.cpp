@@ -86,7 +86,7 @@ void Button::setText(std::string_view text) {
 }
 
 int Button::onMouseDown(ToolkitEvent& event, int, int) {
-  if (event.source != this || event.params[2] != 0) return 0;  // left button on itself only
+  if (event.source != this) return 0;  // either mouse button
   if (isDisabledLook()) return 1;
   if (kind == kToggle || kind == kRadio) {
     // A radio-like button is released only by its siblings.
