@@ -50,20 +50,10 @@ void Label::paint(HDC dc) {
   RECT box = client;
   box.left += 2;
   box.right -= 2;
-  const int length = static_cast<int>(text_.size());
+  // Not single-line, so DT_VCENTER leaves the text at the top; it breaks only at its own
+  // line breaks and is cut at the edges ('&' marks a prefix, as in any DrawText).
   const UINT align = static_cast<UINT>(alignment_) & (DT_CENTER | DT_RIGHT);
-  RECT needed = box;
-  DrawTextA(dc, text_.c_str(), length, &needed, align | DT_WORDBREAK | DT_CALCRECT | DT_NOPREFIX);
-  RECT oneLine{0, 0, 0, 0};
-  DrawTextA(dc, "A", 1, &oneLine, DT_CALCRECT | DT_SINGLELINE);
-  const int textHeight = needed.bottom - needed.top;
-  if (textHeight <= oneLine.bottom - oneLine.top) {
-    DrawTextA(dc, text_.c_str(), length, &box, align | DT_VCENTER | DT_SINGLELINE | DT_NOPREFIX);
-  } else {
-    // Several lines: centred as a block, since DT_VCENTER serves single lines only.
-    if (textHeight < box.bottom - box.top) box.top += (box.bottom - box.top - textHeight) / 2;
-    DrawTextA(dc, text_.c_str(), length, &box, align | DT_WORDBREAK | DT_NOPREFIX);
-  }
+  DrawTextA(dc, text_.c_str(), static_cast<int>(text_.size()), &box, align | DT_VCENTER);
   SetTextColor(dc, oldColour);
   SetBkMode(dc, oldMode);
   SelectObject(dc, oldFont);
