@@ -69,6 +69,7 @@ void Table::resetColumns() {
   columns_.clear();
   displayOrder_.clear();
   hiddenColumns_.clear();
+  editLimits_.clear();
   ownerColumns_ = 0;
   const int row = columns_.appendRowText("Untitled");
   columns_.setText(kColumnAlias, row, "List box implementation");
@@ -91,6 +92,7 @@ int Table::addColumn(const char* name, const char* alias, int kind, int align, c
     columns_.clear();
     displayOrder_.clear();
     hiddenColumns_.clear();
+    editLimits_.clear();
     sortColumn_ = -1;
     order_.clear();
   }
@@ -140,6 +142,16 @@ void Table::setColumnWidth(int column, int width) {
 
 void Table::setColumnMask(int column, const char* mask) {
   if (columns_.setText(kColumnMask, column, mask ? mask : "")) invalidate();
+}
+
+void Table::setColumnMaxLength(int column, int length) {
+  if (column < 0 || column >= columns_.rowCount() || length < 0) return;
+  if (editLimits_.size() <= static_cast<size_t>(column)) editLimits_.resize(static_cast<size_t>(column) + 1, 0);
+  editLimits_[static_cast<size_t>(column)] = length;
+}
+
+int Table::getColumnMaxLength(int column) const {
+  return column >= 0 && static_cast<size_t>(column) < editLimits_.size() ? editLimits_[static_cast<size_t>(column)] : 0;
 }
 
 void Table::setMinimumColumnWidth(int pixels) { minimumWidth_ = pixels <= 0 ? 50 : pixels; }

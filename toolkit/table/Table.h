@@ -96,6 +96,10 @@ public:
   int getColumnWidth(int column) const;
   void setColumnWidth(int column, int width);
   void setColumnMask(int column, const char* mask);
+  // Longest text an in-place edit of the column may hold; 0 (the default) leaves the
+  // kind's own: 10 characters for doubles, none for the others.
+  void setColumnMaxLength(int column, int length);
+  int getColumnMaxLength(int column) const;
   void autoSizeColumn(int column, int rows);
   void setMinimumColumnWidth(int pixels);
   int getMinimumColumnWidth() const { return minimumWidth_; }
@@ -159,6 +163,7 @@ public:
 
   // ---- editing
   bool beginEdit(int row, int column);
+  // With commit, the cell takes the editor's value only when its text was changed.
   void endEdit(bool commit);
   bool isEditing() const { return editing_; }
   cXEdit2* editor() const { return editor_.get(); }
@@ -227,10 +232,12 @@ private:
   int pressedHeader_ = -1;
   mutable int rowHeight_ = 0;     // cached; 0 = measure again
   bool scrollBarsStale_ = false;  // rows were added since the scroll bars were set
+  std::vector<int> editLimits_;  // per column, 0 = the kind's; shorter than the columns = 0
   std::unique_ptr<cXEdit2> editor_;
   bool editing_ = false;
   int editRow_ = -1;
   int editColumn_ = -1;
+  std::string editStartText_;  // the editor's text when the edit began
 };
 
 }  // namespace toolkit

@@ -220,17 +220,17 @@ int Table::onKeyDown(ToolkitEvent& event, int key) {
   const bool fromEditor = editor_ && event.source == editor_.get();
   if (event.source != this && !fromEditor) return 0;
   if (editing_) {
+    // Only Esc stays here; the keys that end an edit with commit go on to the parents.
     switch (key) {
-      case VK_RETURN:
-        endEdit(true);
-        requestFocus();
-        event.handled = true;
-        return 1;
       case VK_ESCAPE:
         endEdit(false);
         requestFocus();
         event.handled = true;
         return 1;
+      case VK_RETURN:
+        endEdit(true);
+        requestFocus();
+        return 0;
       case VK_PRIOR:
       case VK_NEXT:
       case VK_UP:
@@ -243,8 +243,7 @@ int Table::onKeyDown(ToolkitEvent& event, int key) {
           if (index >= 0 && index < displayRowCount()) row = nthShownRow(index);
         }
         moveCurrent(row, currentColumn_, false, kByKeys, true);
-        event.handled = true;
-        return 1;
+        return 0;
       }
       default:
         return 0;  // the editor's own keys
@@ -378,6 +377,13 @@ bool Table::beginEdit(int row, int column) {
   scrollIntoView(row);
   const std::string mask = columns_.text(kColumnMask, column);
   DataTable* cells = cellsOf(column);
+  // The editor is shared by every column: each edit sets its own limit, while the editor
+  // is plain text (the other types and masks ignore a new limit) and before any value
+  // is set (a limit cuts the text it finds).
+  int limit = getColumnMaxLength(column);
+  if (limit == 0 && kind == kCellDouble) limit = kDoubleMaxChars;
+  editor_->setText("");
+  editor_->setMaxLength(limit);
   switch (kind) {
     case kCellLong:
       editor_->setEditType(2);
@@ -385,7 +391,6 @@ bool Table::beginEdit(int row, int column) {
       break;
     case kCellDouble:
       editor_->setEditType(3);
-      editor_->setMaxLength(kDoubleMaxChars);
       editor_->setValue(cells->number(0, row));
       break;
     case kCellLatitude:
@@ -399,6 +404,7 @@ bool Table::beginEdit(int row, int column) {
       break;
   }
   editor_->setOverwrite(true);
+  editStartText_ = editor_->getText();
   const RECT rect = getCellRect(column, row);
   editRow_ = row;
   editColumn_ = column;
@@ -412,6 +418,9 @@ bool Table::beginEdit(int row, int column) {
 void Table::storeEditedValue() {
   DataTable* cells = cellsOf(editColumn_);
   if (!cells || editRow_ < 0 || editRow_ >= rowCount_) return;
+  // An untouched text would only store the value as shown: a double rounded to four
+  // places, a coordinate to its mask.
+  if (editor_->getText() == editStartText_) return;
   switch (getColumnKind(editColumn_)) {
     case kCellLong: cells->setInteger(0, editRow_, editor_->getNumber()); break;
     case kCellDouble:

@@ -38,6 +38,21 @@ struct Mounted : wtest::MountedPanel {
     const int h = table.getRowHeight();
     wtest::press(table.getHandle(), WM_LBUTTONDOWN, 20, h * (displayRow + 1) + h / 2, MK_LBUTTON | keys);
   }
+  // Whether a key-down of `key` bubbled up to the panel.
+  bool reached(int key) const {
+    for (const wtest::Seen& s : seen)
+      if (s.id == toolkit::kEventKeyDown && s.params[0] == key) return true;
+    return false;
+  }
+  // Key-driven selection notifications the panel heard.
+  int selections() const {
+    int n = 0;
+    for (const wtest::Seen& s : seen)
+      n += s.id == toolkit::kEventAction && s.params[3] == Table::kNotifySelect && s.params[4] == Table::kByKeys;
+    return n;
+  }
+  // Ends the edit in progress with `key`, sent to the editor as the user would.
+  void press(int key) { wtest::key(table.editor()->getHandle(), key); }
 };
 
 }  // namespace
@@ -118,4 +133,90 @@ TEST_CASE("hidden rows and multiple selection need their style bits") {
   m.table.addTableStyle(Table::kStyleHidden);
   m.table.setRowVisible(1, false);
   CHECK_FALSE(m.table.isRowVisible(1));
+}
+
+TEST_CASE("each edit sets its own length limit: a number edit's 10 characters never cut a later text") {
+  Mounted m(true);
+  const int depth = m.table.addColumn("depth", "Depth", 3, 2, nullptr, true);
+  m.table.setCellText(0, 1, "Anvers (Antwerpen)");
+  REQUIRE(m.table.beginEdit(0, depth));
+  toolkit::cXEdit2* editor = m.table.editor();
+  CHECK(editor->getMaxLength() == 10);
+  m.press(VK_ESCAPE);
+
+  REQUIRE(m.table.beginEdit(1, 0));
+  CHECK(editor->getMaxLength() == 0);
+  CHECK(editor->getText() == "Anvers (Antwerpen)");
+  m.press(VK_END);
+  wtest::typeChar(editor->getHandle(), '!');
+  m.press(VK_RETURN);
+  CHECK(m.table.getCellText(1, 0) == "Anvers (Antwerpen)!");
+
+  // A column's own limit replaces the kind's.
+  m.table.setColumnMaxLength(0, 6);
+  m.table.setColumnMaxLength(depth, 12);
+  CHECK(m.table.getColumnMaxLength(0) == 6);
+  REQUIRE(m.table.beginEdit(2, 0));
+  CHECK(editor->getMaxLength() == 6);
+  m.press(VK_ESCAPE);
+  REQUIRE(m.table.beginEdit(2, depth));
+  CHECK(editor->getMaxLength() == 12);
+  m.press(VK_ESCAPE);
+  m.table.setColumnMaxLength(depth, 0);  // back to the kind's
+  REQUIRE(m.table.beginEdit(2, depth));
+  CHECK(editor->getMaxLength() == 10);
+  m.press(VK_ESCAPE);
+}
+
+TEST_CASE("an edit left unchanged stores nothing: numbers keep their decimals, coordinates their values") {
+  Mounted m(true);
+  const int depth = m.table.addColumn("depth", "Depth", 3, 2, nullptr, true);
+  const int latitude = m.table.addColumn("lat", "Latitude", 6, 0, nullptr, true);
+  m.table.setCellDouble(depth, 0, 3.14159);
+  m.table.setCellDouble(latitude, 0, 47.1234567);
+  m.table.setCellDouble(latitude, 1, 95.0);  // beyond the pole: the editor shows 90
+  const struct {
+    int row, column;
+    double value;
+  } cells[] = {{0, depth, 3.14159}, {0, latitude, 47.1234567}, {1, latitude, 95.0}};
+  for (const auto& cell : cells) {
+    INFO("column ", cell.column, " row ", cell.row);
+    REQUIRE(m.table.beginEdit(cell.row, cell.column));
+    m.press(VK_RETURN);
+    CHECK_FALSE(m.table.isEditing());
+    CHECK(m.table.getCellDouble(cell.column, cell.row) == cell.value);
+  }
+  // A changed text is stored as read.
+  REQUIRE(m.table.beginEdit(0, depth));
+  CHECK(m.table.editor()->getText() == "3.1416");
+  wtest::typeChar(m.table.editor()->getHandle(), '4');
+  m.press(VK_RETURN);
+  CHECK(m.table.getCellDouble(depth, 0) == doctest::Approx(4.1416));
+}
+
+TEST_CASE("while editing only Esc stays with the table; Enter, Page Up/Down and Up/Down end the edit and go on up") {
+  Mounted m(true);
+  m.click(1);  // Brest (stored row 2): shown second, now being edited
+  REQUIRE(m.table.isEditing());
+  m.seen.clear();
+  m.press(VK_ESCAPE);
+  CHECK_FALSE(m.table.isEditing());
+  CHECK_FALSE(m.reached(VK_ESCAPE));
+  CHECK(GetFocus() == m.table.getHandle());
+
+  // key, stored row current afterwards, key-driven notifications to the owner
+  const struct {
+    int key, row, notified;
+  } steps[] = {{VK_RETURN, 2, 0}, {VK_PRIOR, 2, 1}, {VK_NEXT, 2, 1}, {VK_UP, 1, 1}, {VK_DOWN, 2, 1}};
+  for (const auto& step : steps) {
+    INFO("key ", step.key);
+    REQUIRE(m.table.beginEdit(m.table.getCurrentRow(), 0));
+    m.seen.clear();
+    m.press(step.key);
+    CHECK_FALSE(m.table.isEditing());
+    CHECK(m.reached(step.key));
+    CHECK(m.table.getCurrentRow() == step.row);
+    CHECK(m.selections() == step.notified);
+    CHECK(GetFocus() == m.table.getHandle());
+  }
 }
