@@ -77,6 +77,41 @@ std::vector<std::string> SlotNames(ITypeInfo* info) {
   return slots;
 }
 
+// Answers HOCode2Name through the type library's own Invoke, as every class of the DLL
+// does, and keeps what the call handed it; the other members are not called.
+class InspectorProbe : public IXObjectInspector {
+public:
+  int calls = 0;
+  long code = 0;
+  bool abbreviationPointer = false;
+
+  STDMETHODIMP QueryInterface(REFIID, void** out) override {
+    *out = nullptr;
+    return E_NOINTERFACE;
+  }
+  STDMETHODIMP_(ULONG) AddRef() override { return 1; }
+  STDMETHODIMP_(ULONG) Release() override { return 1; }
+  STDMETHODIMP GetTypeInfoCount(UINT*) override { return E_NOTIMPL; }
+  STDMETHODIMP GetTypeInfo(UINT, LCID, ITypeInfo**) override { return E_NOTIMPL; }
+  STDMETHODIMP GetIDsOfNames(REFIID, LPOLESTR*, UINT, LCID, DISPID*) override { return E_NOTIMPL; }
+  STDMETHODIMP Invoke(DISPID, REFIID, LCID, WORD, DISPPARAMS*, VARIANT*, EXCEPINFO*, UINT*) override {
+    return E_NOTIMPL;
+  }
+  STDMETHODIMP SetInfo(VARIANT) override { return E_NOTIMPL; }
+  STDMETHODIMP AddInfo(VARIANT) override { return E_NOTIMPL; }
+  STDMETHODIMP get_DataSet(IUnknown**) override { return E_NOTIMPL; }
+  STDMETHODIMP HOCode2Name(LONG Code, BSTR* reVal, BSTR* pAbbreviation) override {
+    ++calls;
+    code = Code;
+    abbreviationPointer = pAbbreviation != nullptr;
+    if (reVal) *reVal = SysAllocString(L"Service hydrographique");
+    if (pAbbreviation) *pAbbreviation = SysAllocString(L"SHOM");
+    return S_OK;
+  }
+  STDMETHODIMP GetSelectedObject(BSTR*, IUnknown**) override { return E_NOTIMPL; }
+  STDMETHODIMP FormatAttributes(IUnknown*, BSTR, BSTR*) override { return E_NOTIMPL; }
+};
+
 }  // namespace
 
 TEST_CASE("the type library agrees with the generated header: classes, interfaces and vtable slots") {
@@ -128,5 +163,69 @@ TEST_CASE("the type library agrees with the generated header: classes, interface
     CHECK(duals == 1);
     coclass->Release();
   }
+  library->Release();
+}
+
+TEST_CASE("HOCode2Name keeps dispatch id 4 and out BSTRs; a late-bound caller may leave the abbreviation out") {
+  ITypeLib* library = nullptr;
+  REQUIRE(LoadTypeLibEx(br::test::BuiltDllPath().c_str(), REGKIND_NONE, &library) == S_OK);
+  ITypeInfo* info = nullptr;
+  REQUIRE(library->GetTypeInfoOfGuid(IID_IXObjectInspector, &info) == S_OK);
+  MEMBERID id = MEMBERID_NIL;
+  LPOLESTR name = const_cast<LPOLESTR>(L"HOCode2Name");
+  REQUIRE(info->GetIDsOfNames(&name, 1, &id) == S_OK);
+  CHECK(id == 4);
+
+  bool found = false;
+  FUNCDESC* f = nullptr;
+  for (UINT i = 0; !found && info->GetFuncDesc(i, &f) == S_OK; ++i) {
+    if (f->memid == 4 && f->invkind == INVOKE_FUNC) {
+      found = true;
+      REQUIRE(f->cParams == 3);
+      const ELEMDESC* p = f->lprgelemdescParam;
+      CHECK(p[0].tdesc.vt == VT_I4);
+      for (int out = 1; out <= 2; ++out) {
+        INFO("parameter ", out);
+        CHECK(p[out].tdesc.vt == VT_PTR);
+        CHECK(p[out].tdesc.lptdesc->vt == VT_BSTR);
+        CHECK((p[out].paramdesc.wParamFlags & PARAMFLAG_FOUT) != 0);
+        CHECK((p[out].paramdesc.wParamFlags & PARAMFLAG_FRETVAL) == 0);
+      }
+      CHECK((p[1].paramdesc.wParamFlags & PARAMFLAG_FOPT) == 0);
+      CHECK((p[2].paramdesc.wParamFlags & PARAMFLAG_FOPT) != 0);
+    }
+    info->ReleaseFuncDesc(f);
+  }
+  CHECK(found);
+
+  // Arguments run last to first: [abbreviation,] name, code.
+  InspectorProbe probe;
+  BSTR agency = nullptr, abbreviation = nullptr;
+  VARIANT args[3];
+  V_VT(&args[0]) = VT_BYREF | VT_BSTR;
+  V_BSTRREF(&args[0]) = &abbreviation;
+  V_VT(&args[1]) = VT_BYREF | VT_BSTR;
+  V_BSTRREF(&args[1]) = &agency;
+  V_VT(&args[2]) = VT_I4;
+  V_I4(&args[2]) = 550;
+  DISPPARAMS all{args, nullptr, 3, 0};
+  CHECK(info->Invoke(static_cast<IXObjectInspector*>(&probe), 4, DISPATCH_METHOD, &all, nullptr, nullptr, nullptr) ==
+        S_OK);
+  CHECK((probe.calls == 1 && probe.code == 550 && probe.abbreviationPointer));
+  REQUIRE((agency != nullptr && abbreviation != nullptr));
+  CHECK(std::wstring(abbreviation) == L"SHOM");
+  SysFreeString(agency);
+  SysFreeString(abbreviation);
+
+  agency = nullptr;
+  DISPPARAMS withoutAbbreviation{args + 1, nullptr, 2, 0};
+  CHECK(info->Invoke(static_cast<IXObjectInspector*>(&probe), 4, DISPATCH_METHOD, &withoutAbbreviation, nullptr,
+                     nullptr, nullptr) == S_OK);
+  CHECK(probe.calls == 2);
+  REQUIRE(agency != nullptr);
+  CHECK(std::wstring(agency) == L"Service hydrographique");
+  SysFreeString(agency);
+
+  info->Release();
   library->Release();
 }
