@@ -97,15 +97,9 @@ void ComponentPeer::checkMouseLeft(HWND hwnd) {
 bool ComponentPeer::handleMessage(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam,
                                   LRESULT& result) {
   switch (message) {
-    case WM_GETFONT:
-      result = reinterpret_cast<LRESULT>(owner_.getFont());
-      return true;
-    case WM_ENABLE:
-      // Keep the component's flag in step with the window.
-      owner_.setEnabled(wParam != 0);
-      return true;
-    default:
-      break;
+    case WM_GETFONT: return answerFont(result);
+    case WM_ENABLE: return followEnable(wParam);
+    default: break;
   }
   const bool ownTimerTick = translate(hwnd, message, wParam, lParam);
   const bool handled = drain();
@@ -113,140 +107,172 @@ bool ComponentPeer::handleMessage(HWND hwnd, UINT message, WPARAM wParam, LPARAM
   return handled || ownTimerTick;
 }
 
+bool ComponentPeer::answerFont(LRESULT& result) const {
+  result = reinterpret_cast<LRESULT>(owner_.getFont());
+  return true;
+}
+
+bool ComponentPeer::followEnable(WPARAM wParam) {
+  // Keep the component's flag in step with the window.
+  owner_.setEnabled(wParam != 0);
+  return true;
+}
+
 // Queues the events of one message. Answers true only for a tick of the
 // mouse-tracking timer.
 bool ComponentPeer::translate(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam) {
   if (isPointerMessage(message)) trackMouse(hwnd);
+  if (message == WM_TIMER && wParam == kTrackingTimer && trackingTimer_) {
+    checkMouseLeft(hwnd);
+    return true;
+  }
+  queue(eventFor(hwnd, message, wParam, lParam));
+  return false;
+}
 
-  const int x = GET_X_LPARAM(lParam), y = GET_Y_LPARAM(lParam);
-  std::unique_ptr<ToolkitEvent> e;
+// One line per message: the handler that makes its event (null: none).
+ComponentPeer::Event ComponentPeer::eventFor(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam) {
   switch (message) {
-    case WM_COMMAND:
-      e = makeEvent(hwnd, kEventCommand);
-      e->params[0] = HIWORD(wParam);
-      e->params[1] = LOWORD(wParam);
-      e->params[2] = lParam;
-      break;
+    case WM_COMMAND: return commandEvent(hwnd, wParam, lParam);
     case WM_NOTIFY:
     case WM_DRAWITEM:
-    case WM_MEASUREITEM:
-      e = makeEvent(hwnd, kEventNotify);
-      e->params[0] = message == WM_NOTIFY ? 1 : message == WM_DRAWITEM ? 2 : 3;
-      e->params[1] = message;
-      e->params[2] = static_cast<std::intptr_t>(wParam);
-      e->params[3] = lParam;
-      break;
-    case WM_SETFOCUS: e = makeEvent(hwnd, kEventFocusGained); break;
-    case WM_KILLFOCUS: e = makeEvent(hwnd, kEventFocusLost); break;
-    case WM_KEYDOWN:
-    case WM_KEYUP:
-      e = makeEvent(hwnd, message == WM_KEYDOWN ? kEventKeyDown : kEventKeyUp);
-      e->params[0] = static_cast<std::intptr_t>(wParam);
-      e->params[1] = lParam;
-      break;
-    case WM_CHAR:
-      e = makeEvent(hwnd, kEventChar);
-      e->params[0] = static_cast<unsigned char>(wParam);
-      e->params[1] = lParam;
-      break;
+    case WM_MEASUREITEM: return notifyEvent(hwnd, message, wParam, lParam);
+    case WM_SETFOCUS: return makeEvent(hwnd, kEventFocusGained);
+    case WM_KILLFOCUS: return makeEvent(hwnd, kEventFocusLost);
+    case WM_KEYDOWN: return keyEvent(hwnd, kEventKeyDown, wParam, lParam);
+    case WM_KEYUP: return keyEvent(hwnd, kEventKeyUp, wParam, lParam);
+    case WM_CHAR: return keyEvent(hwnd, kEventChar, static_cast<unsigned char>(wParam), lParam);
     case WM_LBUTTONDOWN:
     case WM_RBUTTONDOWN:
     case WM_LBUTTONDBLCLK:
-    case WM_RBUTTONDBLCLK:
-      e = makeEvent(hwnd, kEventMouseDown);
-      e->params[0] = x;
-      e->params[1] = y;
-      e->params[2] = message == WM_RBUTTONDOWN || message == WM_RBUTTONDBLCLK;
-      e->params[3] = static_cast<std::intptr_t>(wParam);
-      e->params[4] = message == WM_LBUTTONDBLCLK || message == WM_RBUTTONDBLCLK;
-      e->keyState = static_cast<int>(wParam);
-      break;
-    case WM_MOUSEMOVE:
-      if (wParam & (MK_LBUTTON | MK_RBUTTON)) {
-        e = makeEvent(hwnd, kEventMouseDrag);
-        e->params[2] = (wParam & MK_RBUTTON) != 0;
-      } else {
-        e = makeEvent(hwnd, kEventMouseMove);
-        e->params[2] = static_cast<std::intptr_t>(wParam);
-      }
-      e->params[0] = x;
-      e->params[1] = y;
-      e->keyState = static_cast<int>(wParam);
-      break;
+    case WM_RBUTTONDBLCLK: return mouseDownEvent(hwnd, message, wParam, lParam);
+    case WM_MOUSEMOVE: return mouseMoveEvent(hwnd, wParam, lParam);
     case WM_LBUTTONUP:
-    case WM_RBUTTONUP:
-      e = makeEvent(hwnd, kEventMouseUp);
-      e->params[0] = x;
-      e->params[1] = y;
-      e->params[2] = message == WM_RBUTTONUP;
-      e->keyState = static_cast<int>(wParam);
-      break;
-    case WM_MOUSEWHEEL:
-      e = makeEvent(hwnd, kEventMouseWheel);
-      e->params[0] = x;
-      e->params[1] = y;
-      e->params[2] = static_cast<std::intptr_t>(wParam);
-      e->keyState = GET_KEYSTATE_WPARAM(wParam);
-      break;
-    case WM_VSCROLL:
-    case WM_HSCROLL: {
-      const std::intptr_t horizontal = message == WM_HSCROLL;
-      switch (LOWORD(wParam)) {
-        case SB_THUMBPOSITION:
-        case SB_THUMBTRACK:
-          e = makeEvent(hwnd, kEventScrollThumb);
-          e->params[0] = HIWORD(wParam);
-          e->params[1] = horizontal;
-          break;
-        case SB_LINEDOWN: e = makeEvent(hwnd, kEventScrollLineDown); break;
-        case SB_LINEUP: e = makeEvent(hwnd, kEventScrollLineUp); break;
-        case SB_PAGEDOWN: e = makeEvent(hwnd, kEventScrollPageDown); break;
-        case SB_PAGEUP: e = makeEvent(hwnd, kEventScrollPageUp); break;
-        default: break;  // other scroll codes make no event
-      }
-      if (e && e->id != kEventScrollThumb) e->params[0] = horizontal;
-      break;
-    }
-    case WM_DESTROY:
-      if (hwnd == hwnd_ || !hwnd_) stopTracking();
-      e = makeEvent(hwnd, kEventDestroy);
-      break;
-    case WM_SIZE:
-      e = makeEvent(hwnd, wParam == SIZE_MAXIMIZED   ? kEventMaximized
-                          : wParam == SIZE_MINIMIZED ? kEventMinimized
-                                                     : kEventResized);
-      e->params[0] = LOWORD(lParam);
-      e->params[1] = HIWORD(lParam);
-      break;
-    case WM_MOVE: e = makeEvent(hwnd, kEventMoved); break;
-    case WM_CLOSE: e = makeEvent(hwnd, kEventClose); break;
-    case WM_PAINT: e = makeEvent(hwnd, kEventPaint); break;
-    case WM_ERASEBKGND:
-      e = makeEvent(hwnd, kEventEraseBackground);
-      e->params[0] = static_cast<std::intptr_t>(wParam);
-      break;
-    case WM_ACTIVATE:
-      if (LOWORD(wParam) == WA_INACTIVE) e = makeEvent(hwnd, kEventDeactivated);
-      else e = makeEvent(hwnd, kEventActivated);
-      break;
-    case WM_CREATE: e = makeEvent(hwnd, kEventCreate); break;
-    case WM_TIMER:
-      if (wParam == kTrackingTimer && trackingTimer_) {
-        checkMouseLeft(hwnd);
-        return true;
-      }
-      e = makeEvent(hwnd, kEventTimer);
-      e->params[0] = static_cast<std::intptr_t>(wParam);
-      break;
-    case WM_SETCURSOR:
-      e = makeEvent(hwnd, kEventSetCursor);
-      e->params[0] = static_cast<std::intptr_t>(wParam);
-      break;
-    default:
-      break;
+    case WM_RBUTTONUP: return mouseUpEvent(hwnd, message, wParam, lParam);
+    case WM_MOUSEWHEEL: return wheelEvent(hwnd, wParam, lParam);
+    case WM_VSCROLL: return scrollEvent(hwnd, wParam, false);
+    case WM_HSCROLL: return scrollEvent(hwnd, wParam, true);
+    case WM_DESTROY: return destroyEvent(hwnd);
+    case WM_SIZE: return sizeEvent(hwnd, wParam, lParam);
+    case WM_MOVE: return makeEvent(hwnd, kEventMoved);
+    case WM_CLOSE: return makeEvent(hwnd, kEventClose);
+    case WM_PAINT: return makeEvent(hwnd, kEventPaint);
+    case WM_ERASEBKGND: return valueEvent(hwnd, kEventEraseBackground, wParam);
+    case WM_ACTIVATE: return makeEvent(hwnd, LOWORD(wParam) == WA_INACTIVE ? kEventDeactivated : kEventActivated);
+    case WM_CREATE: return makeEvent(hwnd, kEventCreate);
+    case WM_TIMER: return valueEvent(hwnd, kEventTimer, wParam);
+    case WM_SETCURSOR: return valueEvent(hwnd, kEventSetCursor, wParam);
+    default: return nullptr;
   }
-  queue(std::move(e));
-  return false;
+}
+
+ComponentPeer::Event ComponentPeer::valueEvent(HWND hwnd, int id, WPARAM wParam) const {
+  Event e = makeEvent(hwnd, id);
+  e->params[0] = static_cast<std::intptr_t>(wParam);
+  return e;
+}
+
+ComponentPeer::Event ComponentPeer::commandEvent(HWND hwnd, WPARAM wParam, LPARAM lParam) const {
+  Event e = makeEvent(hwnd, kEventCommand);
+  e->params[0] = HIWORD(wParam);
+  e->params[1] = LOWORD(wParam);
+  e->params[2] = lParam;
+  return e;
+}
+
+ComponentPeer::Event ComponentPeer::notifyEvent(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam) const {
+  Event e = makeEvent(hwnd, kEventNotify);
+  e->params[0] = message == WM_NOTIFY ? 1 : message == WM_DRAWITEM ? 2 : 3;
+  e->params[1] = message;
+  e->params[2] = static_cast<std::intptr_t>(wParam);
+  e->params[3] = lParam;
+  return e;
+}
+
+ComponentPeer::Event ComponentPeer::keyEvent(HWND hwnd, int id, WPARAM key, LPARAM lParam) const {
+  Event e = makeEvent(hwnd, id);
+  e->params[0] = static_cast<std::intptr_t>(key);
+  e->params[1] = lParam;
+  return e;
+}
+
+ComponentPeer::Event ComponentPeer::mouseDownEvent(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam) const {
+  Event e = makeEvent(hwnd, kEventMouseDown);
+  e->params[0] = GET_X_LPARAM(lParam);
+  e->params[1] = GET_Y_LPARAM(lParam);
+  e->params[2] = message == WM_RBUTTONDOWN || message == WM_RBUTTONDBLCLK;
+  e->params[3] = static_cast<std::intptr_t>(wParam);
+  e->params[4] = message == WM_LBUTTONDBLCLK || message == WM_RBUTTONDBLCLK;
+  e->keyState = static_cast<int>(wParam);
+  return e;
+}
+
+// A move with a button down is a drag.
+ComponentPeer::Event ComponentPeer::mouseMoveEvent(HWND hwnd, WPARAM wParam, LPARAM lParam) const {
+  Event e;
+  if (wParam & (MK_LBUTTON | MK_RBUTTON)) {
+    e = makeEvent(hwnd, kEventMouseDrag);
+    e->params[2] = (wParam & MK_RBUTTON) != 0;
+  } else {
+    e = makeEvent(hwnd, kEventMouseMove);
+    e->params[2] = static_cast<std::intptr_t>(wParam);
+  }
+  e->params[0] = GET_X_LPARAM(lParam);
+  e->params[1] = GET_Y_LPARAM(lParam);
+  e->keyState = static_cast<int>(wParam);
+  return e;
+}
+
+ComponentPeer::Event ComponentPeer::mouseUpEvent(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam) const {
+  Event e = makeEvent(hwnd, kEventMouseUp);
+  e->params[0] = GET_X_LPARAM(lParam);
+  e->params[1] = GET_Y_LPARAM(lParam);
+  e->params[2] = message == WM_RBUTTONUP;
+  e->keyState = static_cast<int>(wParam);
+  return e;
+}
+
+ComponentPeer::Event ComponentPeer::wheelEvent(HWND hwnd, WPARAM wParam, LPARAM lParam) const {
+  Event e = makeEvent(hwnd, kEventMouseWheel);
+  e->params[0] = GET_X_LPARAM(lParam);
+  e->params[1] = GET_Y_LPARAM(lParam);
+  e->params[2] = static_cast<std::intptr_t>(wParam);
+  e->keyState = GET_KEYSTATE_WPARAM(wParam);
+  return e;
+}
+
+// The thumb carries its position beside the direction; other scroll codes make no event.
+ComponentPeer::Event ComponentPeer::scrollEvent(HWND hwnd, WPARAM wParam, bool horizontal) const {
+  Event e;
+  switch (LOWORD(wParam)) {
+    case SB_THUMBPOSITION:
+    case SB_THUMBTRACK:
+      e = makeEvent(hwnd, kEventScrollThumb);
+      e->params[0] = HIWORD(wParam);
+      e->params[1] = horizontal;
+      return e;
+    case SB_LINEDOWN: e = makeEvent(hwnd, kEventScrollLineDown); break;
+    case SB_LINEUP: e = makeEvent(hwnd, kEventScrollLineUp); break;
+    case SB_PAGEDOWN: e = makeEvent(hwnd, kEventScrollPageDown); break;
+    case SB_PAGEUP: e = makeEvent(hwnd, kEventScrollPageUp); break;
+    default: return nullptr;
+  }
+  e->params[0] = horizontal;
+  return e;
+}
+
+ComponentPeer::Event ComponentPeer::destroyEvent(HWND hwnd) {
+  if (hwnd == hwnd_ || !hwnd_) stopTracking();
+  return makeEvent(hwnd, kEventDestroy);
+}
+
+ComponentPeer::Event ComponentPeer::sizeEvent(HWND hwnd, WPARAM wParam, LPARAM lParam) const {
+  Event e = makeEvent(hwnd, wParam == SIZE_MAXIMIZED   ? kEventMaximized
+                            : wParam == SIZE_MINIMIZED ? kEventMinimized
+                                                       : kEventResized);
+  e->params[0] = LOWORD(lParam);
+  e->params[1] = HIWORD(lParam);
+  return e;
 }
 
 }  // namespace toolkit

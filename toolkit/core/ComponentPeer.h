@@ -51,8 +51,25 @@ public:
   void silence() { silent_ = true; }
 
 private:
-  std::unique_ptr<ToolkitEvent> makeEvent(HWND hwnd, int id) const;
+  using Event = std::unique_ptr<ToolkitEvent>;
+
+  Event makeEvent(HWND hwnd, int id) const;
+  bool answerFont(LRESULT& result) const;
+  bool followEnable(WPARAM wParam);
   bool translate(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam);
+  Event eventFor(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam);
+  // eventFor's handlers, each making the event of one kind of message.
+  Event valueEvent(HWND hwnd, int id, WPARAM wParam) const;  // params[0] = wParam
+  Event commandEvent(HWND hwnd, WPARAM wParam, LPARAM lParam) const;
+  Event notifyEvent(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam) const;
+  Event keyEvent(HWND hwnd, int id, WPARAM key, LPARAM lParam) const;
+  Event mouseDownEvent(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam) const;
+  Event mouseMoveEvent(HWND hwnd, WPARAM wParam, LPARAM lParam) const;
+  Event mouseUpEvent(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam) const;
+  Event wheelEvent(HWND hwnd, WPARAM wParam, LPARAM lParam) const;
+  Event scrollEvent(HWND hwnd, WPARAM wParam, bool horizontal) const;
+  Event destroyEvent(HWND hwnd);
+  Event sizeEvent(HWND hwnd, WPARAM wParam, LPARAM lParam) const;
   void trackMouse(HWND hwnd);
   void checkMouseLeft(HWND hwnd);
   void stopTracking();
