@@ -2,6 +2,8 @@
 
 #include <windowsx.h>
 
+#include "toolkit/access/ComponentAccessible.h"
+#include "toolkit/access/make_accessible.h"
 #include "toolkit/core/ToolkitWindows.h"
 #include "toolkit/core/cXComponent.h"
 
@@ -23,7 +25,7 @@ ComponentPeer::ComponentPeer(cXComponent& owner, int kind)
 
 ComponentPeer::~ComponentPeer() {
   *alive_ = false;
-  silent_ = true;
+  silence();
   stopTracking();
   if (hwnd_ && IsWindow(hwnd_)) DestroyWindow(hwnd_);
   hwnd_ = nullptr;
@@ -56,6 +58,12 @@ void ComponentPeer::windowGone(HWND hwnd) {
   if (hwnd != hwnd_) return;
   trackingTimer_ = 0;  // timers die with their window
   hwnd_ = nullptr;
+  dropAccessible();
+}
+
+void ComponentPeer::silence() {
+  silent_ = true;
+  dropAccessible();
 }
 
 void ComponentPeer::stopTracking() {
@@ -99,6 +107,7 @@ bool ComponentPeer::handleMessage(HWND hwnd, UINT message, WPARAM wParam, LPARAM
   switch (message) {
     case WM_GETFONT: return answerFont(result);
     case WM_ENABLE: return followEnable(wParam);
+    case WM_GETOBJECT: return answerObject(hwnd, wParam, lParam, result);
     default: break;
   }
   const bool ownTimerTick = translate(hwnd, message, wParam, lParam);
@@ -116,6 +125,26 @@ bool ComponentPeer::followEnable(WPARAM wParam) {
   // Keep the component's flag in step with the window.
   owner_.setEnabled(wParam != 0);
   return true;
+}
+
+// Only the component's own window of a self-drawn component answers: the
+// platform describes native controls (and plain containers, by their child
+// windows) better than the toolkit could.
+bool ComponentPeer::answerObject(HWND hwnd, WPARAM wParam, LPARAM lParam, LRESULT& result) {
+  if (hwnd != hwnd_ || silent_ || static_cast<DWORD>(lParam) != static_cast<DWORD>(OBJID_CLIENT)) return false;
+  if (!accessible_) accessible_ = makeAccessible(owner_);
+  if (!accessible_) return false;
+  result = accessible_->toLresult(wParam);
+  return result > 0;
+}
+
+void ComponentPeer::dropAccessible() {
+  if (!accessible_) return;
+  // Clients may hold it longer than the window lives: from now on it answers
+  // that its component is gone.
+  accessible_->disconnect();
+  accessible_->Release();
+  accessible_ = nullptr;
 }
 
 // Queues the events of one message. Answers true only for a tick of the

@@ -3,6 +3,9 @@
 // and the queue of events waiting to be dispatched. The toolkit window procedure
 // hands every message of the component's windows to handleMessage, which turns
 // it into events, queues them and drains the queue through the component.
+// Accessibility clients asking a self-drawn component's window for its object
+// get the component's accessible object, made on the first request and kept
+// while the window lives.
 
 #include <windows.h>
 
@@ -13,6 +16,7 @@
 
 namespace toolkit {
 
+class ComponentAccessible;
 class cXComponent;
 
 class ComponentPeer {
@@ -47,8 +51,9 @@ public:
   // The window `hwnd` is gone (WM_NCDESTROY).
   void windowGone(HWND hwnd);
 
-  // While the component is being destroyed its events are dropped, not dispatched.
-  void silence() { silent_ = true; }
+  // While the component is being destroyed its events are dropped, not dispatched,
+  // and accessibility clients get nothing more from it.
+  void silence();
 
 private:
   using Event = std::unique_ptr<ToolkitEvent>;
@@ -56,6 +61,8 @@ private:
   Event makeEvent(HWND hwnd, int id) const;
   bool answerFont(LRESULT& result) const;
   bool followEnable(WPARAM wParam);
+  bool answerObject(HWND hwnd, WPARAM wParam, LPARAM lParam, LRESULT& result);
+  void dropAccessible();
   bool translate(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam);
   Event eventFor(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam);
   // eventFor's handlers, each making the event of one kind of message.
@@ -80,6 +87,7 @@ private:
   UINT_PTR trackingTimer_ = 0;
   std::deque<std::unique_ptr<ToolkitEvent>> queue_;
   bool silent_ = false;
+  ComponentAccessible* accessible_ = nullptr;  // one reference, held while the window lives
   // Shared with running drains so they notice when a handler deleted the component.
   std::shared_ptr<bool> alive_;
 };

@@ -191,7 +191,7 @@ LRESULT CALLBACK ToolkitWindows::windowProc(HWND hwnd, UINT message, WPARAM wPar
   if (!peer) return defaultProc(hwnd, message, wParam, lParam);
   LRESULT result = 0;
   const bool consumed = peer->handleMessage(hwnd, message, wParam, lParam, result);
-  if (message == WM_GETFONT && consumed) return result;
+  if (consumed && (message == WM_GETFONT || message == WM_GETOBJECT)) return result;
 
   // Handlers may have destroyed the window, or the component with it.
   entry = find(hwnd);

@@ -5,6 +5,7 @@
 #include <algorithm>
 
 #include "frame/format/coord_format.h"
+#include "toolkit/access/TableAccessible.h"
 #include "toolkit/base/class_records.h"
 #include "toolkit/table/logic/cell_kinds.h"
 #include "toolkit/table/logic/cell_mask.h"
@@ -242,6 +243,7 @@ void Table::removeAllRows() {
   topRow_ = 0;
   updateScrollBars();
   invalidate();
+  TableAccessible::announceReorder(*this);
 }
 
 // ---- cells
@@ -356,6 +358,7 @@ void Table::orderByColumn(int column) {
     }
   }
   invalidate();
+  TableAccessible::announceReorder(*this);
 }
 
 void Table::setDisplayWidth(int width) {

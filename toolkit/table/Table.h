@@ -143,6 +143,10 @@ public:
   int getSortColumn() const { return sortColumn_; }
   int displayRowOf(int storedRow) const { return order_.toDisplay(storedRow); }
   int storedRowOf(int displayRow) const { return order_.toStored(displayRow); }
+  // The rows shown, in the order shown, hidden ones left out.
+  int displayRowCount() const;
+  int nthShownRow(int index) const;       // stored row of the index-th shown row, or -1
+  int shownIndexOf(int storedRow) const;  // -1 when the row is not shown
   // Width of the scrolled content (0: the sum of the column widths).
   void setDisplayWidth(int width);
   int getDisplayWidth() const { return displayWidth_; }
@@ -189,9 +193,6 @@ private:
   DataTable* cellsOf(int column) const;
   int columnLeft(int column) const;  // content x of the column's left edge
   int visibleRowCount() const;       // whole rows that fit below the header
-  int displayRowCount() const;       // rows shown (hidden ones left out)
-  int nthShownRow(int index) const;  // stored row of the index-th shown row, or -1
-  int shownIndexOf(int storedRow) const;
   void fillLastColumn();
   void updateScrollBars();
   void scrollIntoView(int row);

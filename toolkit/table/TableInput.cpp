@@ -3,6 +3,7 @@
 
 #include <algorithm>
 
+#include "toolkit/access/TableAccessible.h"
 #include "toolkit/table/logic/cell_kinds.h"
 #include "toolkit/widgets/cXEdit2.h"
 
@@ -52,6 +53,7 @@ bool Table::moveCurrent(int row, int column, bool doubleClick, int keyState, boo
   scrollIntoView(currentRow_);
   redrawRow(oldRow);
   redrawRow(currentRow_);
+  if (currentRow_ != oldRow) TableAccessible::announceCurrentRow(*this);
   return true;
 }
 
@@ -283,7 +285,9 @@ int Table::onKeyDown(ToolkitEvent& event, int key) {
 }
 
 int Table::onFocusGained(ToolkitEvent& event) {
-  if (event.source == this) redrawRow(currentRow_);
+  if (event.source != this) return 0;
+  redrawRow(currentRow_);
+  TableAccessible::announceFocus(*this);
   return 0;
 }
 
