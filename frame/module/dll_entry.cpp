@@ -4,6 +4,7 @@
 #include "frame/module/class_rows.h"
 #include "frame/module/registration.h"
 #include "tides/objects/TidesDatabase.h"
+#include "toolkit/access/ComponentAccessible.h"
 #include "toolkit/core/ToolkitWindows.h"
 #include "toolkit/widgets/Tooltip.h"
 
@@ -37,7 +38,10 @@ extern "C" BOOL WINAPI DllMain(HINSTANCE instance, DWORD reason, LPVOID reserved
   return TRUE;
 }
 
-STDAPI DllCanUnloadNow() { return Module::LockCount() == 0 ? S_OK : S_FALSE; }
+// Accessibility clients may hold the toolkit's objects after their controls are gone.
+STDAPI DllCanUnloadNow() {
+  return Module::LockCount() == 0 && toolkit::ComponentAccessible::liveObjects() == 0 ? S_OK : S_FALSE;
+}
 
 STDAPI DllGetClassObject(REFCLSID clsid, REFIID riid, LPVOID* out) {
   return TheClassTable().GetClassObject(clsid, riid, out);

@@ -45,7 +45,15 @@ void setLong(VARIANT* out, LONG value) {
   out->lVal = value;
 }
 
+LONG g_liveObjects = 0;
+
 }  // namespace
+
+ComponentAccessible::Counted::Counted() noexcept { InterlockedIncrement(&g_liveObjects); }
+
+ComponentAccessible::Counted::~Counted() { InterlockedDecrement(&g_liveObjects); }
+
+LONG ComponentAccessible::liveObjects() noexcept { return InterlockedCompareExchange(&g_liveObjects, 0, 0); }
 
 ComponentAccessible::ComponentAccessible(cXComponent& component) : component_(&component) {}
 

@@ -24,6 +24,18 @@ class cXComponent;
 
 class ComponentAccessible : public IAccessible {
 public:
+  // Counts an object of this folder for as long as it lives: clients may hold one
+  // after its widget has gone, and its code must stay loaded until they let it go.
+  class Counted {
+  public:
+    Counted() noexcept;
+    ~Counted();
+    Counted(const Counted&) = delete;
+    Counted& operator=(const Counted&) = delete;
+  };
+  // Objects alive: a module may unload only at 0.
+  static LONG liveObjects() noexcept;
+
   // Starts with one reference, the caller's.
   explicit ComponentAccessible(cXComponent& component);
   ComponentAccessible(const ComponentAccessible&) = delete;
@@ -103,6 +115,7 @@ private:
   HRESULT forChild(const VARIANT& child, Answer&& answer);
   static HRESULT textAnswer(const std::string& text, BSTR* out, HRESULT whenEmpty);
 
+  Counted counted_;
   cXComponent* component_;
   LONG references_ = 1;
 };

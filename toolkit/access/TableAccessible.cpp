@@ -62,6 +62,7 @@ public:
 private:
   virtual ~ChildIds() = default;
 
+  ComponentAccessible::Counted counted_;
   std::vector<LONG> ids_;
   size_t next_;
   LONG references_ = 1;

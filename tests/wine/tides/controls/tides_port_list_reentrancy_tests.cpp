@@ -1,5 +1,9 @@
-// SelectChanged sinks that call back into TidesPortList, fired by a fill and by a key in the table.
+// SelectChanged sinks that call back into TidesPortList, fired by a fill, by a key in the table
+// and by an accessibility client picking a row.
+#include "tests/wine/common/AccessibleReader.h"
 #include "tests/wine/common/boundary_support.h"
+
+#include <memory>
 
 using namespace br::test;
 using namespace br::test::boundary;
@@ -13,10 +17,14 @@ struct List {
   ITidesPortList* list = hosted.Query<ITidesPortList>();
 
   HRESULT SetAll() { return list->SetPortList(Variant::Array(VT_UNKNOWN, MakeUnknownArray(ports)).get()); }
-  // A key pressed in the table, the innermost window under the control's.
-  void Key(UINT key) {
+  // The table: the innermost window under the control's.
+  HWND Table() const {
     HWND table = hosted.Window();
     while (HWND child = GetWindow(table, GW_CHILD)) table = child;
+    return table;
+  }
+  void Key(UINT key) {
+    HWND table = Table();
     SendMessageW(table, WM_KEYDOWN, key, 1);
     SendMessageW(table, WM_KEYUP, key, 0xC0000001);
   }
@@ -62,5 +70,28 @@ TEST_CASE("a SelectChanged sink that disconnects itself, and one that closes the
   CHECK(closing.calls == 1);
   CHECK_FALSE(IsWindow(controlWindow));
   for (ULONG count : RefCounts(l.ports)) CHECK(count == 1);  // the list let every port go
+  CHECK(l.Finish() == S_OK);
+}
+
+TEST_CASE("a SelectChanged sink that closes the host while an accessibility client picks a row") {
+  List l;
+  REQUIRE(l.SetAll() == S_OK);
+  auto reader = std::make_unique<AccessibleReader>(l.Table());
+  REQUIRE(reader->get() != nullptr);
+  EventSink closing(DIID__ITidesPortListEvents);
+  REQUIRE(closing.Connect(l.list));
+  const HWND controlWindow = l.hosted.Window();
+  closing.onCall = [&] {
+    closing.Disconnect();
+    ReleaseAndNull(l.list);
+    l.hosted.Close();
+  };
+  CHECK(reader->get()->accSelect(SELFLAG_TAKESELECTION, ChildId(2)) == S_OK);
+  CHECK(closing.calls == 1);
+  CHECK_FALSE(IsWindow(controlWindow));
+  LONG count = -1;
+  CHECK(reader->get()->get_accChildCount(&count) == CO_E_OBJNOTCONNECTED);  // its table is gone
+  CHECK(l.tides.dll.CanUnloadNow() == S_FALSE);  // the client's object still needs the code
+  reader.reset();
   CHECK(l.Finish() == S_OK);
 }

@@ -7,6 +7,7 @@
 
 #include "tests/wine/common/AccessibleReader.h"
 #include "tests/wine/common/widget_test_support.h"
+#include "toolkit/access/ComponentAccessible.h"
 #include "toolkit/widgets/Button.h"
 #include "toolkit/widgets/Label.h"
 #include "toolkit/widgets/cXEdit2.h"
@@ -93,9 +94,10 @@ TEST_CASE("bad requests are refused; an object that outlives its widget answers 
   wtest::MountedPanel panel;
   auto label = std::make_unique<Label>("Ebb");
   panel.add(label.get());
-  AccessibleReader reader(label->getHandle());
-  IAccessible* object = reader.get();
+  auto reader = std::make_unique<AccessibleReader>(label->getHandle());
+  IAccessible* object = reader->get();
   REQUIRE(object);
+  CHECK(ComponentAccessible::liveObjects() == 1);
 
   BSTR text = nullptr;
   VARIANT out;
@@ -130,4 +132,7 @@ TEST_CASE("bad requests are refused; an object that outlives its widget answers 
   LONG count = 5;
   CHECK(object->get_accChildCount(&count) == CO_E_OBJNOTCONNECTED);
   CHECK(count == 0);
+  CHECK(ComponentAccessible::liveObjects() == 1);  // keeps the module loaded until released
+  reader.reset();
+  CHECK(ComponentAccessible::liveObjects() == 0);
 }
