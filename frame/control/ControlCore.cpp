@@ -9,14 +9,9 @@ namespace br::control {
 
 namespace {
 
-template <class I>
-void ReleaseAndNull(I*& p) noexcept {
-  if (p) {
-    I* held = p;
-    p = nullptr;
-    held->Release();
-  }
-}
+// IOleControlSite::TranslateAccelerator's modifier for Shift (KEYMOD_SHIFT, which mingw's
+// headers lack).
+constexpr DWORD kKeyModifierShift = 0x1;
 
 SIZE ScreenPixelsPerInch() noexcept {
   SIZE ppi{96, 96};
@@ -53,9 +48,9 @@ ControlCore::~ControlCore() {
   if (window_ && IsWindow(window_)) DestroyWindow(window_);
   window_ = nullptr;
   ReleaseUiWindows();
-  ReleaseAndNull(inPlaceSite_);
-  ReleaseAndNull(site_);
-  ReleaseAndNull(adviseHolder_);
+  inPlaceSite_.Reset();
+  site_.Reset();
+  adviseHolder_.Reset();
 }
 
 HRESULT ControlCore::QueryInterface(REFIID riid, void** out) {
@@ -150,17 +145,60 @@ LRESULT ControlCore::WindowMessage(HWND window, UINT message, WPARAM wParam, LPA
       return 0;
     case WM_ERASEBKGND:
       return 1;  // painting covers the whole client area: erasing would only flicker
-    case WM_SETFOCUS:
+    case WM_SETFOCUS: {
+      OwnerHold hold(owner_);
+      if (InPlaceActive() && !uiActive_) InPlaceActivate(true);
+      // The keys belong to the control's focus child, when it has one.
+      if (hooksLive_ && GetFocus() == window) {
+        br::com::Guarded(class_, [&] {
+          hooks_.PassFocus();
+          return S_OK;
+        });
+      }
+      return 0;
+    }
     case WM_MOUSEACTIVATE:
       if (InPlaceActive() && !uiActive_) {
         OwnerHold hold(owner_);
         InPlaceActivate(true);
       }
       break;
+    case WM_KEYDOWN:
+      // Tab reaches the control's own window only when nothing inside takes the keys.
+      if (wParam == VK_TAB) {
+        LeaveFocus(GetKeyState(VK_SHIFT) < 0);
+        return 0;
+      }
+      break;
+    case WM_NEXTDLGCTL:
+      // A child tree of the control tabbed past its last (first) window.
+      if (!LOWORD(lParam)) LeaveFocus(wParam != 0);
+      return 0;
     default:
       break;
   }
   return DefWindowProcW(window, message, wParam, lParam);
+}
+
+bool ControlCore::HoldsFocus() const noexcept {
+  const HWND focus = GetFocus();
+  return window_ && focus && (focus == window_ || IsChild(window_, focus));
+}
+
+void ControlCore::LeaveFocus(bool backwards) {
+  if (!HoldsFocus()) return;
+  OwnerHold hold(owner_);
+  // The container knows its own tab order: it is asked first.
+  if (const auto controlSite = site_.Query<IOleControlSite>(IID_IOleControlSite)) {
+    MSG tab{GetFocus(), WM_KEYDOWN, VK_TAB, 1, static_cast<DWORD>(GetMessageTime()), {}};
+    if (controlSite->TranslateAccelerator(&tab, backwards ? kKeyModifierShift : 0) == S_OK && !HoldsFocus()) return;
+  }
+  // Otherwise the window order: the next (previous) tab stop of the top-level window
+  // after the control's window, unless that leads back into the control.
+  if (!window_) return;
+  const HWND top = GetAncestor(window_, GA_ROOT);
+  const HWND next = top && top != window_ ? GetNextDlgTabItem(top, window_, backwards ? TRUE : FALSE) : nullptr;
+  if (next && next != window_ && !IsChild(window_, next)) SetFocus(next);
 }
 
 void ControlCore::WindowDestroyed(HWND window) noexcept {
@@ -170,10 +208,7 @@ void ControlCore::WindowDestroyed(HWND window) noexcept {
 // ---- client site and activation
 
 HRESULT ControlCore::SetClientSite(IOleClientSite* site) {
-  if (site) site->AddRef();
-  IOleClientSite* old = site_;
-  site_ = site;
-  if (old) old->Release();
+  site_ = br::com::ComRef<IOleClientSite>(site);
   return S_OK;
 }
 
@@ -208,29 +243,20 @@ HRESULT ControlCore::DoVerb(LONG verb, IOleClientSite* activeSite) {
 HRESULT ControlCore::InPlaceActivate(bool uiActivate) {
   if (!site_) return E_UNEXPECTED;
   if (!inPlaceSite_) {
-    IOleInPlaceSite* site = nullptr;
-    if (FAILED(site_->QueryInterface(IID_IOleInPlaceSite, reinterpret_cast<void**>(&site))) || !site) return E_FAIL;
-    if (site->CanInPlaceActivate() != S_OK) {
-      site->Release();
-      return E_FAIL;
-    }
+    const auto site = site_.Query<IOleInPlaceSite>(IID_IOleInPlaceSite);
+    if (!site || site->CanInPlaceActivate() != S_OK) return E_FAIL;
     // Windowed activation even when the site offers windowless: the controls need their
     // own window for the mouse, the keyboard and child windows.
-    IOleInPlaceSiteEx* siteEx = nullptr;
     HRESULT hr;
-    if (SUCCEEDED(site->QueryInterface(IID_IOleInPlaceSiteEx, reinterpret_cast<void**>(&siteEx))) && siteEx) {
+    if (const auto siteEx = site.Query<IOleInPlaceSiteEx>(IID_IOleInPlaceSiteEx)) {
       BOOL noRedraw = FALSE;
       hr = siteEx->OnInPlaceActivateEx(&noRedraw, 0);
-      siteEx->Release();
       siteIsEx_ = true;
     } else {
       hr = site->OnInPlaceActivate();
       siteIsEx_ = false;
     }
-    if (FAILED(hr)) {
-      site->Release();
-      return hr;
-    }
+    if (FAILED(hr)) return hr;
     inPlaceSite_ = site;
   }
 
@@ -239,22 +265,20 @@ HRESULT ControlCore::InPlaceActivate(bool uiActivate) {
     InPlaceDeactivate();
     return E_FAIL;
   }
-  IOleInPlaceFrame* frame = nullptr;
-  IOleInPlaceUIWindow* document = nullptr;
+  br::com::ComRef<IOleInPlaceFrame> frame;
+  br::com::ComRef<IOleInPlaceUIWindow> document;
   RECT position{};
   RECT clip{};
   OLEINPLACEFRAMEINFO frameInfo{};
   frameInfo.cb = sizeof(frameInfo);
-  HRESULT hr = inPlaceSite_->GetWindowContext(&frame, &document, &position, &clip, &frameInfo);
+  HRESULT hr = inPlaceSite_->GetWindowContext(frame.Out(), document.Out(), &position, &clip, &frameInfo);
   if (FAILED(hr)) {
     InPlaceDeactivate();
     return hr;
   }
   if (!window_) {
-    window_ = hooks_.CreateWindowIn(parent, position);
+    window_ = ControlWindow::Create(*this, parent, position);
     if (!window_) {
-      ReleaseAndNull(frame);
-      ReleaseAndNull(document);
       InPlaceDeactivate();
       return E_FAIL;
     }
@@ -264,15 +288,17 @@ HRESULT ControlCore::InPlaceActivate(bool uiActivate) {
   SetObjectRects(&position, &clip);
   ShowWindow(window_, SW_SHOWNA);
 
-  if (uiActivate && !uiActive_) {
+  const bool becomingUiActive = uiActivate && !uiActive_;
+  if (becomingUiActive) {
     uiActive_ = true;
-    frame_ = frame;
-    document_ = document;
-    frame = nullptr;
-    document = nullptr;
+    frame_ = std::move(frame);
+    document_ = std::move(document);
     inPlaceSite_->OnUIActivate();
-    const HWND focus = GetFocus();
-    if (window_ && focus != window_ && !IsChild(window_, focus)) SetFocus(window_);
+  }
+  // UI activation takes the focus, also for a control that is UI-active already; the
+  // window hands it on to its focus child.
+  if (uiActivate && window_ && !HoldsFocus()) SetFocus(window_);
+  if (becomingUiActive) {
     if (frame_) {
       frame_->SetActiveObject(&activeObject_, class_.name);
       frame_->SetBorderSpace(nullptr);
@@ -282,15 +308,13 @@ HRESULT ControlCore::InPlaceActivate(bool uiActivate) {
       document_->SetBorderSpace(nullptr);
     }
   }
-  ReleaseAndNull(frame);
-  ReleaseAndNull(document);
   if (site_) site_->ShowObject();
   return S_OK;
 }
 
 void ControlCore::ReleaseUiWindows() noexcept {
-  ReleaseAndNull(frame_);
-  ReleaseAndNull(document_);
+  frame_.Reset();
+  document_.Reset();
 }
 
 HRESULT ControlCore::UIDeactivate() {
@@ -311,17 +335,13 @@ HRESULT ControlCore::InPlaceDeactivate() {
     if (IsWindow(window)) DestroyWindow(window);
   }
   if (!inPlaceSite_) return S_OK;
-  IOleInPlaceSite* site = inPlaceSite_;
-  inPlaceSite_ = nullptr;
-  IOleInPlaceSiteEx* siteEx = nullptr;
-  if (siteIsEx_ && SUCCEEDED(site->QueryInterface(IID_IOleInPlaceSiteEx, reinterpret_cast<void**>(&siteEx))) &&
-      siteEx) {
+  const br::com::ComRef<IOleInPlaceSite> site = std::move(inPlaceSite_);
+  const auto siteEx = siteIsEx_ ? site.Query<IOleInPlaceSiteEx>(IID_IOleInPlaceSiteEx) : nullptr;
+  if (siteEx) {
     siteEx->OnInPlaceDeactivateEx(TRUE);
-    siteEx->Release();
   } else {
     site->OnInPlaceDeactivate();
   }
-  site->Release();
   return S_OK;
 }
 
@@ -384,7 +404,7 @@ SIZE ControlCore::ExtentInPixels() noexcept {
 
 HRESULT ControlCore::Advise(IAdviseSink* sink, DWORD* connection) {
   if (!adviseHolder_) {
-    const HRESULT hr = CreateOleAdviseHolder(&adviseHolder_);
+    const HRESULT hr = CreateOleAdviseHolder(adviseHolder_.Out());
     if (FAILED(hr)) return hr;
   }
   return adviseHolder_->Advise(sink, connection);

@@ -3,10 +3,11 @@
 // the interface faces (IOleObject, IViewObjectEx, ...) that containers talk to.
 //
 // A control does not use this class directly: it derives from ControlObject (see
-// control_object.h), which owns one ControlCore and forwards the hooks.
+// ControlObject.h), which owns one ControlCore and forwards the hooks.
 #pragma once
 
 #include "frame/com/ClassIdentity.h"
+#include "frame/com/ComRef.h"
 #include "frame/control/ControlHooks.h"
 #include "frame/control/DataObjectFace.h"
 #include "frame/control/EmbeddedControlFace.h"
@@ -56,15 +57,23 @@ public:
 
   // ---- client site and activation
   HRESULT SetClientSite(IOleClientSite* site);
-  IOleClientSite* ClientSite() const noexcept { return site_; }
+  IOleClientSite* ClientSite() const noexcept { return site_.Get(); }
   HRESULT DoVerb(LONG verb, IOleClientSite* activeSite);
   HRESULT InPlaceActivate(bool uiActivate);
   HRESULT UIDeactivate();
   HRESULT InPlaceDeactivate();
   HRESULT SetObjectRects(const RECT* position, const RECT* clip);
   HRESULT Close(DWORD saveOption);
-  bool InPlaceActive() const noexcept { return inPlaceSite_ != nullptr; }
+  bool InPlaceActive() const noexcept { return static_cast<bool>(inPlaceSite_); }
   bool UIActive() const noexcept { return uiActive_; }
+
+  // ---- keyboard focus
+  // The focus is on the control's window or on a window inside it.
+  bool HoldsFocus() const noexcept;
+  // Tab (Shift+Tab) out of the control: the container's control site is asked first
+  // (IOleControlSite::TranslateAccelerator), then the focus goes to the next (previous)
+  // tab stop of the top-level window after the control's window.
+  void LeaveFocus(bool backwards);
 
   // ---- extent (himetric) and saved state; the first extent is the preferred size
   SIZEL Extent() noexcept;
@@ -90,17 +99,17 @@ private:
   // never calls into them.
   bool hooksLive_ = true;
 
-  IOleClientSite* site_ = nullptr;
-  IOleInPlaceSite* inPlaceSite_ = nullptr;  // held while in-place active
-  bool siteIsEx_ = false;                   // inPlaceSite_ answers IOleInPlaceSiteEx
-  IOleInPlaceFrame* frame_ = nullptr;       // held while UI-active
-  IOleInPlaceUIWindow* document_ = nullptr; // held while UI-active
+  br::com::ComRef<IOleClientSite> site_;
+  br::com::ComRef<IOleInPlaceSite> inPlaceSite_;  // held while in-place active
+  bool siteIsEx_ = false;                         // inPlaceSite_ answers IOleInPlaceSiteEx
+  br::com::ComRef<IOleInPlaceFrame> frame_;       // held while UI-active
+  br::com::ComRef<IOleInPlaceUIWindow> document_; // held while UI-active
   bool uiActive_ = false;
   HWND window_ = nullptr;
   SIZEL extent_{};
   bool extentKnown_ = false;
   bool dirty_ = false;
-  IOleAdviseHolder* adviseHolder_ = nullptr;
+  br::com::ComRef<IOleAdviseHolder> adviseHolder_;
 
   OleObjectFace oleObject_;
   InPlaceObjectFace inPlaceObject_;

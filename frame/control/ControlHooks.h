@@ -18,8 +18,9 @@ public:
   // A message to the control's window, before the frame's own handling. Answers true
   // (and the result) when the control took it.
   virtual bool OnMessage(HWND window, UINT message, WPARAM wParam, LPARAM lParam, LRESULT& result) = 0;
-  // Makes the control's window as a child of parent at position; null on failure.
-  virtual HWND CreateWindowIn(HWND parent, const RECT& position) = 0;
+  // The control's own window has the keyboard focus: hands it on to the child window that
+  // takes the keys. False when the control has none (the focus stays where it is).
+  virtual bool PassFocus() = 0;
 
   // IEmbeddedControl slots 1, 3 and 4.
   virtual HRESULT SetPalette(const VARIANT& palette) = 0;

@@ -15,7 +15,6 @@
 
 #include "frame/com/DispatchObject.h"
 #include "frame/control/ControlCore.h"
-#include "frame/control/ControlWindow.h"
 
 #include "toolkit/core/Palette.h"
 
@@ -51,9 +50,9 @@ protected:
   // ---- hooks a control overrides
   virtual void Paint(HDC dc, const RECT& client) = 0;
   virtual bool OnMessage(HWND, UINT, WPARAM, LPARAM, LRESULT&) { return false; }
-  virtual HWND CreateWindowIn(HWND parent, const RECT& position) {
-    return ControlWindow::Create(core_, parent, position);
-  }
+  // The control's window got the focus: a control with child windows hands it on to the
+  // one that takes the keys. By default the focus stays on the control's window.
+  virtual bool PassFocus() { return false; }
   // IEmbeddedControl slot 1: a valid array replaces the shared palette; the control
   // repaints either way.
   virtual HRESULT SetPalette(const VARIANT& palette) {
@@ -85,9 +84,7 @@ private:
     bool OnMessage(HWND window, UINT message, WPARAM wParam, LPARAM lParam, LRESULT& result) override {
       return control_.OnMessage(window, message, wParam, lParam, result);
     }
-    HWND CreateWindowIn(HWND parent, const RECT& position) override {
-      return control_.CreateWindowIn(parent, position);
-    }
+    bool PassFocus() override { return control_.PassFocus(); }
     HRESULT SetPalette(const VARIANT& palette) override { return control_.SetPalette(palette); }
     HRESULT SetFont(IFont* font) override { return control_.SetFont(font); }
     HRESULT GetPreferredSize(long* width, long* height) override {

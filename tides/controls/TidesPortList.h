@@ -3,7 +3,8 @@
 // by name, and fires SelectChanged with the port of the row the user picks.
 #pragma once
 
-#include "frame/control/ControlObject.h"
+#include "frame/com/ComRef.h"
+#include "frame/control/ToolkitControl.h"
 #include "tides/controls/TidesPortListPanel.h"
 
 #include "BR_Info.h"
@@ -13,7 +14,7 @@
 
 namespace br::tides {
 
-class TidesPortList final : public br::control::ControlObject<TidesPortList, ITidesPortList> {
+class TidesPortList final : public br::control::ToolkitControl<TidesPortList, ITidesPortList> {
 public:
   static const br::com::ClassIdentity kClass;
   static const Entry kInterfaces[];
@@ -26,15 +27,15 @@ public:
   STDMETHODIMP get_Selected(IUnknown** port) override;
 
   // For tests and hosts inside the library: the table, null before the window.
-  toolkit::Table* Table() const { return panel_ ? &panel_->table() : nullptr; }
+  toolkit::Table* Table() const { return Panel() ? &Panel()->table() : nullptr; }
   size_t PortCount() const { return ports_.size(); }
 
 protected:
-  void Paint(HDC dc, const RECT& client) override;
-  bool OnMessage(HWND window, UINT message, WPARAM wParam, LPARAM lParam, LRESULT& result) override;
-  HRESULT SetPalette(const VARIANT& palette) override;
-  HRESULT SetFont(IFont* font) override;
-  HRESULT TranslateAccelerator(MSG* message) override;
+  std::unique_ptr<toolkit::Container> MakeContent() override;
+  void ContentMade() override;
+  void ContentGoing() override;
+  void FontChanged() override;
+  toolkit::cXComponent* FocusChild() override;
 
 private:
   // Passes the panel's row selections on to the control.
@@ -47,17 +48,15 @@ private:
     TidesPortList& list_;
   };
 
+  TidesPortListPanel* Panel() const { return static_cast<TidesPortListPanel*>(Content()); }
   void PortRowSelected(int index);
-  void BuildContent(HWND window);
-  void DestroyContent();
   void ClearPorts();
   void TakePorts(const VARIANT& portList);
   void Fill();
-  void LayOut(HWND window);
+  void FitColumn();
 
-  std::vector<IUnknown*> ports_;
+  std::vector<br::com::ComRef<IUnknown>> ports_;
   SelectionRelay relay_{*this};
-  std::unique_ptr<TidesPortListPanel> panel_;
 };
 
 }  // namespace br::tides

@@ -32,7 +32,6 @@ const TidesWindow::Entry TidesWindow::kInterfaces[] = {
 };
 
 TidesWindow::~TidesWindow() {
-  if (port_) port_->Release();
   if (font_) DeleteObject(font_);
 }
 
@@ -40,29 +39,19 @@ TidesWindow::~TidesWindow() {
 
 STDMETHODIMP TidesWindow::SetPort(IUnknown* port) {
   return Guard([&] {
-    if (port_) {
-      ITidesPort* old = port_;
-      port_ = nullptr;
-      old->Release();
-    }
+    port_.Reset();
     if (!port) return S_FALSE;
-    ITidesPort* tidesPort = nullptr;
-    if (FAILED(port->QueryInterface(IID_ITidesPort, reinterpret_cast<void**>(&tidesPort))) || !tidesPort) {
-      return E_INVALIDARG;
-    }
-    port_ = tidesPort;
+    auto tidesPort = br::com::ComRef<IUnknown>(port).Query<ITidesPort>(IID_ITidesPort);
+    if (!tidesPort) return E_INVALIDARG;
+    port_ = std::move(tidesPort);
     return S_OK;
   });
 }
 
 STDMETHODIMP TidesWindow::Calculate(double step, double predictDate) {
   return Guard([&] {
-    if (ITidesPort* port = port_) {
-      // The port's Calculated sinks may replace our port while it calculates.
-      port->AddRef();
-      port->Calculate(step, predictDate);
-      port->Release();
-    }
+    // The port's Calculated sinks may replace our port while it calculates.
+    if (const br::com::ComRef<ITidesPort> port = port_) port->Calculate(step, predictDate);
     Repaint();
     return S_OK;
   });
@@ -143,12 +132,8 @@ HRESULT TidesWindow::SetFeet(LONG feet) {
 void TidesWindow::Paint(HDC dc, const RECT& client) {
   graph::TideDay day;
   bool haveDay = false;
-  if (ITidesPort* port = port_) {
-    // A port of another make may take itself away from us inside one of its getters.
-    port->AddRef();
-    haveDay = ReadTideDay(port, day);
-    port->Release();
-  }
+  // A port of another make may take itself away from us inside one of its getters.
+  if (const br::com::ComRef<ITidesPort> port = port_) haveDay = ReadTideDay(port.Get(), day);
   TideGraphStyle style;
   style.font = font_;
   style.drawText = drawText_ != 0;
@@ -205,13 +190,9 @@ bool TidesWindow::OnMessage(HWND window, UINT message, WPARAM wParam, LPARAM lPa
 }
 
 bool TidesWindow::ReportPointer(HWND window, unsigned pointerX) {
-  ITidesPort* port = port_;
-  if (!port) return false;
   // Held for the reading: a port of another make may take itself away inside a getter.
-  port->AddRef();
-  const bool fired = ReportPointerOf(port, window, pointerX);
-  port->Release();
-  return fired;
+  const br::com::ComRef<ITidesPort> port = port_;
+  return port && ReportPointerOf(port.Get(), window, pointerX);
 }
 
 bool TidesWindow::ReportPointerOf(ITidesPort* port, HWND window, unsigned pointerX) {
@@ -231,7 +212,7 @@ bool TidesWindow::ReportPointerOf(ITidesPort* port, HWND window, unsigned pointe
   double value = 0.0;
   if (FAILED(port->get_WavePoint(reading.index, &value))) return false;
   // Taken away while we read it: the day under the pointer is no longer the one shown.
-  if (port != port_) return false;
+  if (port != port_.Get()) return false;
 
   VARIANT arguments[2];  // in reverse order: MouseAction(Time, WaveValue)
   arguments[1].vt = VT_R8;

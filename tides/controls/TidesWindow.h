@@ -3,6 +3,7 @@
 // curve) and fires MouseAction with the time and height under the pointer.
 #pragma once
 
+#include "frame/com/ComRef.h"
 #include "frame/control/ControlObject.h"
 #include "tides/controls/UnitsOptionFace.h"
 
@@ -49,7 +50,7 @@ private:
   // Fields in the order the graph keeps them, with their first values.
   LONG bottomMargin_ = 8;
   LONG leftMargin_ = 8;
-  ITidesPort* port_ = nullptr;
+  br::com::ComRef<ITidesPort> port_;
   HFONT font_ = nullptr;
   double scaleMax_ = 0.0;
   double scaleMin_ = 0.0;

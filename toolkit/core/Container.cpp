@@ -253,6 +253,14 @@ void Container::transferFocus() {
     if (order[i]->hasHandle(focus)) current = static_cast<int>(i);
   }
   const int n = static_cast<int>(order.size());
+  // Past either end the window around the tree (a control's own window, a dialog) is
+  // asked to move the focus on; the focus wraps around only if it stayed in the tree.
+  const HWND root = getHandle();
+  if (current == (backwards ? 0 : n - 1) && root && (GetWindowLongPtrA(root, GWL_STYLE) & WS_CHILD)) {
+    SendMessageA(GetAncestor(root, GA_PARENT), WM_NEXTDLGCTL, backwards ? 1 : 0, FALSE);
+    focus = GetFocus();
+    if (focus != root && !IsChild(root, focus)) return;
+  }
   int next;
   if (current < 0) next = backwards ? n - 1 : 0;
   else next = backwards ? (current + n - 1) % n : (current + 1) % n;

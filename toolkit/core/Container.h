@@ -33,7 +33,8 @@ public:
   // Keeps the focus where it is when it already lies inside this container.
   void requestFocus() override;
   // At the root: Tab moves the focus to the next focusable component of the tree
-  // (Shift+Tab to the previous one), wrapping around.
+  // (Shift+Tab to the previous one). Past the last (first) one the parent window gets
+  // WM_NEXTDLGCTL to take the focus out of the tree; if it does not, the focus wraps around.
   void transferFocus() override;
   bool hasHandle(HWND hwnd) const override;
   // A new font of the container is lent on to its children.

@@ -63,12 +63,10 @@ ITidesDatabase* OpenedDatabase(const DllUnderTest& dll, const std::wstring& fold
 }
 
 ITidesPort* PortAt(ITidesDatabase* database, long index) {
-  IUnknown* unknown = nullptr;
-  REQUIRE(database->GetPort(index, &unknown) == S_OK);
-  REQUIRE(unknown != nullptr);
-  ITidesPort* port = Query<ITidesPort>(unknown);
-  unknown->Release();
-  return port;
+  ComRef<IUnknown> unknown;
+  REQUIRE(database->GetPort(index, unknown.Out()) == S_OK);
+  REQUIRE(unknown);
+  return Query<ITidesPort>(unknown.Get()).Detach();
 }
 
 }  // namespace br::test

@@ -10,6 +10,7 @@
 #include <string>
 
 #include "BR_Info.h"
+#include "frame/com/ComRef.h"
 
 namespace br::test {
 
@@ -53,19 +54,15 @@ private:
 ITidesDatabase* OpenedDatabase(const DllUnderTest& dll, const std::wstring& folder);
 ITidesPort* PortAt(ITidesDatabase* database, long index);
 
-// The interface I of an object: a new reference, REQUIREd.
-template <class I>
-I* Query(IUnknown* object) {
-  I* face = nullptr;
-  REQUIRE(object->QueryInterface(__uuidof(I), reinterpret_cast<void**>(&face)) == S_OK);
-  REQUIRE(face != nullptr);
-  return face;
-}
+using br::com::ComRef;
 
-// Releases an interface pointer and nulls it.
+// The interface I of an object, REQUIREd.
 template <class I>
-void ReleaseAndNull(I*& p) {
-  if (p) p->Release(), p = nullptr;
+ComRef<I> Query(IUnknown* object) {
+  ComRef<I> face;
+  REQUIRE(object->QueryInterface(__uuidof(I), face.OutVoid()) == S_OK);
+  REQUIRE(face);
+  return face;
 }
 
 // Current reference count of an object (AddRef then Release).

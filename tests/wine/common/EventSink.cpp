@@ -5,26 +5,18 @@
 namespace br::test {
 
 bool EventSink::Connect(IUnknown* source) {
-  IConnectionPointContainer* container = nullptr;
-  if (FAILED(source->QueryInterface(IID_IConnectionPointContainer, reinterpret_cast<void**>(&container))))
-    return false;
-  const HRESULT found = container->FindConnectionPoint(events_, &point_);
-  container->Release();
-  if (FAILED(found)) return false;
+  const auto container = br::com::ComRef<IUnknown>(source).Query<IConnectionPointContainer>(IID_IConnectionPointContainer);
+  if (!container || FAILED(container->FindConnectionPoint(events_, point_.Out()))) return false;
   if (FAILED(point_->Advise(static_cast<IDispatch*>(this), &cookie_))) {
-    point_->Release();
-    point_ = nullptr;
+    point_.Reset();
     return false;
   }
   return true;
 }
 
 void EventSink::Disconnect() {
-  if (!point_) return;
-  IConnectionPoint* point = point_;
-  point_ = nullptr;
-  point->Unadvise(cookie_);
-  point->Release();
+  const br::com::ComRef<IConnectionPoint> point = std::move(point_);
+  if (point) point->Unadvise(cookie_);
 }
 
 STDMETHODIMP EventSink::QueryInterface(REFIID riid, void** out) {
@@ -57,11 +49,10 @@ STDMETHODIMP EventSink::Invoke(DISPID id, REFIID riid, LCID locale, WORD flags, 
 }
 
 std::wstring PortName(IUnknown* port) {
-  ITidesPort* tides = nullptr;
-  if (!port || FAILED(port->QueryInterface(IID_ITidesPort, reinterpret_cast<void**>(&tides)))) return L"";
+  const auto tides = br::com::ComRef<IUnknown>(port).Query<ITidesPort>(IID_ITidesPort);
   BSTR name = nullptr;
-  const std::wstring out = SUCCEEDED(tides->get_PortName(&name)) && name ? name : L"";
-  return SysFreeString(name), tides->Release(), out;
+  const std::wstring out = tides && SUCCEEDED(tides->get_PortName(&name)) && name ? name : L"";
+  return SysFreeString(name), out;
 }
 
 }  // namespace br::test

@@ -2,6 +2,8 @@
 // arguments, and can run an action from inside a call.
 #pragma once
 
+#include "frame/com/ComRef.h"
+
 #include <windows.h>
 #include <oaidl.h>
 #include <ocidl.h>
@@ -47,7 +49,7 @@ public:
 private:
   const IID& events_;
   ULONG refs_ = 0;
-  IConnectionPoint* point_ = nullptr;
+  br::com::ComRef<IConnectionPoint> point_;
   DWORD cookie_ = 0;
 };
 

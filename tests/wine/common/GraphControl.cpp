@@ -33,7 +33,7 @@ void CheckBandRow(const Canvas& canvas, int y, int dayFrom, int dayTo, int twili
   CHECK(wrong == 0);
 }
 
-GraphControl::GraphControl(const DllUnderTest& dll) { REQUIRE(dll.Create(CLSID_TidesWindow, &window_) == S_OK); }
+GraphControl::GraphControl(const DllUnderTest& dll) { REQUIRE(dll.Create(CLSID_TidesWindow, window_.Out()) == S_OK); }
 
 HRESULT GraphControl::SetDrawText(long value) {
   VARIANT v;

@@ -36,13 +36,13 @@ class GraphControl {
 public:
   explicit GraphControl(const DllUnderTest& dll);
   ~GraphControl() { Release(); }
-  ITidesWindow* operator->() const { return window_; }
-  ITidesWindow* Get() const { return window_; }
+  ITidesWindow* operator->() const { return window_.Get(); }
+  ITidesWindow* Get() const { return window_.Get(); }
   HRESULT SetDrawText(long value);
-  void Release() { ReleaseAndNull(window_); }
+  void Release() { window_.Reset(); }
 
 private:
-  ITidesWindow* window_ = nullptr;
+  ComRef<ITidesWindow> window_;
 };
 
 }  // namespace br::test

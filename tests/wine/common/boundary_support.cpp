@@ -87,7 +87,7 @@ std::vector<TestStation> ThreeStations() {
 }
 
 OpenTides::OpenTides(const std::vector<TestStation>& stations, bool open) : folder(stations) {
-  REQUIRE(dll.Create(CLSID_TidesDatabase, &db) == S_OK);
+  REQUIRE(dll.Create(CLSID_TidesDatabase, db.Out()) == S_OK);
   if (open) REQUIRE(db->Initialize(Variant::Bstr(folder.Path()).get().bstrVal) == S_OK);
 }
 
@@ -112,31 +112,26 @@ std::vector<ULONG> RefCounts(const std::vector<IUnknown*>& objects) {
 }
 
 void AdviseOnly(IUnknown* source, const IID& events, EventSink& sink) {
-  IConnectionPointContainer* container = Query<IConnectionPointContainer>(source);
-  IConnectionPoint* point = nullptr;
-  REQUIRE(container->FindConnectionPoint(events, &point) == S_OK);
-  container->Release();
+  ComRef<IConnectionPoint> point;
+  REQUIRE(Query<IConnectionPointContainer>(source)->FindConnectionPoint(events, point.Out()) == S_OK);
   DWORD cookie = 0;
   REQUIRE(point->Advise(static_cast<IDispatch*>(&sink), &cookie) == S_OK);
-  point->Release();
 }
 
 HostedControl::HostedControl(const DllUnderTest& dll, const CLSID& clsid, int width, int height) {
   atl_.WinInit();
-  REQUIRE(dll.Create(clsid, IID_IUnknown, reinterpret_cast<void**>(&control_)) == S_OK);
+  REQUIRE(dll.Create(clsid, IID_IUnknown, control_.OutVoid()) == S_OK);
   REQUIRE((host_ = AtlHost::MakeWindow(width, height)) != nullptr);
-  REQUIRE(atl_.Attach(control_, host_, &site_) == S_OK);
-  IOleWindow* window = Query<IOleWindow>();
-  window->GetWindow(&window_);
-  window->Release();
+  REQUIRE(atl_.Attach(control_.Get(), host_, site_.Out()) == S_OK);
+  Query<IOleWindow>()->GetWindow(&window_);
   REQUIRE(window_ != nullptr);
 }
 
 void HostedControl::Close() {
   if (host_) DestroyWindow(host_);
   host_ = window_ = nullptr;
-  ReleaseAndNull(site_);
-  ReleaseAndNull(control_);
+  site_.Reset();
+  control_.Reset();
 }
 
 }  // namespace br::test::boundary

@@ -138,16 +138,16 @@ inline const TestStation kHarbour = {"Harbour", 1200, -300, -1, {{0, 2000, 0}, {
 struct OpenTides {
   StationFolder folder;
   DllUnderTest dll;
-  ITidesDatabase* db = nullptr;
+  ComRef<ITidesDatabase> db;
   std::vector<IUnknown*> ports;  // held until Finish
   explicit OpenTides(const std::vector<TestStation>& stations, bool open = true);
   ~OpenTides() { Finish(); }
-  ITidesPort* Port(long index) const { return PortAt(db, index); }
+  ITidesPort* Port(long index) const { return PortAt(db.Get(), index); }
   const std::vector<IUnknown*>& Ports(long count);  // the first count by GetPort, into ports
   HRESULT Finish() {
     for (IUnknown* p : ports) p->Release();
     ports.clear();
-    ReleaseAndNull(db);
+    db.Reset();
     return dll.CanUnloadNow();
   }
 };
@@ -164,12 +164,12 @@ public:
   ~HostedControl() { Close(); }
   HostedControl(const HostedControl&) = delete;
 
-  IUnknown* Control() const { return control_; }  // null after Close
-  HWND Window() const { return window_; }          // the control's own window
+  IUnknown* Control() const { return control_.Get(); }  // null after Close
+  HWND Window() const { return window_; }                // the control's own window
   template <class I>
-  I* Query() const {  // a new reference, REQUIREd
-    REQUIRE(control_ != nullptr);
-    return br::test::Query<I>(control_);
+  ComRef<I> Query() const {  // REQUIREd
+    REQUIRE(control_);
+    return br::test::Query<I>(control_.Get());
   }
   void Paint() const { RedrawWindow(window_, nullptr, nullptr, RDW_INVALIDATE | RDW_UPDATENOW | RDW_ALLCHILDREN); }
   void MouseMove(int x, int y = 50) const { SendMessageW(window_, WM_MOUSEMOVE, 0, MAKELPARAM(x, y)); }
@@ -180,8 +180,8 @@ private:
   AtlHost atl_;
   HWND host_ = nullptr;
   HWND window_ = nullptr;
-  IUnknown* control_ = nullptr;
-  IUnknown* site_ = nullptr;
+  ComRef<IUnknown> control_;
+  ComRef<IUnknown> site_;
 };
 
 }  // namespace br::test::boundary

@@ -45,12 +45,12 @@ TEST_CASE("a plain object: its interfaces, error information support and one con
     IUnknown* face = nullptr;
     CHECK(object->QueryInterface(*iid, reinterpret_cast<void**>(&face)) == E_NOINTERFACE);
   }
-  ISupportErrorInfo* support = br::test::Query<ISupportErrorInfo>(object);
+  auto support = br::test::Query<ISupportErrorInfo>(object);
   CHECK(support->InterfaceSupportsErrorInfo(IID_ITidesPort) == S_OK);
   CHECK(support->InterfaceSupportsErrorInfo(IID_IDispatch) == S_FALSE);
-  support->Release();
+  support.Reset();
 
-  IConnectionPointContainer* container = br::test::Query<IConnectionPointContainer>(object);
+  auto container = br::test::Query<IConnectionPointContainer>(object);
   IConnectionPoint* point = reinterpret_cast<IConnectionPoint*>(1);
   CHECK(container->FindConnectionPoint(DIID__ITidesDatabaseEvents, &point) == CONNECT_E_NOCONNECTION);
   CHECK(point == nullptr);
@@ -71,7 +71,7 @@ TEST_CASE("a plain object: its interfaces, error information support and one con
   CHECK(point->Advise(&plain, &cookie) == CONNECT_E_CANNOTCONNECT);
   CHECK(point->Unadvise(12345) == CONNECT_E_NOCONNECTION);
   point->Release();
-  container->Release();
+  container.Reset();
   object->Release();
   CHECK(dll.CanUnloadNow() == S_OK);
 }

@@ -69,7 +69,7 @@ TEST_CASE("IEmbeddedControl palette: only a one-dimensional array of 20 four-byt
   for (int i = 0; i < 20; ++i) before.push_back(RGB(10 + i, 2 * i + 1, 245)), given.push_back(RGB(90 + i, 2 * i, 165));
   for (const auto& [name, clsid] : kControls) {
     HostedControl hosted(dll, *clsid);
-    IEmbeddedControl* embedded = hosted.Query<IEmbeddedControl>();
+    auto embedded = hosted.Query<IEmbeddedControl>();
     // Puts the old palette back, sets the value, and tells whether it replaced it.
     auto replaced = [&](VARIANT& value) {
       REQUIRE(embedded->SetPalette(Variant::Array(VT_I4, MakeLongArray(before)).get()) == S_OK);
@@ -107,7 +107,7 @@ TEST_CASE("IEmbeddedControl palette: only a one-dimensional array of 20 four-byt
     CHECK(embedded->SetFont(-1, nullptr, LONG_MAX) == S_OK);
     CHECK(embedded->Reserved(LONG_MIN, LONG_MAX) == S_OK);
     hosted.Paint();
-    embedded->Release();
+    embedded.Reset();
   }
   probe->Release();
   CHECK(dll.CanUnloadNow() == S_OK);

@@ -51,7 +51,7 @@ void CheckFlat(const char* what, const std::function<void(int)>& action) {
 void CheckControl(const DllUnderTest& dll, const CLSID& clsid, const std::function<void(IUnknown*)>& prepare) {
   HostedControl hosted(dll, clsid);
   prepare(hosted.Control());
-  IEmbeddedControl* embedded = hosted.Query<IEmbeddedControl>();
+  auto embedded = hosted.Query<IEmbeddedControl>();
   const HWND window = hosted.Window();
   CheckFlat("paints", [&](int) {
     RedrawWindow(window, nullptr, nullptr, RDW_INVALIDATE | RDW_ERASE | RDW_UPDATENOW | RDW_ALLCHILDREN);
@@ -78,7 +78,7 @@ void CheckControl(const DllUnderTest& dll, const CLSID& clsid, const std::functi
     embedded->SetPalette(Variant::Array(VT_I4, MakeLongArray(colours)).get());
     UpdateWindow(window);
   });
-  embedded->Release();
+  embedded.Reset();
 }
 
 }  // namespace
@@ -88,17 +88,17 @@ TEST_CASE("TidesWindow and TidesPortList: paints, font changes and palette repla
   const std::vector<IUnknown*>& ports = t.Ports(3);
   SUBCASE("TidesWindow") {
     CheckControl(t.dll, CLSID_TidesWindow, [&](IUnknown* control) {
-      ITidesWindow* window = Query<ITidesWindow>(control);
+      auto window = Query<ITidesWindow>(control);
       REQUIRE(window->SetPort(ports[0]) == S_OK);
       REQUIRE(window->Calculate(0.25, 36526.0) == S_OK);
-      window->Release();
+      window.Reset();
     });
   }
   SUBCASE("TidesPortList") {
     CheckControl(t.dll, CLSID_TidesPortList, [&](IUnknown* control) {
-      ITidesPortList* list = Query<ITidesPortList>(control);
+      auto list = Query<ITidesPortList>(control);
       REQUIRE(list->SetPortList(Variant::Array(VT_UNKNOWN, MakeUnknownArray(ports)).get()) == S_OK);
-      list->Release();
+      list.Reset();
     });
   }
   CHECK(t.Finish() == S_OK);

@@ -54,12 +54,12 @@ TEST_CASE("ITidesPortList SetPortList: every form of list, on a window, answers 
   OpenTides t(ThreeStations());
   const std::vector<IUnknown*>& ports = t.Ports(3);
   HostedControl hosted(t.dll, CLSID_TidesPortList);
-  ITidesPortList* list = hosted.Query<ITidesPortList>();
+  auto list = hosted.Query<ITidesPortList>();
   EventSink sink(DIID__ITidesPortListEvents);
-  REQUIRE(sink.Connect(list));
+  REQUIRE(sink.Connect(list.Get()));
   const std::vector<ULONG> base = RefCounts(ports);
   CHECK(list->get_Selected(nullptr) == E_POINTER);
-  for (const ListRow& row : Rows(ports, t.db)) {
+  for (const ListRow& row : Rows(ports, t.db.Get())) {
     INFO(row.what);
     {
       Variant value = row.make();
@@ -67,7 +67,7 @@ TEST_CASE("ITidesPortList SetPortList: every form of list, on a window, answers 
       for (std::size_t i = 0; i < expected.size(); ++i) expected[i] += row.taken[i];
       const int before = sink.calls;
       CHECK(list->SetPortList(value.get()) == S_OK);
-      CHECK(SelectedName(list) == row.selected);
+      CHECK(SelectedName(list.Get()) == row.selected);
       CHECK(sink.calls - before == row.events);
       CHECK(RefCounts(ports) == expected);
     }
@@ -75,7 +75,7 @@ TEST_CASE("ITidesPortList SetPortList: every form of list, on a window, answers 
     CHECK(RefCounts(ports) == base);
   }
   sink.Disconnect();
-  list->Release();
+  list.Reset();
   hosted.Close();
   CHECK(RefCounts(ports) == base);
   CHECK(t.Finish() == S_OK);

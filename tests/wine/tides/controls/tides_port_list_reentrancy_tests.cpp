@@ -14,7 +14,7 @@ struct List {
   OpenTides tides{ThreeStations()};
   std::vector<IUnknown*> ports = tides.Ports(3);
   HostedControl hosted{tides.dll, CLSID_TidesPortList};
-  ITidesPortList* list = hosted.Query<ITidesPortList>();
+  ComRef<ITidesPortList> list = hosted.Query<ITidesPortList>();
 
   HRESULT SetAll() { return list->SetPortList(Variant::Array(VT_UNKNOWN, MakeUnknownArray(ports)).get()); }
   // The table: the innermost window under the control's.
@@ -28,7 +28,7 @@ struct List {
     SendMessageW(table, WM_KEYDOWN, key, 1);
     SendMessageW(table, WM_KEYUP, key, 0xC0000001);
   }
-  HRESULT Finish() { return ReleaseAndNull(list), hosted.Close(), tides.Finish(); }
+  HRESULT Finish() { return list.Reset(), hosted.Close(), tides.Finish(); }
 };
 
 }  // namespace
@@ -36,12 +36,12 @@ struct List {
 TEST_CASE("a SelectChanged sink that clears the list from inside the event fired by a fill") {
   List l;
   EventSink sink(DIID__ITidesPortListEvents);
-  REQUIRE(sink.Connect(l.list));
+  REQUIRE(sink.Connect(l.list.Get()));
   const std::vector<ULONG> base = RefCounts(l.ports);
   sink.onCall = [&] { CHECK(l.list->SetPortList(Variant::Empty().get()) == S_OK); };
   CHECK(l.SetAll() == S_OK);  // fills, selects the first name, fires, and is emptied inside
   CHECK(sink.calls == 1);
-  CHECK(SelectedName(l.list).empty());
+  CHECK(SelectedName(l.list.Get()).empty());
   CHECK(RefCounts(l.ports) == base);
   l.Key(VK_DOWN);  // no rows: nothing to select
   CHECK(sink.calls == 1);
@@ -52,18 +52,18 @@ TEST_CASE("a SelectChanged sink that clears the list from inside the event fired
 TEST_CASE("a SelectChanged sink that disconnects itself, and one that closes the host, while the table selects") {
   List l;
   EventSink leaving(DIID__ITidesPortListEvents), closing(DIID__ITidesPortListEvents);
-  REQUIRE(leaving.Connect(l.list));
+  REQUIRE(leaving.Connect(l.list.Get()));
   leaving.onCall = [&] { leaving.Disconnect(); };
   REQUIRE(l.SetAll() == S_OK);
   CHECK(leaving.calls == 1);
   l.Key(VK_DOWN);
   CHECK(leaving.calls == 1);
 
-  REQUIRE(closing.Connect(l.list));
+  REQUIRE(closing.Connect(l.list.Get()));
   const HWND controlWindow = l.hosted.Window();
   closing.onCall = [&] {
     closing.Disconnect();
-    ReleaseAndNull(l.list);  // the test's references go; the host's goes with its window
+    l.list.Reset();  // the test's references go; the host's goes with its window
     l.hosted.Close();
   };
   l.Key(VK_DOWN);  // the table is inside its own key handling when its window goes

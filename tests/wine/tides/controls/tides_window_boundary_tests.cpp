@@ -18,21 +18,21 @@ constexpr int kWidth = 300, kHeight = 200;
 struct Graph {
   OpenTides tides{{kHarbour}};
   HostedControl hosted{tides.dll, CLSID_TidesWindow, kWidth, kHeight};
-  ITidesWindow* window = hosted.Query<ITidesWindow>();
-  ITidesPort* port = tides.Port(0);
+  ComRef<ITidesWindow> window = hosted.Query<ITidesWindow>();
+  ComRef<ITidesPort> port = ComRef<ITidesPort>::Adopt(tides.Port(0));
 
   Graph() {
     REQUIRE(port->Calculate(1.0, 36526.0) == S_OK);
-    REQUIRE(window->SetPort(port) == S_OK);
+    REQUIRE(window->SetPort(port.Get()) == S_OK);
   }
   // Draws, paints, and moves the pointer across the plot and far outside it.
   void Exercise() const {
     Canvas canvas(kWidth, kHeight);
-    CHECK(DrawControl(window, canvas) == S_OK);
+    CHECK(DrawControl(window.Get(), canvas) == S_OK);
     hosted.Paint();
     for (int x : {0, 9, 150, 290, 299, 65535}) hosted.MouseMove(x);
   }
-  HRESULT Finish() { return window->Release(), port->Release(), hosted.Close(), tides.Finish(); }
+  HRESULT Finish() { return window.Reset(), port.Reset(), hosted.Close(), tides.Finish(); }
 };
 
 // The two properties and a sample of the picture.
@@ -56,8 +56,8 @@ HRESULT Put(ITidesWindow* w, TW_PROPERTY code, Variant value) { return w->put_Pr
 
 TEST_CASE("ITidesWindow Property and IUnitsOption: wrong codes, types, by-reference forms and formats change nothing") {
   Graph g;
-  ITidesWindow* w = g.window;
-  IUnitsOption* units = g.hosted.Query<IUnitsOption>();
+  ITidesWindow* w = g.window.Get();
+  auto units = g.hosted.Query<IUnitsOption>();
   auto setUnits = [&](Variant v) { return units->SetUnits(v.get()); };
   LONG drawText = 1;
   BSTR format = SysAllocString(L"%.1f");
@@ -99,7 +99,7 @@ TEST_CASE("ITidesWindow Property and IUnitsOption: wrong codes, types, by-refere
   REQUIRE(w->get_Property(TW_FORMATTEXT, &v) == S_OK);
   CHECK(std::wstring(v.bstrVal) == L"%.2f");
   VariantClear(&v);
-  units->Release();
+  units.Reset();
   CHECK(g.Finish() == S_OK);
 }
 

@@ -9,14 +9,14 @@ namespace {
 struct Graph {
   OpenTides tides{{kHarbour}};
   HostedControl hosted{tides.dll, CLSID_TidesWindow};
-  ITidesWindow* window = hosted.Query<ITidesWindow>();
+  ComRef<ITidesWindow> window = hosted.Query<ITidesWindow>();
 
   void Paint() {
     Canvas canvas(300, 200);
-    CHECK(DrawControl(window, canvas) == S_OK);
+    CHECK(DrawControl(window.Get(), canvas) == S_OK);
     hosted.Paint();
   }
-  HRESULT Finish() { return ReleaseAndNull(window), hosted.Close(), tides.Finish(); }
+  HRESULT Finish() { return window.Reset(), hosted.Close(), tides.Finish(); }
 };
 
 }  // namespace
@@ -28,8 +28,8 @@ TEST_CASE("MouseAction sinks that take the port away, recalculate and disconnect
   REQUIRE(g.window->Calculate(1.0, 36526.0) == S_OK);
   g.Paint();
   EventSink first(DIID__ITidesWindowEvents), second(DIID__ITidesWindowEvents);
-  REQUIRE(first.Connect(g.window));
-  REQUIRE(second.Connect(g.window));
+  REQUIRE(first.Connect(g.window.Get()));
+  REQUIRE(second.Connect(g.window.Get()));
   first.onCall = [&] {
     CHECK(g.window->Calculate(0.5, 36527.0) == S_OK);  // repaints inside the event
     CHECK(g.window->SetPort(nullptr) == S_FALSE);

@@ -10,7 +10,6 @@
 #include <olectl.h>
 
 #include <algorithm>
-#include <memory>
 
 using namespace br::test;
 
@@ -24,7 +23,7 @@ struct Graph {
   FakeTidesPort port;
   GraphControl graph{dll};
   HWND host = nullptr;
-  IUnknown* site = nullptr;
+  ComRef<IUnknown> site;
   HWND window = nullptr;
 
   Graph() {
@@ -35,16 +34,15 @@ struct Graph {
   }
   ~Graph() {
     if (host) DestroyWindow(host);
-    ReleaseAndNull(site);
   }
-  // An interface of the graph (or of another control), released with the pointer.
+  // An interface of the graph (or of another control).
   template <class I>
-  std::unique_ptr<I, void (*)(I*)> Face(IUnknown* of = nullptr) const {
-    return {Query<I>(of ? of : graph.Get()), [](I* face) { face->Release(); }};
+  ComRef<I> Face(IUnknown* of = nullptr) const {
+    return Query<I>(of ? of : graph.Get());
   }
   void Host() {
     REQUIRE((host = AtlHost::MakeWindow(300, 200)) != nullptr);
-    REQUIRE(atl.Attach(graph.Get(), host, &site) == S_OK);
+    REQUIRE(atl.Attach(graph.Get(), host, site.Out()) == S_OK);
     CHECK(Face<IOleWindow>()->GetWindow(&window) == S_OK);
     REQUIRE(window != nullptr);
   }
@@ -52,7 +50,7 @@ struct Graph {
     if (host) DestroyWindow(host);  // the host closes the control and lets its site go
     CHECK_FALSE(IsWindow(window));
     host = nullptr;
-    ReleaseAndNull(site);
+    site.Reset();
     graph.Release();
     CHECK(port.References() == 0);
     return dll.CanUnloadNow();
@@ -76,10 +74,10 @@ TEST_CASE("a control answers every control interface, one object behind them all
   for (const IID* iid : answered) {
     IUnknown* face = nullptr;
     REQUIRE(g.graph->QueryInterface(*iid, reinterpret_cast<void**>(&face)) == S_OK);
-    CHECK(g.Face<IUnknown>(face).get() == identity.get());
+    CHECK(g.Face<IUnknown>(face).Get() == identity.Get());
     face->Release();
   }
-  identity.reset();
+  identity.Reset();
   QACONTAINER container{};
   container.cbSize = sizeof(container);
   container.pUnkEventSink = static_cast<IDispatch*>(&sink);
@@ -194,10 +192,10 @@ TEST_CASE("in the ATL host: a child window of its own paints Draw's picture; Mou
   CHECK(sink.calls == 2);
   sink.Disconnect();
   // Verbs: UI activation takes the focus, hide and show, the verbs a control has not; Close.
-  IOleClientSite* site = nullptr;
-  REQUIRE(g.Face<IOleObject>()->GetClientSite(&site) == S_OK);
+  ComRef<IOleClientSite> site;
+  REQUIRE(g.Face<IOleObject>()->GetClientSite(site.Out()) == S_OK);
   RECT position{0, 0, 300, 200};
-  const auto verb = [&](LONG v) { return g.Face<IOleObject>()->DoVerb(v, nullptr, site, 0, g.host, &position); };
+  const auto verb = [&](LONG v) { return g.Face<IOleObject>()->DoVerb(v, nullptr, site.Get(), 0, g.host, &position); };
   CHECK(verb(OLEIVERB_UIACTIVATE) == S_OK);
   CHECK(GetFocus() == g.window);
   CHECK(verb(OLEIVERB_HIDE) == S_OK);
@@ -210,7 +208,7 @@ TEST_CASE("in the ATL host: a child window of its own paints Draw's picture; Mou
   // Closing deactivates: the window goes, the site stays until the host lets it go.
   CHECK(g.Face<IOleObject>()->Close(OLECLOSE_NOSAVE) == S_OK);
   CHECK_FALSE(IsWindow(g.window));
-  site->Release();
+  site.Reset();
   CHECK(g.Finish() == S_OK);
 }
 

@@ -33,7 +33,7 @@ long PortCount(const VARIANT& list) {
 
 TEST_CASE("ITidesDatabase before Initialize: every member refuses and writes nothing; bad folders keep it closed") {
   OpenTides t(ThreeStations(), false);
-  ITidesDatabase* db = t.db;
+  ITidesDatabase* db = t.db.Get();
   Outs o;
   const std::wstring good = t.folder.Path();
   RunRows({
@@ -58,7 +58,7 @@ TEST_CASE("ITidesDatabase before Initialize: every member refuses and writes not
 
 TEST_CASE("ITidesDatabase after Initialize: null out-pointers, indices and boxes at the extremes") {
   OpenTides t(ThreeStations());
-  ITidesDatabase* db = t.db;
+  ITidesDatabase* db = t.db.Get();
   Outs o;
   auto portIsNull = [&] { return o.unknown == nullptr; };
   auto ports = [&](long n) {

@@ -19,20 +19,20 @@ void CheckWholeDay(ITidesPort* port, long points) {
 
 TEST_CASE("a sink that releases the last reference to the port inside Calculated") {
   OpenTides t({kHarbour});
-  ITidesPort* port = t.Port(0);
+  auto port = ComRef<ITidesPort>::Adopt(t.Port(0));
   EventSink sink(DIID__ITidesPortEvents);
-  AdviseOnly(port, DIID__ITidesPortEvents, sink);
-  REQUIRE(RefCount(port) == 1);
+  AdviseOnly(port.Get(), DIID__ITidesPortEvents, sink);
+  REQUIRE(RefCount(port.Get()) == 1);
   CHECK(sink.References() == 1);  // the connection's
   // Only the port's own hold keeps it alive until Calculate has returned.
   long seen = -1;  // the day is in place when the event comes, with no arguments
-  sink.onCall = [&] { seen = Points(port), ReleaseAndNull(port); };
+  sink.onCall = [&] { seen = Points(port.Get()), port.Reset(); };
   CHECK(port->Calculate(1.0, 36526.0) == S_OK);
   CHECK(sink.calls == 1);
   CHECK(seen == 25);
   CHECK(sink.lastId == 1);
   CHECK(sink.lastArgumentCount == 0);
-  CHECK(port == nullptr);
+  CHECK_FALSE(port);
   CHECK(sink.References() == 0);  // the port's end released its connection
   CHECK(t.Finish() == S_OK);
 }
@@ -46,7 +46,7 @@ TEST_CASE("sinks that disconnect themselves or others, release the database and 
   second.onCall = [&] {  // before third's turn; the inner round fires second alone
     third.Disconnect();
     if (second.calls > 1) return;
-    ReleaseAndNull(t.db);
+    t.db.Reset();
     CHECK(port->Calculate(0.25, 36527.0) == S_OK);
   };
   CHECK(port->Calculate(1.0, 36526.0) == S_OK);
