@@ -26,7 +26,9 @@ bool ControlWindow::RegisterOnce() {
 
 HWND ControlWindow::Create(ControlCore& core, HWND parent, const RECT& position) {
   if (!RegisterOnce()) return nullptr;
-  return CreateWindowExW(0, kClassName, L"", WS_CHILD | WS_VISIBLE | WS_CLIPCHILDREN | WS_CLIPSIBLINGS,
+  // A tab stop of the container: its dialog-style tabbing reaches the control, whose
+  // window hands the focus on to its focus child.
+  return CreateWindowExW(0, kClassName, L"", WS_CHILD | WS_VISIBLE | WS_CLIPCHILDREN | WS_CLIPSIBLINGS | WS_TABSTOP,
                          position.left, position.top, position.right - position.left,
                          position.bottom - position.top, parent, nullptr, br::com::Module::Instance(), &core);
 }

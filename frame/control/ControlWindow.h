@@ -13,7 +13,7 @@ public:
   // Window class name of the controls' windows.
   static constexpr const wchar_t* kClassName = L"BR_Info_Control";
 
-  // A visible child window of parent at position, serving core; null on failure.
+  // A visible child window of parent at position, a tab stop, serving core; null on failure.
   static HWND Create(ControlCore& core, HWND parent, const RECT& position);
 
 private:

@@ -429,7 +429,8 @@ int cXComponent::dispatchEvent(ToolkitEvent& event) {
       break;
     case kEventKeyUp: answer = onKeyUp(event, event.param(0)); break;
     case kEventChar:
-      focusIfSource(event);
+      // Tab's character comes after its key has moved the focus on: it must not pull it back.
+      if (event.params[0] != '\t') focusIfSource(event);
       answer = onChar(event, event.param(0));
       break;
     case kEventFocusLost: answer = onFocusLost(event); break;
