@@ -3,6 +3,7 @@
 #include <cstring>
 
 #include "BR_Private.h"
+#include "frame/com/ComRef.h"
 
 namespace br::test {
 
@@ -46,18 +47,16 @@ bool Canvas::SamePixels(const Canvas& other) const {
 }
 
 HRESULT DrawControl(IUnknown* control, const Canvas& canvas) {
-  IViewObject* view = nullptr;
-  HRESULT hr = control->QueryInterface(IID_IViewObject, reinterpret_cast<void**>(&view));
+  br::com::ComRef<IViewObject> view;
+  const HRESULT hr = control->QueryInterface(IID_IViewObject, view.OutVoid());
   if (FAILED(hr)) return hr;
   const RECTL box{0, 0, canvas.Width(), canvas.Height()};
-  hr = view->Draw(DVASPECT_CONTENT, -1, nullptr, nullptr, nullptr, canvas.Dc(), &box, nullptr, nullptr, 0);
-  view->Release();
-  return hr;
+  return view->Draw(DVASPECT_CONTENT, -1, nullptr, nullptr, nullptr, canvas.Dc(), &box, nullptr, nullptr, 0);
 }
 
 HRESULT SetRampPalette(IUnknown* control) {
-  IEmbeddedControl* embedded = nullptr;
-  HRESULT hr = control->QueryInterface(IID_IEmbeddedControl, reinterpret_cast<void**>(&embedded));
+  br::com::ComRef<IEmbeddedControl> embedded;
+  HRESULT hr = control->QueryInterface(IID_IEmbeddedControl, embedded.OutVoid());
   if (FAILED(hr)) return hr;
   VARIANT palette;
   palette.vt = VT_ARRAY | VT_I4;
@@ -68,7 +67,6 @@ HRESULT SetRampPalette(IUnknown* control) {
   }
   hr = embedded->SetPalette(palette);
   VariantClear(&palette);
-  embedded->Release();
   return hr;
 }
 
