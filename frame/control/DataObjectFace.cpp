@@ -21,10 +21,6 @@ HRESULT CheckFormat(const FORMATETC& format) {
 
 }  // namespace
 
-DataObjectFace::~DataObjectFace() {
-  if (holder_) holder_->Release();
-}
-
 STDMETHODIMP DataObjectFace::GetData(FORMATETC* format, STGMEDIUM* medium) {
   if (!format || !medium) return E_POINTER;
   const HRESULT check = CheckFormat(*format);
@@ -107,7 +103,7 @@ STDMETHODIMP DataObjectFace::EnumFormatEtc(DWORD direction, IEnumFORMATETC** for
 STDMETHODIMP DataObjectFace::DAdvise(FORMATETC* format, DWORD flags, IAdviseSink* sink, DWORD* connection) {
   if (!format || !sink || !connection) return E_POINTER;
   if (!holder_) {
-    const HRESULT hr = CreateDataAdviseHolder(&holder_);
+    const HRESULT hr = CreateDataAdviseHolder(holder_.Out());
     if (FAILED(hr)) return hr;
   }
   return holder_->Advise(this, format, flags, sink, connection);

@@ -2,6 +2,7 @@
 // metafile picture (CF_METAFILEPICT), drawn at the control's extent.
 #pragma once
 
+#include "frame/com/ComRef.h"
 #include "frame/com/Companion.h"
 
 #include <objidl.h>
@@ -13,7 +14,6 @@ class ControlCore;
 class DataObjectFace final : public br::com::Companion<IDataObject> {
 public:
   DataObjectFace(IUnknown& owner, ControlCore& core) noexcept : Companion(owner), core_(core) {}
-  ~DataObjectFace() override;
 
   STDMETHODIMP GetData(FORMATETC* format, STGMEDIUM* medium) override;
   STDMETHODIMP GetDataHere(FORMATETC* format, STGMEDIUM* medium) override;
@@ -30,7 +30,7 @@ public:
 
 private:
   ControlCore& core_;
-  IDataAdviseHolder* holder_ = nullptr;
+  br::com::ComRef<IDataAdviseHolder> holder_;
 };
 
 }  // namespace br::control

@@ -1,5 +1,6 @@
 #include "frame/control/OleObjectFace.h"
 
+#include "frame/com/ComRef.h"
 #include "frame/com/guard.h"
 #include "frame/control/ControlCore.h"
 #include "frame/control/OwnerHold.h"
@@ -13,8 +14,7 @@ STDMETHODIMP OleObjectFace::SetClientSite(IOleClientSite* site) { return core_.S
 
 STDMETHODIMP OleObjectFace::GetClientSite(IOleClientSite** site) {
   if (!site) return E_POINTER;
-  *site = core_.ClientSite();
-  if (*site) (*site)->AddRef();
+  *site = br::com::ComRef<IOleClientSite>(core_.ClientSite()).Detach();
   return S_OK;
 }
 

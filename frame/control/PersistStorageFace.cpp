@@ -1,5 +1,6 @@
 #include "frame/control/PersistStorageFace.h"
 
+#include "frame/com/ComRef.h"
 #include "frame/control/ControlCore.h"
 
 namespace br::control {
@@ -22,22 +23,19 @@ STDMETHODIMP PersistStorageFace::InitNew(IStorage* storage) { return storage ? S
 
 STDMETHODIMP PersistStorageFace::Load(IStorage* storage) {
   if (!storage) return E_POINTER;
-  IStream* stream = nullptr;
-  HRESULT hr = storage->OpenStream(kStreamName, nullptr, STGM_READ | STGM_SHARE_EXCLUSIVE, 0, &stream);
+  br::com::ComRef<IStream> stream;
+  const HRESULT hr = storage->OpenStream(kStreamName, nullptr, STGM_READ | STGM_SHARE_EXCLUSIVE, 0, stream.Out());
   if (FAILED(hr)) return hr;
-  hr = PersistStreamFace::ReadState(core_, stream);
-  stream->Release();
-  return hr;
+  return PersistStreamFace::ReadState(core_, stream.Get());
 }
 
 STDMETHODIMP PersistStorageFace::Save(IStorage* storage, BOOL) {
   if (!storage) return E_POINTER;
-  IStream* stream = nullptr;
-  HRESULT hr = storage->CreateStream(kStreamName, STGM_CREATE | STGM_WRITE | STGM_SHARE_EXCLUSIVE, 0, 0, &stream);
+  br::com::ComRef<IStream> stream;
+  const HRESULT hr =
+      storage->CreateStream(kStreamName, STGM_CREATE | STGM_WRITE | STGM_SHARE_EXCLUSIVE, 0, 0, stream.Out());
   if (FAILED(hr)) return hr;
-  hr = PersistStreamFace::WriteState(core_, stream);
-  stream->Release();
-  return hr;
+  return PersistStreamFace::WriteState(core_, stream.Get());
 }
 
 STDMETHODIMP PersistStorageFace::SaveCompleted(IStorage*) {

@@ -1,5 +1,6 @@
 #include "frame/control/QuickActivateFace.h"
 
+#include "frame/com/ComRef.h"
 #include "frame/control/ControlCore.h"
 
 #include <cstddef>
@@ -14,17 +15,12 @@ constexpr ULONG kControlNeeds = offsetof(QACONTROL, dwPropNotifyCookie) + sizeof
 
 // Connects sink to the control's events; the connection's cookie, or 0.
 DWORD ConnectEvents(IUnknown& owner, const IID& events, IUnknown* sink) {
-  IConnectionPointContainer* container = nullptr;
-  if (FAILED(owner.QueryInterface(IID_IConnectionPointContainer, reinterpret_cast<void**>(&container))) ||
-      !container)
-    return 0;
-  IConnectionPoint* point = nullptr;
+  const auto container = br::com::ComRef<IUnknown>(&owner).Query<IConnectionPointContainer>(IID_IConnectionPointContainer);
+  br::com::ComRef<IConnectionPoint> point;
   DWORD cookie = 0;
-  if (SUCCEEDED(container->FindConnectionPoint(events, &point)) && point) {
+  if (container && SUCCEEDED(container->FindConnectionPoint(events, point.Out())) && point) {
     if (FAILED(point->Advise(sink, &cookie))) cookie = 0;
-    point->Release();
   }
-  container->Release();
   return cookie;
 }
 
@@ -40,10 +36,8 @@ STDMETHODIMP QuickActivateFace::QuickActivate(QACONTAINER* container, QACONTROL*
   HRESULT hr = core_.SetClientSite(container->pClientSite);
   if (FAILED(hr)) return hr;
   if (container->pAdviseSink) {
-    IViewObject* view = nullptr;
-    if (SUCCEEDED(Owner().QueryInterface(IID_IViewObject, reinterpret_cast<void**>(&view))) && view) {
+    if (const auto view = br::com::ComRef<IUnknown>(&Owner()).Query<IViewObject>(IID_IViewObject)) {
       view->SetAdvise(DVASPECT_CONTENT, 0, container->pAdviseSink);
-      view->Release();
     }
   }
   if (container->pUnkEventSink && core_.Class().events) {

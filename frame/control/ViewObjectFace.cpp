@@ -12,10 +12,6 @@ constexpr bool IsDrawableAspect(DWORD aspect) {
 
 }  // namespace
 
-ViewObjectFace::~ViewObjectFace() {
-  if (sink_) sink_->Release();
-}
-
 STDMETHODIMP ViewObjectFace::Draw(DWORD aspect, LONG, void*, DVTARGETDEVICE*, HDC, HDC dc, LPCRECTL bounds, LPCRECTL,
                                   BOOL(STDMETHODCALLTYPE*)(ULONG_PTR), ULONG_PTR) {
   if (!IsDrawableAspect(aspect)) return DV_E_DVASPECT;
@@ -34,12 +30,9 @@ STDMETHODIMP ViewObjectFace::Freeze(DWORD, LONG, void*, DWORD*) { return E_NOTIM
 STDMETHODIMP ViewObjectFace::Unfreeze(DWORD) { return E_NOTIMPL; }
 
 STDMETHODIMP ViewObjectFace::SetAdvise(DWORD aspects, DWORD flags, IAdviseSink* sink) {
-  if (sink) sink->AddRef();
-  IAdviseSink* old = sink_;
-  sink_ = sink;
+  sink_ = br::com::ComRef<IAdviseSink>(sink);
   sinkAspects_ = aspects;
   sinkFlags_ = flags;
-  if (old) old->Release();
   if (sink_ && (flags & ADVF_PRIMEFIRST)) NotifyViewChange();
   return S_OK;
 }
@@ -48,8 +41,7 @@ STDMETHODIMP ViewObjectFace::GetAdvise(DWORD* aspects, DWORD* flags, IAdviseSink
   if (aspects) *aspects = sinkAspects_;
   if (flags) *flags = sinkFlags_;
   if (sink) {
-    *sink = sink_;
-    if (sink_) sink_->AddRef();
+    *sink = br::com::ComRef<IAdviseSink>(sink_).Detach();
   }
   return S_OK;
 }
@@ -90,14 +82,9 @@ STDMETHODIMP ViewObjectFace::GetNaturalExtent(DWORD, LONG, DVTARGETDEVICE*, HDC,
 
 void ViewObjectFace::NotifyViewChange() noexcept {
   if (!sink_) return;
-  IAdviseSink* sink = sink_;
-  sink->AddRef();
-  if (sinkFlags_ & ADVF_ONLYONCE) {
-    sink_->Release();
-    sink_ = nullptr;
-  }
+  const br::com::ComRef<IAdviseSink> sink = sink_;
+  if (sinkFlags_ & ADVF_ONLYONCE) sink_.Reset();
   sink->OnViewChange(DVASPECT_CONTENT, -1);
-  sink->Release();
 }
 
 }  // namespace br::control

@@ -3,6 +3,7 @@
 // advise sink.
 #pragma once
 
+#include "frame/com/ComRef.h"
 #include "frame/com/Companion.h"
 
 #include <ocidl.h>
@@ -14,7 +15,6 @@ class ControlCore;
 class ViewObjectFace final : public br::com::Companion<IViewObjectEx> {
 public:
   ViewObjectFace(IUnknown& owner, ControlCore& core) noexcept : Companion(owner), core_(core) {}
-  ~ViewObjectFace() override;
 
   // IViewObject
   STDMETHODIMP Draw(DWORD aspect, LONG index, void* aspectInfo, DVTARGETDEVICE* target, HDC targetInfo,
@@ -41,7 +41,7 @@ public:
 
 private:
   ControlCore& core_;
-  IAdviseSink* sink_ = nullptr;
+  br::com::ComRef<IAdviseSink> sink_;
   DWORD sinkAspects_ = 0;
   DWORD sinkFlags_ = 0;
 };
