@@ -133,7 +133,9 @@ bool DeskWindow::Create(std::string& error) {
   dateLabel_ = child("STATIC", "Date:", SS_LEFT | SS_CENTERIMAGE);
   dateEdit_ = child("EDIT", date, ES_AUTOHSCROLL | WS_TABSTOP);
   showButton_ = child("BUTTON", "Show", BS_DEFPUSHBUTTON | WS_TABSTOP, kShowCommand);
-  listHost_ = child("AtlAxWin", "BR_Info.TidesPortList", WS_CLIPCHILDREN | WS_TABSTOP);
+  listHost_ = child("AtlAxWin", "BR_Info.TidesPortList", WS_CLIPCHILDREN);
+  // The dialog keys' tabbing goes into the host window to the list's own window (a tab stop).
+  SetWindowLongPtrW(listHost_, GWL_EXSTYLE, GetWindowLongPtrW(listHost_, GWL_EXSTYLE) | WS_EX_CONTROLPARENT);
   graphHost_ = child("AtlAxWin", "BR_Info.TidesWindow", WS_CLIPCHILDREN);
   statusLine_ = child("STATIC", "Pick a station; move the pointer over the graph to read the tide.",
                       SS_LEFT | SS_CENTERIMAGE | SS_SUNKEN);
@@ -183,16 +185,27 @@ bool DeskWindow::LoadPorts(std::string& error) {
 }
 
 bool DeskWindow::SelectRow(int row) {
-  // The list is driven as a user would: Home, then Down row times.
-  HWND table = FindWindowExA(listHost_, nullptr, nullptr, nullptr);
-  while (table && GetWindow(table, GW_CHILD)) table = GetWindow(table, GW_CHILD);
-  if (!table) return false;
-  SetFocus(table);
-  for (int i = 0; i < row; ++i) SendMessageA(table, WM_KEYDOWN, VK_DOWN, 1);
+  // The list is driven as a user would: focused (its window hands the focus to its table),
+  // then Down row times.
+  const HWND list = FindWindowExA(listHost_, nullptr, nullptr, nullptr);
+  if (!list) return false;
+  SetFocus(list);
+  for (int i = 0; i < row; ++i) SendMessageA(GetFocus(), WM_KEYDOWN, VK_DOWN, 1);
   IUnknown* selected = nullptr;
   if (FAILED(list_->get_Selected(&selected)) || !selected) return false;
   selected->Release();
   return true;
+}
+
+bool DeskWindow::TranslateListKey(MSG& message) {
+  if (message.message != WM_KEYDOWN && message.message != WM_KEYUP) return false;
+  const HWND focus = GetFocus();
+  if (!list_ || !focus || !IsChild(listHost_, focus)) return false;
+  IOleInPlaceActiveObject* active = nullptr;
+  if (FAILED(list_->QueryInterface(IID_IOleInPlaceActiveObject, reinterpret_cast<void**>(&active)))) return false;
+  const bool used = active->TranslateAccelerator(&message) == S_OK;
+  active->Release();
+  return used;
 }
 
 void DeskWindow::ShowPort(IDispatch* port) {

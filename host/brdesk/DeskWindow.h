@@ -26,6 +26,9 @@ public:
   bool LoadPorts(std::string& error);
   // Selects the row (as shown) in the list, which shows its day in the graph.
   bool SelectRow(int row);
+  // A key message for the list while the focus is inside it: given to the list's
+  // TranslateAccelerator before the dialog keys take it (true when the list used it).
+  bool TranslateListKey(MSG& message);
   // Draws the whole window into a PNG file.
   bool SaveScreenshot(const std::wstring& path, std::string& error);
   const std::string& Status() const { return status_; }

@@ -48,6 +48,8 @@ int Run(const br::brdesk::DeskOptions& options) {
   }
   MSG message;
   while (GetMessageW(&message, nullptr, 0, 0) > 0) {
+    // The list's keys first, as an OLE container does; then the dialog keys.
+    if (desk.TranslateListKey(message)) continue;
     if (!IsDialogMessageW(desk.Handle(), &message)) {
       TranslateMessage(&message);
       DispatchMessageW(&message);
