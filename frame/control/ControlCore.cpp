@@ -44,7 +44,7 @@ ControlCore::ControlCore(IUnknown& owner, const br::com::ClassIdentity& cls, Con
 ControlCore::~ControlCore() {
   // The control's own parts are gone already: nothing may reach them from here on, and
   // the container is not called back from inside a destructor.
-  hooksLive_ = false;
+  Retire();
   if (window_ && IsWindow(window_)) DestroyWindow(window_);
   window_ = nullptr;
   ReleaseUiWindows();
@@ -146,6 +146,8 @@ LRESULT ControlCore::WindowMessage(HWND window, UINT message, WPARAM wParam, LPA
     case WM_ERASEBKGND:
       return 1;  // painting covers the whole client area: erasing would only flicker
     case WM_SETFOCUS: {
+      // Only the control's current window activates it (not one on its way out).
+      if (window != window_) break;
       OwnerHold hold(owner_);
       if (InPlaceActive() && !uiActive_) InPlaceActivate(true);
       // The keys belong to the control's focus child, when it has one.
@@ -158,7 +160,7 @@ LRESULT ControlCore::WindowMessage(HWND window, UINT message, WPARAM wParam, LPA
       return 0;
     }
     case WM_MOUSEACTIVATE:
-      if (InPlaceActive() && !uiActive_) {
+      if (window == window_ && InPlaceActive() && !uiActive_) {
         OwnerHold hold(owner_);
         InPlaceActivate(true);
       }

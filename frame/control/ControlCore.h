@@ -54,6 +54,10 @@ public:
   LRESULT WindowMessage(HWND window, UINT message, WPARAM wParam, LPARAM lParam);
   // The window is gone (WM_NCDESTROY).
   void WindowDestroyed(HWND window) noexcept;
+  // The control is being destroyed: from here on its window reaches none of its hooks (a
+  // control whose destructor destroys child windows calls this first, as the focus and
+  // other messages those windows' end sends to the control's window must not reach it).
+  void Retire() noexcept { hooksLive_ = false; }
 
   // ---- client site and activation
   HRESULT SetClientSite(IOleClientSite* site);

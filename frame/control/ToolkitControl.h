@@ -35,7 +35,12 @@ public:
 
 protected:
   ToolkitControl() = default;
-  ~ToolkitControl() override { DiscardContent(); }
+  ~ToolkitControl() override {
+    // The content's windows going may send the control's window messages (the focus
+    // falling back to it): the control is past answering them.
+    this->Control().Retire();
+    DiscardContent();
+  }
 
   // ---- what a toolkit control gives
   // The root of its tree, made each time the control's window is made.
