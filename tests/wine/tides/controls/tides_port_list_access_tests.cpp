@@ -2,9 +2,7 @@
 // ports of a database box hosted in Wine's ATL host, their station names through oleacc in
 // name order, the selected row's state, and a row picked through oleacc firing SelectChanged.
 #include "tests/wine/common/AccessibleReader.h"
-#include "tests/wine/common/AtlHost.h"
-#include "tests/wine/common/DllUnderTest.h"
-#include "tests/wine/common/EventSink.h"
+#include "tests/wine/common/PortListControl.h"
 #include "tests/wine/common/StationFolder.h"
 
 #include <doctest/doctest.h>
@@ -19,17 +17,6 @@ namespace {
 
 const TestConstituent kMeanLevel = {0, 1500, 0};
 
-// The table's window, somewhere below the list's.
-HWND TableOf(HWND list) {
-  for (HWND child = GetWindow(list, GW_CHILD); child; child = GetWindow(child, GW_HWNDNEXT)) {
-    char name[64] = {};
-    GetClassNameA(child, name, sizeof name);
-    if (std::string(name) == "Brine_AWTATL44") return child;
-    if (HWND deeper = TableOf(child)) return deeper;
-  }
-  return nullptr;
-}
-
 }  // namespace
 
 TEST_CASE("the station names of a box, read through oleacc in name order with the selected row's state") {
@@ -40,30 +27,17 @@ TEST_CASE("the station names of a box, read through oleacc in name order with th
                         {"Roscoff", 2923, -238, -1, {kMeanLevel}},
                         {"Le Conquet", 2901, -285, -1, {kMeanLevel}}});
   DllUnderTest dll;
-  AtlHost atl;
-  ITidesDatabase* database = OpenedDatabase(dll, folder.Path());
+  auto database = ComRef<ITidesDatabase>::Adopt(OpenedDatabase(dll, folder.Path()));
   VARIANT ports;
   VariantInit(&ports);
   REQUIRE(database->GetPorts(47.5, -6, 49.5, -1, &ports) == S_OK);
   REQUIRE(ports.vt == (VT_ARRAY | VT_UNKNOWN));
 
-  ITidesPortList* list = nullptr;
-  REQUIRE(dll.Create(CLSID_TidesPortList, &list) == S_OK);
-  EventSink sink{DIID__ITidesPortListEvents};
-  sink.recordPortNames = true;
-  REQUIRE(sink.Connect(list));
+  PortListControl list(dll);
   CHECK(list->SetPortList(ports) == S_OK);
   VariantClear(&ports);
-
-  HWND host = AtlHost::MakeWindow(300, 200);
-  IUnknown* site = nullptr;
-  REQUIRE(atl.Attach(list, host, &site) == S_OK);
-  IOleWindow* ole = Query<IOleWindow>(list);
-  HWND window = nullptr;
-  ole->GetWindow(&window);
-  ole->Release();
-  HWND table = TableOf(window);
-  REQUIRE(table != nullptr);
+  list.Host(AtlHost::MakeWindow(300, 200));
+  const HWND table = list.Table();
 
   {
     AccessibleReader reader(table);
@@ -73,7 +47,7 @@ TEST_CASE("the station names of a box, read through oleacc in name order with th
     CHECK(reader.Role(1) == ROLE_SYSTEM_LISTITEM);
 
     // Filling selected the first by name, as SelectChanged told the host.
-    REQUIRE(sink.portNames == Names{L"Brest"});
+    REQUIRE(list.Names() == Names{L"Brest"});
     CHECK(reader.Selection() == std::vector<long>{1});
     CHECK((reader.State(1) & STATE_SYSTEM_SELECTED) != 0);
     for (long other : {2, 3, 4}) CHECK((reader.State(other) & STATE_SYSTEM_SELECTED) == 0);
@@ -83,11 +57,8 @@ TEST_CASE("the station names of a box, read through oleacc in name order with th
 
     // A row picked from outside is the host's pick too.
     CHECK(reader.get()->accSelect(SELFLAG_TAKESELECTION, ChildId(3)) == S_OK);
-    CHECK(sink.portNames == Names{L"Brest", L"Roscoff"});
-    IUnknown* selected = nullptr;
-    REQUIRE(list->get_Selected(&selected) == S_OK);
-    CHECK(PortName(selected) == L"Roscoff");
-    if (selected) selected->Release();
+    CHECK(list.Names() == Names{L"Brest", L"Roscoff"});
+    CHECK(list.Selected() == L"Roscoff");
     CHECK(reader.Selection() == std::vector<long>{3});
     CHECK((reader.State(3) & STATE_SYSTEM_SELECTED) != 0);
     CHECK((reader.State(1) & STATE_SYSTEM_SELECTED) == 0);
@@ -99,10 +70,7 @@ TEST_CASE("the station names of a box, read through oleacc in name order with th
     CHECK(reader.ChildCount() == 0);
   }
 
-  sink.Disconnect();
-  DestroyWindow(host);
-  ReleaseAndNull(site);
-  ReleaseAndNull(list);
-  database->Release();
+  list.Close();
+  database.Reset();
   CHECK(dll.CanUnloadNow() == S_OK);
 }

@@ -79,11 +79,11 @@ TEST_CASE("a SelectChanged sink that closes the host while an accessibility clie
   auto reader = std::make_unique<AccessibleReader>(l.Table());
   REQUIRE(reader->get() != nullptr);
   EventSink closing(DIID__ITidesPortListEvents);
-  REQUIRE(closing.Connect(l.list));
+  REQUIRE(closing.Connect(l.list.Get()));
   const HWND controlWindow = l.hosted.Window();
   closing.onCall = [&] {
     closing.Disconnect();
-    ReleaseAndNull(l.list);
+    l.list.Reset();
     l.hosted.Close();
   };
   CHECK(reader->get()->accSelect(SELFLAG_TAKESELECTION, ChildId(2)) == S_OK);
