@@ -8,11 +8,12 @@
 //
 // Checked beyond "no crash": the folder opens exactly when its index files are whole,
 // records read back as stored, the search finds a station exactly when the sorted
-// coordinate index holds its key and its block is whole (then the working records are
+// coordinate index holds its key, its block is whole and its header possible (then the working records are
 // the block's valid constituents), and a predicted day is finite with valid sun times.
 #include <algorithm>
 #include <climits>
 #include <cmath>
+#include <cstdlib>
 #include <cstddef>
 #include <cstdint>
 #include <string_view>
@@ -49,7 +50,9 @@ bool SameRecord(const StationIndexRecord& a, const StationIndexRecord& b) {
   return a.station == b.station && a.latitude == b.latitude && a.longitude == b.longitude && a.offset == b.offset;
 }
 
-// What FindStation must load for the block at offset: nothing when the block is not whole.
+// What FindStation must load for the block at offset: nothing when the block is not whole
+// or its header is one no station has (zone beyond UTC-12..UTC+14, a position off the
+// globe, a count outside 0..69).
 struct ExpectedBlock {
   bool whole = false;
   StationHeader header;
@@ -63,7 +66,11 @@ ExpectedBlock BlockAt(std::string_view data, std::uint32_t offset) {
     return block;
   const auto* p = reinterpret_cast<const std::uint8_t*>(data.data()) + offset;
   block.header = DecodeStationHeader(p);
-  const int count = std::clamp<int>(block.header.constituentCount, 0, kConstituentCount);
+  const StationHeader& h = block.header;
+  if (h.zone < -14 || h.zone > 12 || std::abs(h.latitude) > 5400 || std::abs(h.longitude) > 10800 ||
+      h.constituentCount < 0 || h.constituentCount > kConstituentCount)
+    return block;
+  const int count = h.constituentCount;
   const std::size_t need = StationHeader::kSize + static_cast<std::size_t>(count) * ConstituentRecord::kSize;
   if (data.size() - offset < need) return block;
   block.whole = true;

@@ -14,7 +14,7 @@
 #include "tides/engine/station_files.h"
 #include "tools/tidefiles/Diagnostics.h"
 #include "tools/tidefiles/folder_builder.h"
-#include "tools/tidefiles/folder_check.h"
+#include "tides/engine/station_folder_check.h"
 #include "tools/tidefiles/folder_dump.h"
 #include "tools/tidefiles/station_json.h"
 
@@ -61,7 +61,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     return 0;
   }
   FUZZ_CHECK(!built.HasErrors());
-  FUZZ_CHECK(CheckFolderImage(*image).empty());
+  FUZZ_CHECK(br::tides::CheckStationFolder(*image).empty());
   SearchWithEngine(*image);
 
   Diagnostics dumped;

@@ -31,9 +31,11 @@ void WriteBytes(const fs::path& file, const std::vector<std::uint8_t>& bytes) {
   if (!out) throw std::runtime_error("cannot write " + file.string());
 }
 
-void WriteStationFolder(const fs::path& folder, const std::vector<TestStation>& stations) {
-  fs::create_directories(folder);
-  std::vector<std::uint8_t> data, numbers, coordinates;
+StationFolderBytes StationFolderImage(const std::vector<TestStation>& stations) {
+  StationFolderBytes image;
+  std::vector<std::uint8_t>& data = image.stationData;
+  std::vector<std::uint8_t>& numbers = image.stationIndex;
+  std::vector<std::uint8_t>& coordinates = image.coordinateIndex;
   std::vector<StationIndexRecord> index;
   for (std::size_t i = 0; i < stations.size(); ++i) {
     const TestStation& s = stations[i];
@@ -58,9 +60,15 @@ void WriteStationFolder(const fs::path& folder, const std::vector<TestStation>& 
     numbers.insert(numbers.end(), n.begin(), n.end());
     coordinates.insert(coordinates.end(), c.begin(), c.end());
   }
-  WriteBytes(folder / kStationIndexFileName, numbers);
-  WriteBytes(folder / kCoordinateIndexFileName, coordinates);
-  WriteBytes(folder / kStationDataFileName, data);
+  return image;
+}
+
+void WriteStationFolder(const fs::path& folder, const std::vector<TestStation>& stations) {
+  fs::create_directories(folder);
+  const StationFolderBytes image = StationFolderImage(stations);
+  WriteBytes(folder / kStationIndexFileName, image.stationIndex);
+  WriteBytes(folder / kCoordinateIndexFileName, image.coordinateIndex);
+  WriteBytes(folder / kStationDataFileName, image.stationData);
 }
 
 void TruncateFile(const fs::path& file, std::uintmax_t size) { fs::resize_file(file, size); }

@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "tides/engine/station_files.h"
+#include "tides/engine/station_folder_check.h"
 
 namespace br::tides::testing {
 
@@ -34,8 +35,10 @@ class TempFolder {
   std::filesystem::path path_;
 };
 
-// Writes the three files of stations into folder (created if missing): "td_num.ntx" in the
-// given order, "td_crd.ntx" sorted by StationKey, blocks in "td_pnt.dat" in the given order.
+// The three files of stations: "td_num.ntx" in the given order, "td_crd.ntx" sorted by
+// StationKey, blocks in "td_pnt.dat" in the given order.
+StationFolderBytes StationFolderImage(const std::vector<TestStation>& stations);
+// Writes them into folder (created if missing).
 void WriteStationFolder(const std::filesystem::path& folder, const std::vector<TestStation>& stations);
 void TruncateFile(const std::filesystem::path& file, std::uintmax_t size);
 void WriteBytes(const std::filesystem::path& file, const std::vector<std::uint8_t>& bytes);

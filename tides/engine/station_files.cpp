@@ -118,6 +118,12 @@ bool ReadStationIndexRecord(std::int32_t position, StationIndexRecord& out) {
   return true;
 }
 
+bool IsImpossibleHeader(const StationHeader& header) {
+  return !ZoneIsPossible(header.zone) || !LatitudeIsPossible(header.latitude) ||
+         !LongitudeIsPossible(header.longitude) || header.constituentCount < 0 ||
+         header.constituentCount > kConstituentCount;
+}
+
 bool FindStation(const StationIndexRecord& key, StationHeader& header) {
   TideEngine& engine = TheTideEngine();
   for (ConstituentTableEntry& c : engine.constituents) c.used = 0;
@@ -137,7 +143,9 @@ bool FindStation(const StationIndexRecord& key, StationHeader& header) {
   StationHeader::Bytes headerBytes;
   if (!ReadExactly(files.data, headerBytes.data(), headerBytes.size())) return false;
   const StationHeader read = DecodeStationHeader(headerBytes.data());
-  const int records = std::clamp<int>(read.constituentCount, 0, kConstituentCount);
+  // A damaged header counts as no station, like a block cut short.
+  if (IsImpossibleHeader(read)) return false;
+  const int records = read.constituentCount;
   std::uint8_t recordBytes[kConstituentCount * ConstituentRecord::kSize];
   if (!ReadExactly(files.data, recordBytes, static_cast<std::size_t>(records) * ConstituentRecord::kSize))
     return false;

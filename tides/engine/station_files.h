@@ -51,8 +51,23 @@ struct StationHeader {
   std::int16_t latitude = 0;           // minutes of arc, north positive
   std::int16_t longitude = 0;          // minutes of arc, east positive
   std::int8_t zone = 0;                // hours: universal time = zone time + zone (UTC+1 holds -1)
-  std::int8_t constituentCount = 0;    // records that follow; 0 or less means none
+  std::int8_t constituentCount = 0;    // records that follow, 0..69
 };
+
+// What a station header can hold. Zones run from UTC-12 (12) to UTC+14 (-14), the
+// world's standard times; positions are whole minutes of real latitudes and longitudes.
+inline constexpr int kMinZone = -14;
+inline constexpr int kMaxZone = 12;
+inline constexpr int kMaxLatitudeMinutes = 90 * 60;
+inline constexpr int kMaxLongitudeMinutes = 180 * 60;
+
+inline constexpr bool ZoneIsPossible(int zone) { return zone >= kMinZone && zone <= kMaxZone; }
+inline constexpr bool LatitudeIsPossible(int minutes) {
+  return minutes >= -kMaxLatitudeMinutes && minutes <= kMaxLatitudeMinutes;
+}
+inline constexpr bool LongitudeIsPossible(int minutes) {
+  return minutes >= -kMaxLongitudeMinutes && minutes <= kMaxLongitudeMinutes;
+}
 
 // One harmonic constituent of a station (6 bytes on disk).
 struct ConstituentRecord {
@@ -190,11 +205,16 @@ std::int32_t StationCount();
 // first. Returns false (out unchanged) when position is outside 0..count-1.
 bool ReadStationIndexRecord(std::int32_t position, StationIndexRecord& out);
 
+// A header no sound station has: a zone, latitude or longitude out of range, or a
+// constituent count outside 0..69. Its numbers would only give confident nonsense.
+bool IsImpossibleHeader(const StationHeader& header);
+
 // Finds the station whose StationKey equals key's and loads its constituents into the
 // working records. Returns true with header written when found and its block read whole;
-// false when no station has the key or its block cannot be read whole (header and working
-// records unwritten). The constituent table's used flags are cleared either way. A count
-// above 69 is clipped to 69 and a record whose number lies outside 0..68 is skipped.
+// false when no station has the key, its header is impossible (IsImpossibleHeader) or its
+// block cannot be read whole (header and working records unwritten). The constituent
+// table's used flags are cleared either way. A record whose number lies outside 0..68 is
+// skipped.
 bool FindStation(const StationIndexRecord& key, StationHeader& header);
 
 }  // namespace br::tides

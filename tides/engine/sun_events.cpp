@@ -92,6 +92,8 @@ HourMinute TimeOfDay(double x) {
   if (hm.minute > 59) hm.minute = 59;
   return hm;
 }
+int MinuteOfDay(const HourMinute& t) { return t.hour * 60 + t.minute; }
+
 }  // namespace
 
 PublishedSunTimes PublishSunTimes(const SunDay& day) {
@@ -106,9 +108,20 @@ PublishedSunTimes PublishSunTimes(const SunDay& day) {
   }
   for (int i = 0; i < 4; ++i)
     if (day.outcomes[i] == SunEventOutcome::kOccurs) out.events[i] = TimeOfDay(day.zoneHours[i]);
-  for (int i : {kTwilightBegin, kTwilightEnd})
-    if (day.outcomes[i] != SunEventOutcome::kOccurs) out.events[i] = HourMinute{out.events[kSunset].hour, 0};
+  // A twilight that does not happen takes the sunset's hour: after the sunrise and not
+  // after the sunset, where no reader takes it for a real twilight. A sunset brought back
+  // from after midnight puts that hour before the sunrise, where it would read as a
+  // twilight at night: the morning twilight then takes the sunrise itself (no twilight).
+  const HourMinute missing{out.events[kSunset].hour, 0};
+  if (day.outcomes[kTwilightEnd] != SunEventOutcome::kOccurs) out.events[kTwilightEnd] = missing;
+  if (day.outcomes[kTwilightBegin] != SunEventOutcome::kOccurs)
+    out.events[kTwilightBegin] = MinuteOfDay(missing) < MinuteOfDay(out.events[kSunrise]) ? out.events[kSunrise] : missing;
   return out;
+}
+
+int EventDayOffset(double zoneHours) {
+  if (zoneHours < 0.0) return -1;
+  return zoneHours >= 24.0 ? 1 : 0;
 }
 
 }  // namespace br::tides

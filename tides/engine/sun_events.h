@@ -71,7 +71,15 @@ struct PublishedSunTimes {
 // (24 h added or taken off once) before it is split, so a zone far from the longitude
 // still gives times. Without a sunrise or a sunset the day is polar: a polar day (the sun
 // stays above the horizon) reads 00:00, 00:00, 23:59, 23:59, a polar night 00:00 four times.
-// A twilight that does not happen takes the sunset's hour with minute 0.
+// A twilight that does not happen takes the sunset's hour with minute 0, except a morning
+// twilight that would then lie before the sunrise (a sunset after midnight, brought back
+// into the day): it takes the sunrise's time. So a reader tells a missing twilight by its
+// time: the morning one at the sunrise or the sunset's hour, the evening one at the
+// sunset's hour.
 PublishedSunTimes PublishSunTimes(const SunDay& day);
+
+// The day a published event belongs to, from its zone time: -1 the day before the date
+// (a zone time before 00:00), +1 the day after (24:00 or later), else 0.
+int EventDayOffset(double zoneHours);
 
 }  // namespace br::tides

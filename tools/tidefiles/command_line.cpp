@@ -10,10 +10,10 @@
 #include "tools/tidefiles/day_report.h"
 #include "tools/tidefiles/Diagnostics.h"
 #include "tools/tidefiles/folder_builder.h"
-#include "tools/tidefiles/folder_check.h"
 #include "tools/tidefiles/folder_dump.h"
 #include "tools/tidefiles/folder_image.h"
 #include "tools/tidefiles/station_json.h"
+#include "tides/engine/station_folder_check.h"
 
 namespace br::tidefiles {
 namespace {
@@ -180,7 +180,7 @@ int Check(const std::vector<std::string>& args, std::ostream& out, std::ostream&
     out << error << '\n';
     return kProblems;
   }
-  const std::vector<std::string> problems = CheckFolderImage(image);
+  const std::vector<std::string> problems = br::tides::CheckStationFolder(image);
   for (const std::string& p : problems) out << p << '\n';
   if (!problems.empty()) {
     err << "tidefiles: check: " << Count(problems.size(), "problem") << " in " << args[0] << '\n';

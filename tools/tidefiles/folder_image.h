@@ -1,17 +1,13 @@
 // The three files of a station folder, held whole in memory.
 #pragma once
 
-#include <cstdint>
 #include <string>
-#include <vector>
+
+#include "tides/engine/station_folder_check.h"
 
 namespace br::tidefiles {
 
-struct FolderImage {
-  std::vector<std::uint8_t> stationIndex;     // "td_num.ntx"
-  std::vector<std::uint8_t> coordinateIndex;  // "td_crd.ntx"
-  std::vector<std::uint8_t> stationData;      // "td_pnt.dat"
-};
+using FolderImage = br::tides::StationFolderBytes;
 
 // Reads the three files of folder. On failure returns false with a message naming the file.
 bool ReadFolderImage(const std::string& folder, FolderImage& image, std::string& error);

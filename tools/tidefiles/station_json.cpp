@@ -16,8 +16,6 @@ using Json = nlohmann::json;
 
 constexpr double kDegrees = 180.0 / 3.14159265358979323846;
 
-// Zone descriptions run from UTC+14 (-14) to UTC-12 (12); a little room either side.
-constexpr int kMaxZone = 14;
 
 std::string Quoted(const std::string& s) { return "\"" + MessageText(s) + "\""; }
 
@@ -54,11 +52,11 @@ class StationReader {
         ReadCoordinate(value, "longitude", -180.0, 360.0, entry_.longitude);
         if (entry_.longitude > 180.0) entry_.longitude -= 360.0;
       } else if (key == "zone") {
-        const std::optional<long> zone = WholeNumber(value, -kMaxZone, kMaxZone);
+        const std::optional<long> zone = WholeNumber(value, br::tides::kMinZone, br::tides::kMaxZone);
         if (zone) {
           entry_.zone = static_cast<int>(*zone);
         } else {
-          Error("\"zone\" must be a whole number of hours from -14 to 14");
+          Error("\"zone\" must be a whole number of hours from -14 to 12 (UTC+14 to UTC-12)");
         }
       } else if (key == "mean_level") {
         entry_.meanLevel = FiniteNumber(value);

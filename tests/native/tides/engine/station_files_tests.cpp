@@ -2,6 +2,8 @@
 // database suites. Arbitrary folders, record images and loaded values: the station_files fuzz harness.
 #include <doctest/doctest.h>
 
+#include <fstream>
+
 #include "tests/common/station_writer.h"
 #include "tides/engine/prediction.h"
 #include "tides/engine/TideEngine.h"
@@ -32,25 +34,39 @@ TEST_CASE("index files of odd or short lengths") {
   }
 }
 
-TEST_CASE("bad station data is clipped, skipped or refused without reading past it") {
+TEST_CASE("bad station data is skipped or refused without reading past it") {
   Closer closer;
   TempFolder tmp;
-  // A count above 69 with 80 records on file: only the first 69 are loaded.
-  TestStation many = Station(10, 10, {});
-  for (int i = 0; i < 80; ++i)
-    many.constituents.push_back({static_cast<std::int16_t>(i % 69), static_cast<std::uint16_t>(i), 10});
+  // A count of 69 with its records is whole; above 69, or below 0, no station has it.
+  TestStation full = Station(10, 10, {}), many = Station(11, 11, {});
+  for (int i = 0; i < 80; ++i) {
+    const ConstituentRecord record{static_cast<std::int16_t>(i % 69), static_cast<std::uint16_t>(i), 10};
+    if (i < kConstituentCount) full.constituents.push_back(record);
+    many.constituents.push_back(record);
+  }
   const TestStation bad = Station(20, 20, {{0, 0, 100}, {-1, 0, 500}, {69, 0, 500}, {29, 0, 1000}, {300, 0, 9}});
-  const TestStation negativeCount{"N", 2, 2, 0, {{29, 0, 1000}}, true, -5};
+  const TestStation negativeCount{"N", 2, 2, 0, {{29, 0, 1000}}, true, -1};
+  // Headers no station has: a zone of UTC-127 hours, UTC+15, a latitude of 546 degrees.
+  const TestStation farZone{"Z", 3, 3, 127, {{0, 0, 100}}}, pastKiribati{"K", 4, 4, -15, {{0, 0, 100}}};
+  TestStation offTheGlobe{"L", 5, 5, 0, {{0, 0, 100}}};
   // Last block in the file: its count promises more records than remain.
   const TestStation cut = Station(30, 30, {{0, 0, 100}, {29, 0, 1000}, {36, 0, 500}});
-  WriteStationFolder(tmp.path(), {many, bad, Station(1, 1, {}), negativeCount, cut});
+  WriteStationFolder(tmp.path(), {full, many, bad, Station(1, 1, {}), negativeCount, farZone, pastKiribati, offTheGlobe, cut});
+  const fs::path data = tmp.path() / kStationDataFileName;
+  {
+    // The header's latitude alone goes off the globe; the index still finds the block.
+    std::vector<std::uint8_t> bytes(fs::file_size(data));
+    std::ifstream(data, std::ios::binary).read(reinterpret_cast<char*>(bytes.data()), static_cast<std::streamsize>(bytes.size()));
+    const std::size_t block = (46 + 69 * 6) + (46 + 80 * 6) + (46 + 5 * 6) + 46 + (46 + 6) + 2 * (46 + 6);
+    REQUIRE(bytes[block] == 'L');
+    PutU16(&bytes[block + 40], 0x7FFF);
+    WriteBytes(data, bytes);
+  }
   REQUIRE(OpenTideFiles(tmp.str().c_str()) == 0);
   const TideEngine& engine = TheTideEngine();
-  const fs::path data = tmp.path() / kStationDataFileName;
 
   StationHeader h;
   REQUIRE(FindStation(Key(10, 10), h));
-  CHECK(h.constituentCount == 80);
   REQUIRE(engine.workingCount == kConstituentCount);
   CHECK(engine.working[68].number == 68);
   CHECK(engine.working[68].g == doctest::Approx(6.8 * kPi / 180.0));
@@ -60,17 +76,27 @@ TEST_CASE("bad station data is clipped, skipped or refused without reading past 
   CHECK((engine.working[0].number == 0 && engine.working[1].number == 29));
   CHECK(engine.working[1].H == doctest::Approx(100.0));
 
-  SUBCASE("header counts of 0 or below load nothing and predict a flat 0") {
-    for (auto key : {Key(1, 1), Key(2, 2)}) {
-      REQUIRE(FindStation(key, h));
-      CHECK(engine.workingCount == 0);
+  SUBCASE("an impossible header counts as no station and leaves the working records as they were") {
+    StationHeader kept;
+    SetStationName(kept, "kept");
+    for (auto key : {Key(11, 11), Key(2, 2), Key(3, 3), Key(4, 4), Key(5, 5)}) {
+      CHECK_FALSE(FindStation(key, kept));
+      CHECK(StationName(kept) == "kept");
+      CHECK(engine.workingCount == 2);
       float samples[25];
-      for (float& s : samples) s = 99.0f;
       SunDay sun;
-      const DayPrediction d = PredictDay(key, h, CalendarDate{2000, 1, 1}, 1.0, samples, 25, sun, FixedOffsetLocalMidnight(0));
-      CHECK((d.stationFound && d.sampleCount == 25));
-      for (float s : samples) CHECK(s == 0.0f);
+      CHECK_FALSE(PredictDay(key, kept, CalendarDate{2000, 1, 1}, 1.0, samples, 25, sun, FixedOffsetLocalMidnight(0)).stationFound);
     }
+  }
+  SUBCASE("a header count of 0 loads nothing and predicts a flat 0") {
+    REQUIRE(FindStation(Key(1, 1), h));
+    CHECK(engine.workingCount == 0);
+    float samples[25];
+    for (float& s : samples) s = 99.0f;
+    SunDay sun;
+    const DayPrediction d = PredictDay(Key(1, 1), h, CalendarDate{2000, 1, 1}, 1.0, samples, 25, sun, FixedOffsetLocalMidnight(0));
+    CHECK((d.stationFound && d.sampleCount == 25));
+    for (float s : samples) CHECK(s == 0.0f);
   }
   SUBCASE("a block cut short counts as not found") {
     TruncateFile(data, fs::file_size(data) - 1);

@@ -57,6 +57,22 @@ TEST_CASE("a day with its morning twilight but no evening one") {
   CHECK(Times(p.events) == "1:30 3:15 21:45 21:0 ");
 }
 
+TEST_CASE("a sunset after midnight: the missing morning twilight is not put before the sunrise") {
+  // Reykjavik (64 09'N 21 56'W, zone 0) at midsummer: the sun sets four minutes after
+  // midnight and never gets down to -12 degrees. The sunset's hour would put the missing
+  // twilight at 00:00, before the sunrise, where it reads as a twilight at night.
+  const SunDay d = ComputeSunDay({2026, 6, 21}, 64.15, -21.933333, 0);
+  REQUIRE(d.outcomes[kSunset] == SunEventOutcome::kOccurs);
+  CHECK(d.zoneHours[kSunset] == doctest::Approx(24.07).epsilon(1e-3));
+  CHECK((d.outcomes[kTwilightBegin] == SunEventOutcome::kSunStaysAbove && d.outcomes[kTwilightEnd] == SunEventOutcome::kSunStaysAbove));
+  const PublishedSunTimes p = PublishSunTimes(d);
+  CHECK(p.kind == SunDayKind::kNormal);
+  CHECK(Times(p.events) == "2:55 2:55 0:4 0:0 ");
+  CHECK(EventDayOffset(d.zoneHours[kSunset]) == 1);
+  CHECK(EventDayOffset(d.zoneHours[kSunrise]) == 0);
+  CHECK(EventDayOffset(-1.934) == -1);
+}
+
 TEST_CASE("80 degrees north: midnight sun and polar night; elsewhere told by the sun, not by the month") {
   const SunDay june = ComputeSunDay({2000, 6, 21}, 80, 0, 0);
   CHECK(june.outcomes[1] == SunEventOutcome::kSunStaysAbove);

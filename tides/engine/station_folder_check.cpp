@@ -1,20 +1,31 @@
-#include "tools/tidefiles/folder_check.h"
+#include "tides/engine/station_folder_check.h"
 
 #include <cstdio>
+#include <cstdlib>
 #include <map>
 
 #include "tides/engine/station_files.h"
 
-namespace br::tidefiles {
+namespace br::tides {
 namespace {
 
-using br::tides::ConstituentRecord;
-using br::tides::StationHeader;
-using br::tides::StationIndexRecord;
-
-constexpr int kMaxLatitudeMinutes = 90 * 60;
-constexpr int kMaxLongitudeMinutes = 180 * 60;
-constexpr int kMaxZone = 14;
+// Names of the bytes below 32 that a terminal acts on, for the message.
+std::string ControlName(unsigned char c) {
+  switch (c) {
+    case 7: return "BEL";
+    case 8: return "BS";
+    case 9: return "TAB";
+    case 10: return "LF";
+    case 13: return "CR";
+    case 27: return "ESC";
+    case 127: return "DEL";
+    default: {
+      char text[8];
+      std::snprintf(text, sizeof text, "0x%02X", c);
+      return text;
+    }
+  }
+}
 
 std::string Position(const StationIndexRecord& r) {
   char text[64];
@@ -25,7 +36,7 @@ std::string Position(const StationIndexRecord& r) {
 std::vector<StationIndexRecord> Records(const std::vector<std::uint8_t>& bytes) {
   std::vector<StationIndexRecord> records;
   for (std::size_t at = 0; at + StationIndexRecord::kSize <= bytes.size(); at += StationIndexRecord::kSize)
-    records.push_back(br::tides::DecodeStationIndexRecord(&bytes[at]));
+    records.push_back(DecodeStationIndexRecord(&bytes[at]));
   return records;
 }
 
@@ -35,7 +46,7 @@ bool SameRecord(const StationIndexRecord& a, const StationIndexRecord& b) {
 
 class FolderChecker {
  public:
-  explicit FolderChecker(const FolderImage& image)
+  explicit FolderChecker(const StationFolderBytes& image)
       : image_(image), stations_(Records(image.stationIndex)), sorted_(Records(image.coordinateIndex)) {}
 
   std::vector<std::string> Run() {
@@ -51,7 +62,7 @@ class FolderChecker {
   void Problem(const std::string& text) { problems_.push_back(text); }
 
   void CheckLengths() {
-    const char* names[] = {br::tides::kStationIndexFileName, br::tides::kCoordinateIndexFileName};
+    const char* names[] = {kStationIndexFileName, kCoordinateIndexFileName};
     const std::vector<std::uint8_t>* files[] = {&image_.stationIndex, &image_.coordinateIndex};
     for (int f = 0; f < 2; ++f) {
       const std::size_t size = files[f]->size();
@@ -65,9 +76,9 @@ class FolderChecker {
       Problem(std::string("td_crd.ntx: holds ") + std::to_string(sorted_.size()) + " records but td_num.ntx holds " +
               std::to_string(stations_.size()) + "; both index files must hold the same stations");
     }
-    if (stations_.size() > static_cast<std::size_t>(br::tides::kMaxStationCount)) {
+    if (stations_.size() > static_cast<std::size_t>(kMaxStationCount)) {
       Problem("td_num.ntx: " + std::to_string(stations_.size()) + " stations; a folder holds at most " +
-              std::to_string(br::tides::kMaxStationCount));
+              std::to_string(kMaxStationCount));
     }
   }
 
@@ -76,11 +87,11 @@ class FolderChecker {
     for (std::size_t i = 0; i < stations_.size(); ++i) {
       const StationIndexRecord& r = stations_[i];
       const std::string where = "td_num.ntx: station " + std::to_string(i) + ": ";
-      if (r.latitude < -kMaxLatitudeMinutes || r.latitude > kMaxLatitudeMinutes)
-        Problem(where + "latitude " + std::to_string(r.latitude) + "' is outside -5400..5400 minutes");
-      if (r.longitude < -kMaxLongitudeMinutes || r.longitude > kMaxLongitudeMinutes)
-        Problem(where + "longitude " + std::to_string(r.longitude) + "' is outside -10800..10800 minutes");
-      const auto [it, added] = first.emplace(br::tides::StationKey(r), i);
+      if (!LatitudeIsPossible(r.latitude))
+        Problem(where + "latitude " + std::to_string(r.latitude) + "' is outside -5400..5400 minutes (90 degrees)");
+      if (!LongitudeIsPossible(r.longitude))
+        Problem(where + "longitude " + std::to_string(r.longitude) + "' is outside -10800..10800 minutes (180 degrees)");
+      const auto [it, added] = first.emplace(StationKey(r), i);
       if (!added)
         Problem(where + "duplicate key: same position (" + Position(r) + ") as station " + std::to_string(it->second));
     }
@@ -88,8 +99,8 @@ class FolderChecker {
 
   void CheckCoordinateIndex() {
     for (std::size_t k = 1; k < sorted_.size(); ++k) {
-      const std::uint32_t before = br::tides::StationKey(sorted_[k - 1]);
-      const std::uint32_t key = br::tides::StationKey(sorted_[k]);
+      const std::uint32_t before = StationKey(sorted_[k - 1]);
+      const std::uint32_t key = StationKey(sorted_[k]);
       const std::string where = "td_crd.ntx: record " + std::to_string(k) + ": ";
       if (key < before) {
         Problem(where + "key " + std::to_string(key) + " follows " + std::to_string(before) +
@@ -102,12 +113,12 @@ class FolderChecker {
 
   void CheckCopiesAgree() {
     std::map<std::uint32_t, std::size_t> sortedByKey;
-    for (std::size_t k = 0; k < sorted_.size(); ++k) sortedByKey.emplace(br::tides::StationKey(sorted_[k]), k);
+    for (std::size_t k = 0; k < sorted_.size(); ++k) sortedByKey.emplace(StationKey(sorted_[k]), k);
     std::map<std::uint32_t, std::size_t> stationByKey;
     for (std::size_t i = 0; i < stations_.size(); ++i) {
       const StationIndexRecord& r = stations_[i];
-      stationByKey.emplace(br::tides::StationKey(r), i);
-      const auto found = sortedByKey.find(br::tides::StationKey(r));
+      stationByKey.emplace(StationKey(r), i);
+      const auto found = sortedByKey.find(StationKey(r));
       const std::string where = "td_crd.ntx: station " + std::to_string(i) + ": ";
       if (found == sortedByKey.end()) {
         Problem(where + "no record for its position (" + Position(r) + "); the search cannot find it");
@@ -121,7 +132,7 @@ class FolderChecker {
       }
     }
     for (std::size_t k = 0; k < sorted_.size(); ++k) {
-      if (stationByKey.count(br::tides::StationKey(sorted_[k])) == 0)
+      if (stationByKey.count(StationKey(sorted_[k])) == 0)
         Problem("td_crd.ntx: record " + std::to_string(k) + ": position (" + Position(sorted_[k]) +
                 ") belongs to no station of td_num.ntx");
     }
@@ -130,7 +141,7 @@ class FolderChecker {
 
   // The block as the engine reads it: at the offset of the station's td_crd.ntx record.
   void CheckBlock(std::size_t i) {
-    const auto found = sortedByKey_.find(br::tides::StationKey(stations_[i]));
+    const auto found = sortedByKey_.find(StationKey(stations_[i]));
     if (found == sortedByKey_.end()) return;  // reported above
     const StationIndexRecord& r = sorted_[found->second];
     const std::string where = "td_pnt.dat: station " + std::to_string(i) + ": ";
@@ -141,15 +152,22 @@ class FolderChecker {
               std::to_string(data.size()) + " bytes)");
       return;
     }
-    const StationHeader header = br::tides::DecodeStationHeader(&data[offset]);
+    const StationHeader header = DecodeStationHeader(&data[offset]);
     if (header.latitude != r.latitude || header.longitude != r.longitude) {
       Problem(where + "header position (latitude " + std::to_string(header.latitude) + "', longitude " +
               std::to_string(header.longitude) + "') differs from its index record (" + Position(r) + ")");
     }
-    if (header.zone < -kMaxZone || header.zone > kMaxZone)
-      Problem(where + "zone description " + std::to_string(header.zone) + " is outside -14..14 hours");
+    if (!LatitudeIsPossible(header.latitude))
+      Problem(where + "header latitude " + std::to_string(header.latitude) + "' is outside -5400..5400 minutes (90 degrees)");
+    if (!LongitudeIsPossible(header.longitude))
+      Problem(where + "header longitude " + std::to_string(header.longitude) +
+              "' is outside -10800..10800 minutes (180 degrees)");
+    if (!ZoneIsPossible(header.zone))
+      Problem(where + "zone description " + std::to_string(header.zone) + " is outside " + std::to_string(kMinZone) +
+              ".." + std::to_string(kMaxZone) + " hours (UTC+14 to UTC-12)");
+    CheckName(where, header);
     const int count = header.constituentCount;
-    if (count < 0 || count > br::tides::kConstituentCount) {
+    if (count < 0 || count > kConstituentCount) {
       Problem(where + "constituent count " + std::to_string(count) + " is outside 0..69");
       if (count < 0) return;
     }
@@ -161,9 +179,9 @@ class FolderChecker {
     }
     for (int k = 0; k < count; ++k) {
       const ConstituentRecord c =
-          br::tides::DecodeConstituentRecord(&data[offset + StationHeader::kSize + static_cast<std::uint64_t>(k) * ConstituentRecord::kSize]);
+          DecodeConstituentRecord(&data[offset + StationHeader::kSize + static_cast<std::uint64_t>(k) * ConstituentRecord::kSize]);
       const std::string record = where + "constituent record " + std::to_string(k) + ": ";
-      if (c.number < 0 || c.number >= br::tides::kConstituentCount) {
+      if (c.number < 0 || c.number >= kConstituentCount) {
         Problem(record + "number " + std::to_string(c.number) + " is outside 0..68");
       } else if (k == 0 && c.number != 0) {
         Problem(record + "is constituent " + std::to_string(c.number) + "; the first record must be the mean level (0)");
@@ -172,7 +190,19 @@ class FolderChecker {
     }
   }
 
-  const FolderImage& image_;
+  // Names are printed by every tool: a control character in one would drive the terminal.
+  void CheckName(const std::string& where, const StationHeader& header) {
+    const std::string name = StationName(header);
+    for (std::size_t k = 0; k < name.size(); ++k) {
+      const auto c = static_cast<unsigned char>(name[k]);
+      if (c < 0x20 || c == 0x7F) {
+        Problem(where + "name holds the control character " + ControlName(c) + " at byte " + std::to_string(k));
+        return;
+      }
+    }
+  }
+
+  const StationFolderBytes& image_;
   std::vector<StationIndexRecord> stations_;
   std::vector<StationIndexRecord> sorted_;
   std::map<std::uint32_t, std::size_t> sortedByKey_;
@@ -181,6 +211,16 @@ class FolderChecker {
 
 }  // namespace
 
-std::vector<std::string> CheckFolderImage(const FolderImage& image) { return FolderChecker(image).Run(); }
+std::vector<std::string> CheckStationFolder(const StationFolderBytes& folder) { return FolderChecker(folder).Run(); }
 
-}  // namespace br::tidefiles
+long ProblemStation(const std::string& problem) {
+  static const char kMark[] = ": station ";
+  const std::size_t at = problem.find(kMark);
+  if (at == std::string::npos) return -1;
+  const char* digits = problem.c_str() + at + sizeof kMark - 1;
+  char* end = nullptr;
+  const long number = std::strtol(digits, &end, 10);
+  return end != digits && *end == ':' ? number : -1;
+}
+
+}  // namespace br::tides
