@@ -27,10 +27,17 @@ std::string ControlName(unsigned char c) {
   }
 }
 
-std::string Position(const StationIndexRecord& r) {
-  char text[64];
-  std::snprintf(text, sizeof text, "latitude %d', longitude %d'", r.latitude, r.longitude);
+std::string Angle(int minutes, int degreeDigits, const char* hemispheres) {
+  const int size = minutes < 0 ? -minutes : minutes;
+  char text[32];
+  std::snprintf(text, sizeof text, "%0*d\xC2\xB0%02d'%c", degreeDigits, size / 60, size % 60,
+                minutes < 0 ? hemispheres[1] : hemispheres[0]);
   return text;
+}
+
+// "01°00'N 001°00'E" (UTF-8).
+std::string Position(const StationIndexRecord& r) {
+  return Angle(r.latitude, 2, "NS") + " " + Angle(r.longitude, 3, "EW");
 }
 
 std::vector<StationIndexRecord> Records(const std::vector<std::uint8_t>& bytes) {
@@ -154,8 +161,8 @@ class FolderChecker {
     }
     const StationHeader header = DecodeStationHeader(&data[offset]);
     if (header.latitude != r.latitude || header.longitude != r.longitude) {
-      Problem(where + "header position (latitude " + std::to_string(header.latitude) + "', longitude " +
-              std::to_string(header.longitude) + "') differs from its index record (" + Position(r) + ")");
+      const StationIndexRecord stated{0, header.latitude, header.longitude, 0};
+      Problem(where + "header position (" + Position(stated) + ") differs from its index record (" + Position(r) + ")");
     }
     if (!LatitudeIsPossible(header.latitude))
       Problem(where + "header latitude " + std::to_string(header.latitude) + "' is outside -5400..5400 minutes (90 degrees)");
@@ -197,6 +204,11 @@ class FolderChecker {
       const auto c = static_cast<unsigned char>(name[k]);
       if (c < 0x20 || c == 0x7F) {
         Problem(where + "name holds the control character " + ControlName(c) + " at byte " + std::to_string(k));
+        return;
+      }
+      // Windows-1252 leaves these undefined; read as Unicode they are 8-bit controls.
+      if (c == 0x81 || c == 0x8D || c == 0x8F || c == 0x90 || c == 0x9D) {
+        Problem(where + "name holds the undefined byte " + ControlName(c) + " at byte " + std::to_string(k));
         return;
       }
     }

@@ -13,6 +13,7 @@
 #include "tools/tidefiles/folder_dump.h"
 #include "tools/tidefiles/folder_image.h"
 #include "tools/tidefiles/station_json.h"
+#include "host/brtide/value_parsers.h"
 #include "tides/engine/station_folder_check.h"
 
 namespace br::tidefiles {
@@ -39,14 +40,19 @@ const char kHelpText[] =
     "  build STATIONS.json FOLDER  write the three files from a JSON array of stations\n"
     "                              (\"-\" reads the JSON from standard input); --verbose\n"
     "                              also lists names changed for the code page or cut\n"
-    "  dump FOLDER                 print the folder's stations as that JSON\n"
+    "  dump FOLDER                 print the folder's stations as that JSON (exit status 1\n"
+    "                              when the folder is damaged)\n"
     "  check FOLDER                validate the folder: one line per problem, or \"ok: N stations\"\n"
     "  predict FOLDER ...          one station's day: heights in metres, highest and lowest\n"
-    "                              points, sun events in the station's zone time\n"
+    "                              points, sun events in the station's zone time as the\n"
+    "                              library publishes them (\"--:--\": none that day)\n"
     "      --station N             the station with number N (td_num.ntx order, from 0), or\n"
-    "      --at LAT LON            the station at that position (degrees, whole minutes)\n"
-    "      --date YYYY-MM-DD       the day\n"
-    "      --step HOURS            hours between samples (default 1)\n"
+    "      --at LAT LON            the station at that position (decimal degrees or 48.5N\n"
+    "                              4.5W; whole minutes)\n"
+    "      --date YYYY-MM-DD       the day (years 100 to 9999)\n"
+    "      --step HOURS            hours between samples, 0.001 to 24 (default 1); the\n"
+    "                              samples run to the one nearest 24:00, which falls in\n"
+    "                              the next day when HOURS does not divide 24\n"
     "      --utc-offset HOURS      the computer's standard time minus UT (default 0): the day\n"
     "                              starts at that local standard midnight\n"
     "      --json                  print JSON instead of a table\n"
@@ -65,32 +71,6 @@ std::string Count(std::size_t n, const char* noun) {
 int Usage(std::ostream& err, const std::string& message) {
   err << "tidefiles: " << message << '\n' << kUsageText;
   return kUsage;
-}
-
-bool ParseNumber(const std::string& text, double& value) {
-  if (text.empty() || text.size() > 64) return false;
-  errno = 0;
-  char* end = nullptr;
-  value = std::strtod(text.c_str(), &end);
-  return errno == 0 && end == text.c_str() + text.size() && std::isfinite(value);
-}
-
-bool ParseDate(const std::string& text, br::tides::CalendarDate& date) {
-  int year = 0, month = 0, day = 0;
-  char tail = 0;
-  if (text.size() != 10 || text[4] != '-' || text[7] != '-') return false;
-  for (std::size_t i = 0; i < text.size(); ++i) {
-    if (i != 4 && i != 7 && (text[i] < '0' || text[i] > '9')) return false;
-  }
-  if (std::sscanf(text.c_str(), "%4d-%2d-%2d%c", &year, &month, &day, &tail) != 3) return false;
-  static const int kDays[12] = {31, 29, 31, 30, 31, 30, 31, 31, 30, 31, 30, 31};
-  if (year < 1 || month < 1 || month > 12 || day < 1 || day > kDays[month - 1]) return false;
-  const bool leap = (year % 4 == 0 && year % 100 != 0) || year % 400 == 0;
-  if (month == 2 && day == 29 && !leap) return false;
-  date.year = static_cast<std::int16_t>(year);
-  date.month = static_cast<std::uint8_t>(month);
-  date.day = static_cast<std::uint8_t>(day);
-  return true;
 }
 
 bool ReadText(const std::string& path, std::istream& in, std::string& text, std::string& error) {
@@ -166,10 +146,15 @@ int Dump(const std::vector<std::string>& args, std::ostream& out, std::ostream& 
     err << "tidefiles: dump: " << error << '\n';
     return kProblems;
   }
+  // What can be read is printed; a damaged folder still fails, so that no script takes
+  // the JSON of a broken folder for a good one.
   Diagnostics diagnostics;
   out << WriteStationsJson(DumpFolderImage(image, diagnostics));
   diagnostics.Print(err, true);
-  return diagnostics.HasErrors() ? kProblems : kOk;
+  const std::vector<std::string> problems = br::tides::CheckStationFolder(image);
+  for (const std::string& p : problems) err << "tidefiles: dump: " << p << '\n';
+  if (!problems.empty()) err << "tidefiles: dump: " << args[0] << " is damaged (" << Count(problems.size(), "problem") << ")\n";
+  return diagnostics.HasErrors() || !problems.empty() ? kProblems : kOk;
 }
 
 int Check(const std::vector<std::string>& args, std::ostream& out, std::ostream& err) {
@@ -191,41 +176,44 @@ int Check(const std::vector<std::string>& args, std::ostream& out, std::ostream&
 }
 
 int Predict(const std::vector<std::string>& args, std::ostream& out, std::ostream& err) {
+  // Values read as brtide reads them: decimal degrees or with a hemisphere letter, years
+  // 100..9999, steps of 0.001 to 24 hours.
   PredictOptions options;
   bool haveFolder = false, haveDate = false;
   for (std::size_t i = 0; i < args.size(); ++i) {
     const std::string& a = args[i];
-    const auto value = [&](std::size_t n) { return i + n < args.size() ? &args[i + n] : nullptr; };
+    const auto value = [&](std::size_t n) { return i + n < args.size() ? args[i + n] : std::string(); };
     if (a == "--json") {
       options.json = true;
     } else if (a == "--station") {
-      double n = 0;
-      if (!value(1) || !ParseNumber(*value(1), n) || n != std::floor(n) || n < 0 || n > 32767)
-        return Usage(err, "predict: --station needs a station number from 0 to 32767");
-      options.station = static_cast<std::int32_t>(n);
+      const std::optional<long> number = br::brtide::ParseStationNumber(value(1));
+      if (!number) return Usage(err, "predict: bad station number \"" + value(1) + "\" (a whole number from 0)");
+      options.station = static_cast<std::int32_t>(*number);
       ++i;
     } else if (a == "--at") {
-      double lat = 0, lon = 0;
-      if (!value(2) || !ParseNumber(*value(1), lat) || !ParseNumber(*value(2), lon) || std::fabs(lat) > 90 ||
-          lon < -180 || lon > 360)
-        return Usage(err, "predict: --at needs LAT (-90..90) and LON (-180..180) in degrees");
-      options.latitude = lat;
-      options.longitude = lon > 180 ? lon - 360 : lon;
+      options.latitude = br::brtide::ParseLatitude(value(1));
+      options.longitude = br::brtide::ParseLongitude(value(2));
+      if (!options.latitude || !options.longitude)
+        return Usage(err, "predict: --at needs LAT (degrees -90..90, or 48.5N) and LON (-180..180, or 4.5W)");
       i += 2;
     } else if (a == "--date") {
-      if (!value(1) || !ParseDate(*value(1), options.date))
-        return Usage(err, "predict: --date needs a calendar date YYYY-MM-DD (year 0001..9999)");
+      const std::optional<br::tides::CalendarDate> date = br::brtide::ParseIsoDate(value(1));
+      if (!date) return Usage(err, "predict: bad date \"" + value(1) + "\" (a real day as YYYY-MM-DD, years 100 to 9999)");
+      options.date = *date;
       haveDate = true;
       ++i;
     } else if (a == "--step") {
-      if (!value(1) || !ParseNumber(*value(1), options.step) || options.step <= 0)
-        return Usage(err, "predict: --step needs a number of hours above 0");
+      const std::optional<double> step = br::brtide::ParseStep(value(1));
+      if (!step) return Usage(err, "predict: bad step \"" + value(1) + "\" (hours from 0.001 to 24)");
+      options.step = *step;
       ++i;
     } else if (a == "--utc-offset") {
-      if (!value(1) || !ParseNumber(*value(1), options.utcOffset) || std::fabs(options.utcOffset) > 14)
+      const std::optional<double> offset = br::brtide::ParseNumber(value(1));
+      if (!offset || std::fabs(*offset) > 14)
         return Usage(err, "predict: --utc-offset needs hours from -14 to 14 (UTC-5 is -5)");
+      options.utcOffset = *offset;
       ++i;
-    } else if (a.size() > 1 && a[0] == '-') {
+    } else if (a.size() > 1 && a[0] == '-' && !br::brtide::ParseNumber(a)) {
       return Usage(err, "predict: unknown option " + a);
     } else if (!haveFolder) {
       options.folder = a;

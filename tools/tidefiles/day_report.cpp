@@ -8,8 +8,12 @@
 
 #include "tides/engine/prediction.h"
 #include "tides/engine/station_files.h"
+#include "tides/engine/station_folder_check.h"
 #include "tools/tidefiles/codepage.h"
 #include "tools/tidefiles/folder_builder.h"
+#include "tools/tidefiles/folder_image.h"
+#include "tools/tidefiles/station_entry.h"
+#include "host/brtide/printable_text.h"
 
 namespace br::tidefiles {
 namespace {
@@ -28,22 +32,22 @@ std::string Format(const char* format, double a) {
   return text;
 }
 
-std::string ClockTime(double hours) {
-  const long minutes = std::lround(hours * 60.0);
+std::string HourMinuteText(long minutes) {
   char text[32];
   std::snprintf(text, sizeof text, "%02ld:%02ld", minutes / 60, minutes % 60);
   return text;
 }
 
-std::string EventText(const bt::HourMinute& t) {
-  if (t.hour == -1) return "none";
-  char text[32];
-  if (t.hour >= 0 && t.hour <= 24 && t.minute >= 0 && t.minute < 60) {
-    std::snprintf(text, sizeof text, "%02d:%02d", t.hour, t.minute);
-  } else {
-    std::snprintf(text, sizeof text, "(%d, %d)", t.hour, t.minute);
-  }
-  return text;
+std::string DayMark(int offset) {
+  if (offset < 0) return " (previous day)";
+  return offset > 0 ? " (next day)" : "";
+}
+
+// The time of sample k: a point past 24:00 is the next day's (24:00 itself ends the day).
+std::string SampleTime(std::size_t k, double step) {
+  const long minutes = std::lround(static_cast<double>(k) * step * 60.0);
+  if (minutes <= 24 * 60) return HourMinuteText(minutes);
+  return HourMinuteText(minutes - 24 * 60) + DayMark(1);
 }
 
 std::string DateText(const bt::CalendarDate& d) {
@@ -61,19 +65,76 @@ void Extremes(const std::vector<float>& samples, std::size_t& highest, std::size
   }
 }
 
+// The day's sun as a TidesPort publishes it, with what the port cannot say: whether an
+// event happens and which day it falls on.
+struct SunReport {
+  bt::SunDayKind kind = bt::SunDayKind::kNormal;
+  bool happens[4] = {};
+  std::string time[4];  // "HH:MM"
+  int dayOffset[4] = {};
+};
+
+SunReport ReportSun(const bt::SunDay& sun) {
+  SunReport report;
+  const bt::PublishedSunTimes published = bt::PublishSunTimes(sun);
+  report.kind = published.kind;
+  if (report.kind != bt::SunDayKind::kNormal) return report;
+  for (int e = 0; e < 4; ++e) {
+    report.happens[e] = sun.outcomes[e] == bt::SunEventOutcome::kOccurs;
+    if (!report.happens[e]) continue;
+    report.time[e] = HourMinuteText(published.events[e].hour * 60L + published.events[e].minute);
+    report.dayOffset[e] = bt::EventDayOffset(sun.zoneHours[e]);
+  }
+  return report;
+}
+
+std::string SunLine(const SunReport& sun) {
+  if (sun.kind == bt::SunDayKind::kPolarDay) return "the sun stays above the horizon all day";
+  if (sun.kind == bt::SunDayKind::kPolarNight) return "the sun stays below the horizon all day";
+  static const char* const kLabels[4] = {"twilight begin ", "sunrise ", "sunset ", "twilight end "};
+  std::string line;
+  for (int e = 0; e < 4; ++e) {
+    line += (e ? ", " : "") + std::string(kLabels[e]);
+    line += sun.happens[e] ? sun.time[e] + DayMark(sun.dayOffset[e]) : "--:--";
+  }
+  return line;
+}
+
+Json SunJson(const SunReport& sun) {
+  static const char* const kKinds[] = {"ordinary", "polar_day", "polar_night"};
+  Json events = Json::object();
+  events["day"] = kKinds[static_cast<int>(sun.kind)];
+  for (int e = 0; e < 4; ++e) {
+    events[kEventNames[e]] = sun.happens[e] ? Json{{"time", sun.time[e]}, {"day_offset", sun.dayOffset[e]}} : Json();
+  }
+  return events;
+}
+
+// The folder as the check sees it; false with the reason on err when it is damaged.
+bool FolderIsSound(const std::string& folder, std::ostream& err) {
+  FolderImage image;
+  std::string error;
+  if (!ReadFolderImage(folder, image, error)) {
+    err << "tidefiles: predict: cannot open the station folder " << folder << " (" << error << ")\n";
+    return false;
+  }
+  const std::vector<std::string> problems = bt::CheckStationFolder(image);
+  if (problems.empty()) return true;
+  err << "tidefiles: predict: " << folder << " is damaged: " << problems.front();
+  if (problems.size() > 1) err << " (and " << problems.size() - 1 << " more; tidefiles check lists them)";
+  err << '\n';
+  return false;
+}
+
 }  // namespace
 
 int PrintPredictedDay(const PredictOptions& options, std::ostream& out, std::ostream& err) {
   const std::int32_t count = bt::DaySampleCount(options.step);
-  if (!std::isfinite(options.step) || options.step <= 0.0 || count < 1 || count > kMaxDaySamples) {
-    err << "tidefiles: predict: step must be a number of hours above 0 giving at most " << kMaxDaySamples
-        << " samples\n";
-    return 1;
-  }
   if (options.folder.size() > bt::kMaxFolderLength) {
     err << "tidefiles: predict: the folder path is longer than " << bt::kMaxFolderLength << " characters\n";
     return 1;
   }
+  if (!FolderIsSound(options.folder, err)) return 1;
   if (bt::OpenTideFiles(options.folder.c_str()) != 0) {
     err << "tidefiles: predict: cannot open the station folder " << options.folder
         << " (missing or incomplete td_num.ntx, td_crd.ntx or td_pnt.dat; try tidefiles check)\n";
@@ -82,8 +143,9 @@ int PrintPredictedDay(const PredictOptions& options, std::ostream& out, std::ost
   bt::StationIndexRecord key;
   if (options.station) {
     if (!bt::ReadStationIndexRecord(*options.station, key)) {
-      err << "tidefiles: predict: no station number " << *options.station << " (the folder has "
-          << bt::StationCount() << " stations, numbered from 0)\n";
+      const std::int32_t stations = bt::StationCount();
+      err << "tidefiles: predict: no station " << *options.station << " (station numbers "
+          << (stations > 0 ? "0 to " + std::to_string(stations - 1) : std::string("none: the folder is empty")) << ")\n";
       bt::CloseTideFiles();
       return 1;
     }
@@ -100,14 +162,14 @@ int PrintPredictedDay(const PredictOptions& options, std::ostream& out, std::ost
                                                samples.size(), sun, bt::FixedOffsetLocalMidnight(offsetSeconds));
   bt::CloseTideFiles();
   if (!day.stationFound) {
-    err << "tidefiles: predict: no station at latitude " << key.latitude << "', longitude " << key.longitude
-        << "' (or its block cannot be read whole)\n";
+    err << "tidefiles: predict: no station at " << PositionText(key.latitude, key.longitude) << '\n';
     return 1;
   }
   samples.resize(static_cast<std::size_t>(day.sampleCount));
   std::size_t highest = 0, lowest = 0;
   Extremes(samples, highest, lowest);
-  const std::string name = Windows1252ToUtf8(bt::StationName(header));
+  const std::string name = br::brtide::PrintableText(Windows1252ToUtf8(bt::StationName(header)));
+  const SunReport sunReport = ReportSun(sun);
 
   if (options.json) {
     Json j;
@@ -125,11 +187,7 @@ int PrintPredictedDay(const PredictOptions& options, std::ostream& out, std::ost
       j["highest"] = {{"index", highest}, {"height", heights[highest]}};
       j["lowest"] = {{"index", lowest}, {"height", heights[lowest]}};
     }
-    Json events = Json::object();
-    for (int e = 0; e < 4; ++e) {
-      events[kEventNames[e]] = {{"hour", sun.times.events[e].hour}, {"minute", sun.times.events[e].minute}};
-    }
-    j["sun"] = events;
+    j["sun"] = SunJson(sunReport);
     out << j.dump(2) << '\n';
     return 0;
   }
@@ -140,18 +198,16 @@ int PrintPredictedDay(const PredictOptions& options, std::ostream& out, std::ost
       << Format("%g", options.utcOffset) << ", step " << Format("%g", options.step) << " h, " << samples.size()
       << " samples (metres above chart datum)\n";
   for (std::size_t k = 0; k < samples.size(); ++k) {
-    out << Format("%6.0f", static_cast<double>(k)) << "  " << ClockTime(static_cast<double>(k) * options.step) << "  "
+    out << Format("%6.0f", static_cast<double>(k)) << "  " << SampleTime(k, options.step) << "  "
         << Format("%8.3f", samples[k] * kPublishedPerInternal) << '\n';
   }
   if (!samples.empty()) {
-    out << "highest: index " << highest << " (" << ClockTime(static_cast<double>(highest) * options.step) << ") "
+    out << "highest: index " << highest << " (" << SampleTime(highest, options.step) << ") "
         << Format("%.3f", samples[highest] * kPublishedPerInternal) << " m\n";
-    out << "lowest:  index " << lowest << " (" << ClockTime(static_cast<double>(lowest) * options.step) << ") "
+    out << "lowest:  index " << lowest << " (" << SampleTime(lowest, options.step) << ") "
         << Format("%.3f", samples[lowest] * kPublishedPerInternal) << " m\n";
   }
-  out << "sun (zone time): twilight begin " << EventText(sun.times.events[0]) << ", sunrise "
-      << EventText(sun.times.events[1]) << ", sunset " << EventText(sun.times.events[2]) << ", twilight end "
-      << EventText(sun.times.events[3]) << '\n';
+  out << "sun (zone time): " << SunLine(sunReport) << '\n';
   return 0;
 }
 

@@ -16,16 +16,15 @@ struct PredictOptions {
   std::optional<double> latitude;       // a position in degrees, rounded to whole minutes
   std::optional<double> longitude;
   br::tides::CalendarDate date;
-  double step = 1.0;        // hours
+  double step = 1.0;        // hours, within the command line's checked range
   double utcOffset = 0.0;   // the computer's standard time minus UT, hours
   bool json = false;
 };
 
-// Largest day accepted: a step of about 0.000024 hour (under a tenth of a second).
-inline constexpr std::int32_t kMaxDaySamples = 1000000;
-
-// Predicts and prints the day (samples in metres, the first highest and lowest points, the
-// four sun events as the engine gives them: hour -1 where an event does not happen).
+// Predicts and prints the day: samples in metres (a point past 24:00 marked as the next
+// day's), the first highest and lowest points, and the four sun events as a TidesPort
+// publishes them, each marked when it falls on the day before or after and "--:--" (null
+// in JSON) when it does not happen. A folder the check finds damaged is refused.
 // Returns the exit status: 0, or 1 with a message on err.
 int PrintPredictedDay(const PredictOptions& options, std::ostream& out, std::ostream& err);
 

@@ -30,6 +30,9 @@ struct StationEntry {
 // "station 12 "Newlyn"" for messages.
 std::string DescribeStation(std::size_t index, const std::string& utf8Name);
 
+// "50°06'N 005°33'W" for a position in whole minutes (degrees and minutes, UTF-8).
+std::string PositionText(int latitudeMinutes, int longitudeMinutes);
+
 // A text from the input as messages show it: one line (control characters become '?'),
 // at most 80 bytes, so that every message stays one line whatever the input holds.
 std::string MessageText(const std::string& text);

@@ -52,7 +52,7 @@ TEST_CASE("each fault gives its own clear line, naming its station") {
       {[](StationFolderBytes& f) { std::swap_ranges(&f.coordinateIndex[0], &f.coordinateIndex[10], &f.coordinateIndex[10]); },
        "td_crd.ntx: record 1: key 0 follows 3932220: not sorted by ascending StationKey"},
       {[&](StationFolderBytes& f) { Patch(f.stationIndex, 1, moveTo60), Patch(f.coordinateIndex, 0, moveTo60); },
-       "td_num.ntx: station 1: duplicate key: same position (latitude 60', longitude 60') as station 0"},
+       "td_num.ntx: station 1: duplicate key: same position (01\xC2\xB0" "00'N 001\xC2\xB0" "00'E) as station 0"},
       {[](StationFolderBytes& f) { Patch(f.coordinateIndex, 1, [](StationIndexRecord& r) { r.offset += 6; }); },
        "td_crd.ntx: station 0: record 1 differs from the td_num.ntx copy (offset 6 vs 0"},
       {[](StationFolderBytes& f) { f.stationData.resize(f.stationData.size() - 1); },
@@ -65,7 +65,7 @@ TEST_CASE("each fault gives its own clear line, naming its station") {
       {[](StationFolderBytes& f) { PutI16(f, 54, 0xFFFF); },
        "td_pnt.dat: station 0: constituent record 1: phase 65535 is outside 0..3599 tenths of a degree"},
       {[](StationFolderBytes& f) { PutI16(f, 40, 61); },
-       "td_pnt.dat: station 0: header position (latitude 61', longitude 60') differs from its index record"},
+       "td_pnt.dat: station 0: header position (01\xC2\xB0" "01'N 001\xC2\xB0" "00'E) differs from its index record (01\xC2\xB0" "00'N 001\xC2\xB0" "00'E)"},
       {[](StationFolderBytes& f) { PutI16(f, 40, 0x7FFF); },
        "td_pnt.dat: station 0: header latitude 32767' is outside -5400..5400 minutes (90 degrees)"},
       {[](StationFolderBytes& f) { f.stationData[44] = 127; },
@@ -73,6 +73,7 @@ TEST_CASE("each fault gives its own clear line, naming its station") {
       {[](StationFolderBytes& f) { f.stationData[44] = 13; }, "td_pnt.dat: station 0: zone description 13 is outside"},
       {[](StationFolderBytes& f) { f.stationData[1] = 0x1B; },
        "td_pnt.dat: station 0: name holds the control character ESC at byte 1"},
+      {[](StationFolderBytes& f) { f.stationData[0] = 0x9D; }, "td_pnt.dat: station 0: name holds the undefined byte 0x9D at byte 0"},
   };
   for (const auto& fault : faults) {
     StationFolderBytes image = SoundFolder();

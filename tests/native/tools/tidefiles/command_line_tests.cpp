@@ -49,8 +49,8 @@ TEST_CASE("build, check, dump and predict on disk; every failure and bad command
   // Found by position, sun events in zone time: sunrise about 06:24 UT at 5 15'W, shown an hour later.
   const Json day = predictJson({"--at", "-10.5", "-5.25", "--date", "2024-03-01", "--step", "6"});
   CHECK((day["name"] == "South" && day["zone"] == -1));
-  const int sunrise = day["sun"]["sunrise"]["hour"].get<int>() * 60 + day["sun"]["sunrise"]["minute"].get<int>();
-  CHECK((sunrise > 6 * 60 && sunrise < 8 * 60));
+  const std::string sunrise = day["sun"]["sunrise"]["time"].get<std::string>();
+  CHECK((sunrise > "06:00" && sunrise < "08:00" && day["sun"]["sunrise"]["day_offset"] == 0));
   // The table form: the worked M2 day of 1996-01-01 in metres (the engine suite checks its every value).
   const ToolRun table = RunTool({"predict", folder, "--station", "1", "--date", "1996-01-01"});
   CHECK(table.status == 0);
@@ -74,8 +74,11 @@ TEST_CASE("build, check, dump and predict on disk; every failure and bad command
       {{"build", "only-one"}, "", "build needs STATIONS.json and FOLDER", 2},
       {{"predict", "f", "--station", "1", "--at", "1", "2", "--date", "2024-01-01"}, "", "either --station N or --at", 2},
       {{"predict", "f", "--station", "1"}, "", "needs --date", 2},
-      {{"predict", "f", "--station", "0", "--date", "2023-02-29"}, "", "--date needs", 2},
-      {{"predict", "f", "--station", "0", "--date", "2024-01-01", "--step", "nan"}, "", "--step needs", 2},
+      {{"predict", "f", "--station", "0", "--date", "2023-02-29"}, "", "bad date \"2023-02-29\"", 2},
+      {{"predict", "f", "--station", "0", "--date", "0099-01-01"}, "", "years 100 to 9999", 2},
+      {{"predict", "f", "--station", "0", "--date", "2024-01-01", "--step", "nan"}, "", "bad step \"nan\" (hours from 0.001 to 24)", 2},
+      {{"predict", "f", "--station", "0", "--date", "2024-01-01", "--step", "0.00001"}, "", "bad step", 2},
+      {{"predict", "f", "--at", "91", "0", "--date", "2024-01-01"}, "", "--at needs LAT", 2},
       {fromInput, "[", "not valid JSON"},
       {fromInput, "[1]", "station 0: is not a JSON object"},
       {fromInput, R"([{"latitude": 1, "longitude": 2, "zone": 0, "constituents": []}])", "has no \"name\""},
@@ -89,9 +92,8 @@ TEST_CASE("build, check, dump and predict on disk; every failure and bad command
       {{"check", absent}, "", "absent: not a folder"},  // on standard output, as the check's problems
       {{"predict", absent, "--station", "0", "--date", "2024-01-01"}, "", "cannot open the station folder"},
       {{"predict", std::string(241, 'x'), "--station", "0", "--date", "2024-01-01"}, "", "longer than 240 characters"},
-      {{"predict", folder, "--station", "3", "--date", "2024-01-01"}, "", "no station number 3 (the folder has 3 stations"},
-      {{"predict", folder, "--at", "1", "1", "--date", "2024-01-01"}, "", "no station at latitude 60', longitude 60'"},
-      {{"predict", folder, "--station", "0", "--date", "2024-01-01", "--step", "0.00001"}, "", "at most 1000000 samples"},
+      {{"predict", folder, "--station", "3", "--date", "2024-01-01"}, "", "no station 3 (station numbers 0 to 2)"},
+      {{"predict", folder, "--at", "1N", "1E", "--date", "2024-01-01"}, "", "no station at 01\xC2\xB0" "00'N 001\xC2\xB0" "00'E"},
   };
   for (const auto& f : failures) {
     const ToolRun run = RunTool(f.args, f.input);
@@ -101,4 +103,45 @@ TEST_CASE("build, check, dump and predict on disk; every failure and bad command
     if (f.status == 2) CHECK(run.err.find("usage: tidefiles") != std::string::npos);
   }
   CHECK(RunTool({"check", folder}).out == "ok: 3 stations\n");
+}
+
+TEST_CASE("predict gives the sun as the library publishes it, marks other days and refuses a damaged folder") {
+  // Reykjavik at midsummer: the sun sets after midnight and never reaches -12 degrees.
+  // A station kept on UTC-8 at Greenwich: its morning falls on the day before.
+  TempFolder tmp;
+  const std::string folder = (tmp.path() / "folder").string();
+  const ToolRun build = RunTool({"build", "-", folder}, R"([
+    {"name": "Reykjavik", "latitude": 64.15, "longitude": -21.933333, "zone": 0, "mean_level": 2, "constituents": []},
+    {"name": "Wrong zone", "latitude": 0, "longitude": 0, "zone": 8, "mean_level": 1,
+     "constituents": [{"name": "M2", "amplitude": 1, "phase": 0}]}])");
+  REQUIRE(build.status == 0);
+
+  const ToolRun reykjavik = RunTool({"predict", folder, "--station", "0", "--date", "2026-06-21", "--step", "6"});
+  CHECK(reykjavik.out.find("sun (zone time): twilight begin --:--, sunrise 02:55, sunset 00:04 (next day), twilight end --:--\n") !=
+        std::string::npos);
+  // Before, the engine's raw times: "twilight begin (-2, -40), sunrise (-1, -56)".
+  const ToolRun shifted = RunTool({"predict", folder, "--at", "0", "0", "--date", "2000-03-20", "--step", "5"});
+  CHECK(shifted.out.find("sun (zone time): twilight begin 21:19 (previous day), sunrise 22:03 (previous day), sunset 10:10, "
+                         "twilight end 10:55\n") != std::string::npos);
+  // A step that does not divide 24 hours ends in the next day.
+  CHECK(shifted.out.find("     5  01:00 (next day)  ") != std::string::npos);
+  const Json json = Json::parse(RunTool({"predict", folder, "--station", "0", "--date", "2026-06-21", "--json"}).out);
+  CHECK((json["sun"]["day"] == "ordinary" && json["sun"]["twilight_begin"].is_null() && json["sun"]["twilight_end"].is_null()));
+  CHECK((json["sun"]["sunset"]["time"] == "00:04" && json["sun"]["sunset"]["day_offset"] == 1));
+
+  // A zone byte of 127 (UTC-127 hours): dump and predict fail and name the station.
+  const auto data = tmp.path() / "folder" / "td_pnt.dat";
+  std::string bytes;
+  {
+    std::ifstream in(data, std::ios::binary);
+    bytes.assign(std::istreambuf_iterator<char>(in), {});
+  }
+  bytes[44] = 127;
+  std::ofstream(data, std::ios::binary | std::ios::trunc) << bytes;
+  const ToolRun dump = RunTool({"dump", folder});
+  CHECK((dump.status == 1 && dump.err.find("tidefiles: dump: td_pnt.dat: station 0: zone description 127 is outside") != std::string::npos));
+  const ToolRun predict = RunTool({"predict", folder, "--station", "1", "--date", "2026-06-21"});
+  CHECK(predict.status == 1);
+  CHECK(predict.err == "tidefiles: predict: " + folder + " is damaged: td_pnt.dat: station 0: zone description 127 is outside "
+                       "-14..12 hours (UTC+14 to UTC-12)\n");
 }
