@@ -29,7 +29,11 @@ public:
     return true;
   }
 
-  // Runs after the day is calculated and printed, with the port still holding that day.
+  // Another extra output this one only works with ("--png" for "--size"); empty for none.
+  virtual std::string RequiredOption() const { return std::string(); }
+
+  // Runs after the day is calculated and printed, with the port holding that day (a port
+  // of the day on the station's clock with --station-time).
   // Progress goes to messages (standard error when the day itself went out as CSV),
   // failures to err. Returns an exit status (kExitOk when done).
   virtual int Run(ITidesPort& port, const DayRequest& request, const DayReport& day,

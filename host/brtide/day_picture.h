@@ -20,6 +20,7 @@ class PictureSizeOption final : public DayExtension {
 public:
   OptionSpec Option() const override;
   bool Accepts(const std::vector<std::string>& values, std::string& error) const override;
+  std::string RequiredOption() const override { return "--png"; }
   int Run(ITidesPort&, const DayRequest&, const DayReport&, const std::vector<std::string>&, std::ostream&,
           std::ostream&) override {
     return kExitOk;

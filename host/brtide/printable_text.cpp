@@ -1,5 +1,7 @@
 #include "host/brtide/printable_text.h"
 
+#include <cstdio>
+
 namespace br::brtide {
 
 std::string PrintableText(const std::string& utf8) {
@@ -18,6 +20,24 @@ std::string PrintableText(const std::string& utf8) {
     }
   }
   return shown;
+}
+
+std::string JsonString(const std::string& utf8) {
+  std::string json = "\"";
+  for (const char c : utf8) {
+    const auto u = static_cast<unsigned char>(c);
+    if (c == '"' || c == '\\') {
+      json += '\\';
+      json += c;
+    } else if (u < 0x20 || u == 0x7F) {
+      char escape[8];
+      std::snprintf(escape, sizeof escape, "\\u%04x", u);
+      json += escape;
+    } else {
+      json += c;
+    }
+  }
+  return json + "\"";
 }
 
 }  // namespace br::brtide

@@ -10,4 +10,7 @@ namespace br::brtide {
 // replaced by '?'. Other characters, malformed bytes included, pass unchanged.
 std::string PrintableText(const std::string& utf8);
 
+// A JSON string literal of UTF-8 text, quotes included; control characters escaped.
+std::string JsonString(const std::string& utf8);
+
 }  // namespace br::brtide

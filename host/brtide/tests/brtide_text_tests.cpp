@@ -18,7 +18,7 @@ TEST_CASE("command line mistakes give one clear line each") {
   const std::pair<std::vector<std::string>, const char*> mistakes[] = {
       {{}, "no command given (try --help)"},
       {{"tides"}, "unknown command \"tides\" (try --help)"},
-      {{"ports", "--folder", "f", "--box", "1", "2", "3"}, "--box needs 4 values: LATMIN LONMIN LATMAX LONMAX"},
+      {{"ports", "--folder", "f", "--box", "1", "2", "3"}, "--box needs 4 values: SOUTH WEST NORTH EAST"},
       {{"ports", "--folder", "f", "--folder", "g", "--box", "1", "2", "3", "4"}, "--folder is given twice"},
       {{"ports", "--folder", "f", "--port", "1"}, "unknown option --port for ports (try ports --help)"},
       {{"ports", "--folder", "f", "stray"}, "unexpected argument \"stray\" for ports"},
@@ -47,13 +47,27 @@ TEST_CASE("dates are real days as YYYY-MM-DD; day counts run from 1899-12-30 and
 
 constexpr double kDay = 45413.0;  // 2024-05-01
 static double At(int hour, int minute) { return kDay + (hour * 60 + minute) / 1440.0; }
-// A six-hourly day: low 0.5 m at 06:00, high 4.25 m at 12:00 (first of two equal highs).
-const DayReport kDayReport = {1491, "Brest", {48.383333333333333, -4.5}, std::nullopt, -1, kDay, 6.0, 60,
-                              {At(6, 2), At(6, 41), At(21, 27), At(22, 6)}, {2.0, 0.5, 4.25, 1.0, 4.25}, 2, 1, 4.25, 0.5};
 
-TEST_CASE("the day as text and as CSV") {
-  std::ostringstream text, csv;
-  WriteDayText(kDayReport, text);
+// A six-hourly day at Brest: lowest point 0.5 m at 06:00, highest 4.25 m at 12:00 (the
+// first of two equal highs); a low and a high water between the points.
+DayReport SixHourlyDay() {
+  DayReport day;
+  day.station = 1491;
+  day.name = "Brest";
+  day.position = {48.383333333333333, -4.5};
+  day.zone = -1;
+  day.predictionDate = kDay;
+  day.step = 6.0;
+  day.clockOffsetMinutes = 60;
+  day.sun = {At(6, 2), At(6, 41), At(21, 27), At(22, 6)};
+  day.heights = {2.0, 0.5, 4.25, 1.0, 4.25};
+  day.tides = {{352.4, 0.47, false}, {735.6, 4.31, true}};
+  return day;
+}
+
+TEST_CASE("the day as text, CSV and JSON") {
+  std::ostringstream text, csv, json;
+  WriteDayText(SixHourlyDay(), text);
   // Bars run from nothing at the lowest point to 40 marks at the highest.
   CHECK(text.str() == "Station   1491  Brest\n"
                       "Position  48\xC2\xB0 23'.000 N  004\xC2\xB0 30'.000 W\n"
@@ -64,16 +78,85 @@ TEST_CASE("the day as text and as CSV") {
                       "  sunrise          06:41\n"
                       "  sunset           21:27\n"
                       "  twilight ends    22:06\n"
-                      "Highest   4.250 m at 12:00\n"
-                      "Lowest    0.500 m at 06:00\n"
+                      "Tides     high and low water, times in this computer's standard time UTC+01:00\n"
+                      "  low   05:52    0.47 m\n"
+                      "  high  12:16    4.31 m\n"
                       "Heights   metres, every 6 hours, times in this computer's standard time UTC+01:00\n"
                       "  00:00     2.000  ################\n"
-                      "  06:00     0.500    low\n"
-                      "  12:00     4.250  " + std::string(40, '#') + "  high\n"
+                      "  06:00     0.500    lowest\n"
+                      "  12:00     4.250  " + std::string(40, '#') + "  highest\n"
                       "  18:00     1.000  #####\n"
                       "  24:00     4.250  " + std::string(40, '#') + "\n");
-  WriteDayCsv(kDayReport, csv);
-  CHECK(csv.str() == "time,height_m\n2024-05-01T00:00:00+01:00,2.000\n2024-05-01T06:00:00+01:00,0.500\n"
-                     "2024-05-01T12:00:00+01:00,4.250\n2024-05-01T18:00:00+01:00,1.000\n"
-                     "2024-05-02T00:00:00+01:00,4.250\n");
+  // On a computer kept on UTC the sun stays on the station's clock, in its time order: the
+  // twilight at 06:02 there is 05:02 UTC and the sunrise 05:41 UTC, before the low water
+  // at 05:52 UTC. The evening twilight does not happen: an empty time, last.
+  DayReport utc = SixHourlyDay();
+  utc.clockOffsetMinutes = 0;
+  utc.sun.endTwilight = At(21, 0);  // the library's mark: the sunset's hour
+  WriteDayCsv(utc, csv);
+  CHECK(csv.str() == "time,height_m,event\n2024-05-01T00:00:00+00:00,2.000,\n2024-05-01T06:02:00+01:00,,twilight begins\n"
+                     "2024-05-01T06:41:00+01:00,,sunrise\n2024-05-01T05:52:00+00:00,0.470,low water\n"
+                     "2024-05-01T06:00:00+00:00,0.500,\n2024-05-01T12:00:00+00:00,4.250,\n"
+                     "2024-05-01T12:16:00+00:00,4.310,high water\n2024-05-01T18:00:00+00:00,1.000,\n"
+                     "2024-05-01T21:27:00+01:00,,sunset\n2024-05-02T00:00:00+00:00,4.250,\n,,twilight ends\n");
+  WriteDayJson(utc, json);
+  CHECK(json.str() == "{\n  \"station\": 1491, \"name\": \"Brest\", \"latitude\": 48.383333, \"longitude\": -4.500000, \"zone\": -1,\n"
+                      "  \"date\": \"2024-05-01\",\n"
+                      "  \"sun\": {\"day\": \"ordinary\", \"twilight_begins\": \"2024-05-01T06:02:00+01:00\", "
+                      "\"sunrise\": \"2024-05-01T06:41:00+01:00\", \"sunset\": \"2024-05-01T21:27:00+01:00\", "
+                      "\"twilight_ends\": null},\n"
+                      "  \"tides\": [\n    {\"time\": \"2024-05-01T05:52:00+00:00\", \"height_m\": 0.470, \"type\": \"low\"},\n"
+                      "    {\"time\": \"2024-05-01T12:16:00+00:00\", \"height_m\": 4.310, \"type\": \"high\"}\n  ],\n"
+                      "  \"step_hours\": 6,\n  \"heights\": [\n"
+                      "    {\"time\": \"2024-05-01T00:00:00+00:00\", \"height_m\": 2.000},\n"
+                      "    {\"time\": \"2024-05-01T06:00:00+00:00\", \"height_m\": 0.500},\n"
+                      "    {\"time\": \"2024-05-01T12:00:00+00:00\", \"height_m\": 4.250},\n"
+                      "    {\"time\": \"2024-05-01T18:00:00+00:00\", \"height_m\": 1.000},\n"
+                      "    {\"time\": \"2024-05-02T00:00:00+00:00\", \"height_m\": 4.250}\n  ]\n}\n");
+}
+
+
+namespace {
+SunTimes Published(int beginH, int beginM, int riseH, int riseM, int setH, int setM, int endH, int endM) {
+  return {At(beginH, beginM), At(riseH, riseM), At(setH, setM), At(endH, endM)};
+}
+// "happens/day/HH:MM" of each event, for one comparison.
+std::string Reading(const SunDay& sun) {
+  std::string text;
+  for (const SunEvent& e : sun.events)
+    text += e.happens ? std::to_string(e.dayOffset) + "/" + ClockText(e.minuteOfDay * 60, false) + " " : "none ";
+  return text;
+}
+}  // namespace
+
+TEST_CASE("published sun times read as a sailor reads them") {
+  // Reykjavik at midsummer (zone 0, 21 56'W): the sunset after midnight belongs to the
+  // next day; neither twilight happens, whether marked at the sunrise or, as the library
+  // published it before, at the sunset's hour (00:00).
+  CHECK(Reading(ReadSunDay(Published(2, 55, 2, 55, 0, 4, 0, 0), -21.933, 0)) == "none 0/02:55 1/00:04 none ");
+  CHECK(Reading(ReadSunDay(Published(0, 0, 2, 55, 0, 4, 0, 0), -21.933, 0)) == "none 0/02:55 1/00:04 none ");
+  // A station kept on UTC-8 at Greenwich: its morning falls on the day before.
+  CHECK(Reading(ReadSunDay(Published(21, 19, 22, 3, 10, 10, 10, 55), 0.0, 8)) == "-1/21:19 -1/22:03 0/10:10 0/10:55 ");
+  // 60 N at midsummer: no twilight, marked at the sunset's hour; Brest in June: the
+  // evening twilight ends after midnight.
+  CHECK(Reading(ReadSunDay(Published(21, 0, 2, 35, 21, 27, 21, 0), 0.0, 0)) == "none 0/02:35 0/21:27 none ");
+  CHECK(Reading(ReadSunDay(Published(4, 10, 6, 5, 22, 30, 0, 20), -4.5, -1)) == "0/04:10 0/06:05 0/22:30 1/00:20 ");
+  CHECK(ReadSunDay(Published(0, 0, 0, 0, 23, 59, 23, 59), 15.0, -1).kind == SunDayKind::PolarDay);
+  CHECK(ReadSunDay(Published(0, 0, 0, 0, 0, 0, 0, 0), 15.0, -1).kind == SunDayKind::PolarNight);
+
+  // In the day's text: "--:--" for what does not happen, the next day marked, and points
+  // of a step that does not divide 24 hours past 24:00 marked as the next day's.
+  DayReport day = SixHourlyDay();
+  day.sun = Published(2, 55, 2, 55, 0, 4, 0, 0);
+  day.position = {64.15, -21.933};
+  day.zone = 0;
+  day.step = 5.0;
+  day.heights = {2.0, 0.5, 4.25, 1.0, 4.25, 3.0};
+  std::ostringstream text;
+  WriteDayText(day, text);
+  for (const char* line : {"  twilight begins  --:--  (the sun stays above -12\xC2\xB0)\n", "  sunrise          02:55\n",
+                           "  sunset           00:04 (next day)\n", "  00:00                2.000",
+                           "  01:00 (next day)     3.000  ###"}) {
+    CHECK_MESSAGE(text.str().find(line) != std::string::npos, line, "\n", text.str());
+  }
 }
