@@ -1,6 +1,7 @@
 #include "host/brtide/day_picture.h"
 
 #include "host/brtide/picture_size.h"
+#include "host/brtide/picture_title.h"
 #include "host/brtide/png_file.h"
 #include "host/brtide/wide_text.h"
 
@@ -53,7 +54,24 @@ private:
   void* bits_ = nullptr;
 };
 
-// Draws the port's calculated day with a new TidesWindow (labels on, automatic scale).
+// The title lines in the default GUI font, black on white, over the picture's top.
+void DrawTitle(const std::vector<std::string>& lines, const PictureBitmap& picture, int width) {
+  const RECT area{0, 0, width, kPictureTitleHeight};
+  FillRect(picture.Dc(), &area, static_cast<HBRUSH>(GetStockObject(WHITE_BRUSH)));
+  const HGDIOBJ oldFont = SelectObject(picture.Dc(), GetStockObject(DEFAULT_GUI_FONT));
+  SetBkMode(picture.Dc(), TRANSPARENT);
+  SetTextColor(picture.Dc(), RGB(0, 0, 0));
+  int y = 3;
+  for (const std::string& line : lines) {
+    const std::wstring text = WideFromUtf8(line);
+    TextOutW(picture.Dc(), 6, y, text.c_str(), static_cast<int>(text.size()));
+    y += (kPictureTitleHeight - 6) / 2;
+  }
+  SelectObject(picture.Dc(), oldFont);
+}
+
+// Draws the port's calculated day with a new TidesWindow (labels on, automatic scale)
+// below the title.
 bool DrawDay(ITidesPort& port, const PictureBitmap& picture, const PictureSize& size, std::string& error) {
   CLSID clsid{};
   if (FAILED(CLSIDFromProgID(L"BR_Info.TidesWindow", &clsid))) {
@@ -71,7 +89,7 @@ bool DrawDay(ITidesPort& port, const PictureBitmap& picture, const PictureSize& 
     error = "BR_Info.TidesWindow cannot show the port";
     return false;
   }
-  const RECTL bounds{0, 0, size.width, size.height};
+  const RECTL bounds{0, kPictureTitleHeight, size.width, size.height};
   if (FAILED(view->Draw(DVASPECT_CONTENT, -1, nullptr, nullptr, nullptr, picture.Dc(), &bounds, nullptr, nullptr,
                         0))) {
     error = "BR_Info.TidesWindow cannot draw the day";
@@ -96,7 +114,8 @@ OptionSpec DayPictureOption::Option() const {
   option.name = kPngOption;
   option.valueCount = 1;
   option.valueHint = "FILE";
-  option.help = "also draw the day with the TidesWindow control into a PNG picture";
+  option.help = "also draw the day with the TidesWindow control into a PNG picture, under a title that names "
+                "the clocks of the curve and of the sun bands";
   return option;
 }
 
@@ -108,7 +127,7 @@ bool DayPictureOption::Accepts(const std::vector<std::string>& values, std::stri
   return true;
 }
 
-int DayPictureOption::Run(ITidesPort& port, const DayRequest& request, const DayReport&,
+int DayPictureOption::Run(ITidesPort& port, const DayRequest& request, const DayReport& day,
                           const std::vector<std::string>& values, std::ostream& messages, std::ostream& err) {
   PictureSize size;
   std::string error;
@@ -124,6 +143,7 @@ int DayPictureOption::Run(ITidesPort& port, const DayRequest& request, const Day
     return kExitFailure;
   }
   const std::wstring path = WideFromUtf8(values.front());
+  DrawTitle(PictureTitle(day), picture, size.width);
   if (!DrawDay(port, picture, size, error) ||
       !WritePngFile(path, picture.Bits(), size.width, size.height, error)) {
     err << "brtide: " << error << " (" << values.front() << ")\n";

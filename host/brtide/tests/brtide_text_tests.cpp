@@ -4,6 +4,7 @@
 #include "host/brtide/ArgumentParser.h"
 #include "host/brtide/clock_text.h"
 #include "host/brtide/day_report.h"
+#include "host/brtide/picture_title.h"
 #include "host/brtide/position_text.h"
 #include "host/brtide/requests.h"  // BrtideCommands
 #include "host/brtide/value_parsers.h"
@@ -159,4 +160,14 @@ TEST_CASE("published sun times read as a sailor reads them") {
                            "  01:00 (next day)     3.000  ###"}) {
     CHECK_MESSAGE(text.str().find(line) != std::string::npos, line, "\n", text.str());
   }
+}
+
+TEST_CASE("the picture's title names the clock of the curve and of the sun bands") {
+  DayReport day = SixHourlyDay();
+  day.clockOffsetMinutes = 0;
+  CHECK(PictureTitle(day) == std::vector<std::string>{"Brest (station 1491)  2024-05-01  heights in metres",
+                                                      "curve: this computer's standard time UTC+00:00    sun bands: station time UTC+01:00"});
+  day.stationTime = true;
+  day.clockOffsetMinutes = 60;
+  CHECK(PictureTitle(day)[1] == "curve and sun bands: station time UTC+01:00");
 }
