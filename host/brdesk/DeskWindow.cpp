@@ -1,5 +1,6 @@
 #include "host/brdesk/DeskWindow.h"
 
+#include "host/brtide/default_station_folder.h"
 #include "host/brtide/png_file.h"
 
 #include <oleauto.h>
@@ -37,6 +38,13 @@ bool StartAtl(std::string& error) {
   return true;
 }
 
+std::string Narrow(const wchar_t* text) {
+  const int n = WideCharToMultiByte(CP_ACP, 0, text, -1, nullptr, 0, nullptr, nullptr);
+  std::string out(n > 0 ? n - 1 : 0, '\0');
+  if (n > 1) WideCharToMultiByte(CP_ACP, 0, text, -1, &out[0], n, nullptr, nullptr);
+  return out;
+}
+
 std::string Ansi(BSTR text) {
   if (!text) return std::string();
   const int n = WideCharToMultiByte(CP_ACP, 0, text, -1, nullptr, 0, nullptr, nullptr);
@@ -49,6 +57,61 @@ std::string WindowText(HWND window) {
   char buffer[256] = {};
   GetWindowTextA(window, buffer, sizeof buffer);
   return buffer;
+}
+
+// The computer's standard time and a zone description as "UTC+01:00".
+std::string OffsetText(int minutesEast) {
+  char text[16];
+  const int size = minutesEast < 0 ? -minutesEast : minutesEast;
+  std::snprintf(text, sizeof text, "UTC%c%02d:%02d", minutesEast < 0 ? '-' : '+', size / 60, size % 60);
+  return text;
+}
+
+int ComputerOffsetMinutes() {
+  TIME_ZONE_INFORMATION zone{};
+  if (GetTimeZoneInformation(&zone) == TIME_ZONE_ID_INVALID) return 0;
+  return -static_cast<int>(zone.Bias + zone.StandardBias);
+}
+
+// The classes brdesk creates; none can be made until BR_Info.dll is registered.
+bool LibraryRegistered(std::string& error) {
+  for (const wchar_t* name : {L"BR_Info.TidesDatabase", L"BR_Info.TidesPortList", L"BR_Info.TidesWindow"}) {
+    CLSID clsid{};
+    if (FAILED(CLSIDFromProgID(name, &clsid))) {
+      error = "BR_Info.dll is not registered (regsvr32 BR_Info.dll): no class is known by the name " + Narrow(name);
+      return false;
+    }
+  }
+  return true;
+}
+
+// One array of ports from the arrays of several GetPorts answers (VT_EMPTY for none).
+HRESULT JoinPorts(VARIANT* parts, int count, VARIANT* joined) {
+  VariantInit(joined);
+  std::vector<IUnknown*> ports;
+  for (int i = 0; i < count; ++i) {
+    if (V_VT(&parts[i]) != (VT_ARRAY | VT_UNKNOWN) || !V_ARRAY(&parts[i])) continue;
+    SAFEARRAY* array = V_ARRAY(&parts[i]);
+    LONG lower = 0, upper = -1;
+    SafeArrayGetLBound(array, 1, &lower);
+    SafeArrayGetUBound(array, 1, &upper);
+    for (LONG k = lower; k <= upper; ++k) {
+      IUnknown* port = nullptr;  // with a reference of its own
+      if (SUCCEEDED(SafeArrayGetElement(array, &k, &port)) && port) ports.push_back(port);
+    }
+  }
+  if (ports.empty()) return S_OK;
+  SAFEARRAY* array = SafeArrayCreateVector(VT_UNKNOWN, 0, static_cast<ULONG>(ports.size()));
+  HRESULT hr = array ? S_OK : E_OUTOFMEMORY;
+  for (LONG k = 0; SUCCEEDED(hr) && k < static_cast<LONG>(ports.size()); ++k) hr = SafeArrayPutElement(array, &k, ports[k]);
+  for (IUnknown* port : ports) port->Release();  // the array holds its own references
+  if (FAILED(hr)) {
+    if (array) SafeArrayDestroy(array);
+    return hr;
+  }
+  V_VT(joined) = VT_ARRAY | VT_UNKNOWN;
+  V_ARRAY(joined) = array;
+  return S_OK;
 }
 
 template <class I>
@@ -76,9 +139,9 @@ DeskWindow::DeskWindow(const DeskOptions& options)
         // Arguments arrive last first: (Time, WaveValue).
         SYSTEMTIME time{};
         if (params.rgvarg[1].vt != VT_R8 || !VariantTimeToSystemTime(params.rgvarg[1].dblVal, &time)) return;
-        char text[160];
-        std::snprintf(text, sizeof text, "%s  %04u-%02u-%02u %02u:%02u  %.2f m", portName_.c_str(), time.wYear,
-                      time.wMonth, time.wDay, time.wHour, time.wMinute,
+        char text[200];
+        std::snprintf(text, sizeof text, "%s  %04u-%02u-%02u %02u:%02u %s  %.2f m", portName_.c_str(), time.wYear,
+                      time.wMonth, time.wDay, time.wHour, time.wMinute, OffsetText(ComputerOffsetMinutes()).c_str(),
                       params.rgvarg[0].vt == VT_R8 ? params.rgvarg[0].dblVal : 0.0);
         SetStatus(text);
       }) {}
@@ -95,7 +158,7 @@ DeskWindow::~DeskWindow() {
 }
 
 bool DeskWindow::Create(std::string& error) {
-  if (!StartAtl(error)) return false;
+  if (!LibraryRegistered(error) || !StartAtl(error)) return false;
   WNDCLASSW wc{};
   wc.lpfnWndProc = Procedure;
   wc.hInstance = GetModuleHandleW(nullptr);
@@ -140,7 +203,7 @@ bool DeskWindow::Create(std::string& error) {
   statusLine_ = child("STATIC", "Pick a station; move the pointer over the graph to read the tide.",
                       SS_LEFT | SS_CENTERIMAGE | SS_SUNKEN);
   if (FAILED(ControlOf(listHost_, IID_ITidesPortList, &list_)) || FAILED(ControlOf(graphHost_, IID_ITidesWindow, &graph_))) {
-    error = "BR_Info.TidesPortList or BR_Info.TidesWindow cannot be made (is BR_Info.dll registered?)";
+    error = "BR_Info.TidesPortList or BR_Info.TidesWindow cannot be made";
     return false;
   }
   listSink_.Connect(list_);
@@ -152,7 +215,7 @@ bool DeskWindow::Create(std::string& error) {
 bool DeskWindow::LoadPorts(std::string& error) {
   double box[4];
   if (!ParseBox(WindowText(boxEdit_), box)) {
-    error = "the box wants south west north east in degrees";
+    error = "the box wants SOUTH WEST NORTH EAST in degrees";
     SetStatus(error);
     return false;
   }
@@ -165,17 +228,32 @@ bool DeskWindow::LoadPorts(std::string& error) {
       return false;
     }
     std::wstring folder(options_.folder.begin(), options_.folder.end());
+    if (folder.empty()) folder = br::brtide::DefaultStationFolder();
+    if (folder.empty()) {
+      error = "no --folder given and no data\\world folder beside brdesk or above it";
+      return false;
+    }
     BSTR name = SysAllocString(folder.c_str());
     const HRESULT hr = database_->Initialize(name);
     SysFreeString(name);
     if (FAILED(hr)) {
-      error = "the station folder cannot be opened";
+      error = "\"" + Narrow(folder.c_str()) + "\" is not a tide station folder (td_num.ntx, td_crd.ntx and td_pnt.dat, readable)";
       return false;
     }
   }
+  // A box across the 180th meridian is asked for as its two halves (the library would
+  // swap a west edge east of the east edge).
+  VARIANT parts[2];
+  VariantInit(&parts[0]);
+  VariantInit(&parts[1]);
+  const bool across = CrossesDateLine(box);
+  HRESULT hr = database_->GetPorts(box[0], box[1], box[2], across ? 181.0 : box[3], &parts[0]);
+  if (SUCCEEDED(hr) && across) hr = database_->GetPorts(box[0], -181.0, box[2], box[3], &parts[1]);
   VARIANT ports;
-  VariantInit(&ports);
-  if (FAILED(database_->GetPorts(box[0], box[1], box[2], box[3], &ports))) {
+  if (SUCCEEDED(hr)) hr = JoinPorts(parts, 2, &ports);
+  VariantClear(&parts[0]);
+  VariantClear(&parts[1]);
+  if (FAILED(hr)) {
     error = "GetPorts failed";
     return false;
   }
@@ -233,12 +311,17 @@ bool DeskWindow::ReadDate(double& date) const {
 void DeskWindow::Recalculate() {
   double date = 0.0;
   if (!ReadDate(date)) {
-    SetStatus("the date wants YYYY-MM-DD");
+    SetStatus("the date wants a real day as YYYY-MM-DD");
     return;
   }
   if (!port_) return;
   graph_->Calculate(kStepHours, date);
-  SetStatus(portName_ + "  " + WindowText(dateEdit_));
+  // The graph draws its curve on this computer's standard time and its sun bands on the
+  // station's: the status line says so.
+  long zone = 0;
+  const std::string station = SUCCEEDED(port_->get_TimeZone(&zone)) ? OffsetText(static_cast<int>(-zone * 60)) : "?";
+  SetStatus(portName_ + "  " + WindowText(dateEdit_) + "  heights in metres; curve: this computer's standard time " +
+            OffsetText(ComputerOffsetMinutes()) + ", sun bands: station time " + station);
 }
 
 void DeskWindow::SetStatus(const std::string& text) {

@@ -1,44 +1,31 @@
 #include "host/brdesk/desk_options.h"
 
-#include <cmath>
-#include <cstdlib>
 #include <sstream>
+#include <utility>
+
+#include "host/brtide/value_parsers.h"
 
 namespace br::brdesk {
 
 namespace {
-
-bool ParseNumber(const std::string& text, double& value) {
-  if (text.empty()) return false;
-  char* end = nullptr;
-  value = std::strtod(text.c_str(), &end);
-  return end && *end == '\0' && std::isfinite(value);
-}
 
 bool ParseCount(const std::string& text, int& value) {
   if (text.empty() || text.size() > 9) return false;
   for (char c : text) {
     if (c < '0' || c > '9') return false;
   }
-  value = std::atoi(text.c_str());
+  value = std::stoi(text);
   return true;
 }
 
 }  // namespace
 
 bool ParseDate(const std::string& text, int& year, int& month, int& day) {
-  if (text.size() != 10 || text[4] != '-' || text[7] != '-') return false;
-  int y = 0, m = 0, d = 0;
-  if (!ParseCount(text.substr(0, 4), y) || !ParseCount(text.substr(5, 2), m) || !ParseCount(text.substr(8, 2), d)) {
-    return false;
-  }
-  static const int kDays[] = {31, 28, 31, 30, 31, 30, 31, 31, 30, 31, 30, 31};
-  if (y < 1601 || m < 1 || m > 12 || d < 1) return false;
-  const bool leap = (y % 4 == 0 && y % 100 != 0) || y % 400 == 0;
-  if (d > kDays[m - 1] + (m == 2 && leap ? 1 : 0)) return false;
-  year = y;
-  month = m;
-  day = d;
+  const auto date = br::brtide::ParseIsoDate(text);
+  if (!date) return false;
+  year = date->year;
+  month = date->month;
+  day = date->day;
   return true;
 }
 
@@ -49,17 +36,20 @@ bool ParseBox(const std::string& text, double box[4]) {
   }
   std::istringstream in(spaced);
   std::string word;
-  double values[4];
-  int count = 0;
-  while (in >> word) {
-    if (count == 4 || !ParseNumber(word, values[count])) return false;
-    ++count;
-  }
-  if (count != 4) return false;
-  if (values[0] < -90 || values[2] > 90 || values[0] > values[2]) return false;
-  for (int i = 0; i < 4; ++i) box[i] = values[i];
+  std::vector<std::string> words;
+  while (in >> word) words.push_back(word);
+  if (words.size() != 4) return false;
+  const auto south = br::brtide::ParseLatitude(words[0]), west = br::brtide::ParseLongitude(words[1]);
+  const auto north = br::brtide::ParseLatitude(words[2]), east = br::brtide::ParseLongitude(words[3]);
+  if (!south || !west || !north || !east) return false;
+  box[0] = std::min(*south, *north);
+  box[1] = *west;
+  box[2] = std::max(*south, *north);
+  box[3] = *east;
   return true;
 }
+
+bool CrossesDateLine(const double box[4]) { return box[1] > box[3]; }
 
 bool ParseDeskOptions(const std::vector<std::string>& arguments, DeskOptions& options, std::string& error) {
   for (size_t i = 0; i < arguments.size(); ++i) {
@@ -73,20 +63,25 @@ bool ParseDeskOptions(const std::vector<std::string>& arguments, DeskOptions& op
       return true;
     };
     std::string text;
-    if (name == "--folder") {
-      if (!value(options.folder)) return false;
+    if (name == "--help" || name == "-h") {
+      options.help = true;
+    } else if (name == "--folder") {
+      if (!value(options.folder) || options.folder.empty()) {
+        error = "--folder wants a station folder";
+        return false;
+      }
     } else if (name == "--box") {
       // Four values, given as one argument or as four.
       if (i + 4 < arguments.size() + 0 && ParseBox(arguments[i + 1] + " " + arguments[i + 2] + " " +
                                                        arguments[i + 3] + " " + arguments[i + 4], options.box)) {
         i += 4;
       } else if (!value(text) || !ParseBox(text, options.box)) {
-        error = "--box wants south west north east in degrees";
+        error = "--box wants SOUTH WEST NORTH EAST in degrees (-90 to 90, -180 to 180, or 48.5N 4.5W)";
         return false;
       }
     } else if (name == "--date") {
       if (!value(text) || !ParseDate(text, options.year, options.month, options.day)) {
-        error = "--date wants YYYY-MM-DD";
+        error = "--date wants a real day as YYYY-MM-DD, years 100 to 9999";
         return false;
       }
     } else if (name == "--select") {
@@ -100,11 +95,33 @@ bool ParseDeskOptions(const std::vector<std::string>& arguments, DeskOptions& op
         return false;
       }
     } else {
-      error = "unknown option " + name;
+      error = "unknown option " + name + " (try --help)";
       return false;
     }
   }
   return true;
+}
+
+void WriteDeskUsage(std::ostream& out) {
+  out << "usage: brdesk [--folder F] [--box SOUTH WEST NORTH EAST] [--date YYYY-MM-DD] [--select N]\n"
+         "              [--screenshot FILE]\n"
+         "\n"
+         "The tide desk: the stations of a box in a TidesPortList, the picked one's day in a\n"
+         "TidesWindow, the pointer's reading and the graph's clocks in the status line.\n"
+         "\n"
+         "  --folder F          station folder; default: the world set, data\\world beside brdesk\n"
+         "                      or in a folder above it\n"
+         "  --box S W N E       the box in degrees, north and east positive (default 47.5 -6 49.5 -3,\n"
+         "                      western Brittany); a WEST edge east of the EAST edge is the box\n"
+         "                      across the 180th meridian\n"
+         "  --date YYYY-MM-DD   the day (default today)\n"
+         "  --select N          pick row N of the list (from 0, in name order) as a user would\n"
+         "  --screenshot FILE   lay out, pick the row, write the whole window to a PNG file, print\n"
+         "                      the status line and exit (no window stays open)\n"
+         "  --help              this text\n"
+         "\n"
+         "Exit status: 0 done, 1 the library, the folder or the row cannot be had, 2 a wrong\n"
+         "command line.\n";
 }
 
 }  // namespace br::brdesk

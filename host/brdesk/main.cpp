@@ -5,6 +5,7 @@
 #include <shellapi.h>
 
 #include <cstdio>
+#include <sstream>
 #include <string>
 #include <vector>
 
@@ -17,9 +18,9 @@ std::string Narrow(const wchar_t* text) {
   return out;
 }
 
-int Fail(const std::string& message) {
+int Fail(const std::string& message, int status = 1) {
   std::fprintf(stderr, "brdesk: %s\n", message.c_str());
-  return 1;
+  return status;
 }
 
 void Pump() {
@@ -68,7 +69,13 @@ int WINAPI wWinMain(HINSTANCE, HINSTANCE, PWSTR, int) {
   LocalFree(words);
   br::brdesk::DeskOptions options;
   std::string error;
-  if (!br::brdesk::ParseDeskOptions(arguments, options, error)) return Fail(error);
+  if (!br::brdesk::ParseDeskOptions(arguments, options, error)) return Fail(error, 2);
+  if (options.help) {
+    std::ostringstream usage;
+    br::brdesk::WriteDeskUsage(usage);
+    std::fputs(usage.str().c_str(), stdout);
+    return 0;
+  }
   if (FAILED(OleInitialize(nullptr))) return Fail("OLE cannot start");
   const int status = Run(options);
   OleUninitialize();

@@ -7,6 +7,7 @@
 #include <cstdio>
 
 #include "host/brtide/clock_text.h"
+#include "host/brtide/default_station_folder.h"
 #include "host/brtide/wide_text.h"
 #include "tides/engine/station_files.h"
 #include "tides/engine/station_folder_check.h"
@@ -105,18 +106,6 @@ int ComputerStandardOffsetMinutes() {
   TIME_ZONE_INFORMATION zone = {};
   if (GetTimeZoneInformation(&zone) == TIME_ZONE_ID_INVALID) return 0;
   return -static_cast<int>(zone.Bias + zone.StandardBias);  // universal time = local + bias
-}
-
-std::wstring DefaultStationFolder() {
-  std::vector<wchar_t> self(32768);
-  const DWORD length = GetModuleFileNameW(nullptr, self.data(), static_cast<DWORD>(self.size()));
-  std::wstring folder(self.data(), length);
-  for (std::size_t cut = folder.find_last_of(L"\\/"); cut != std::wstring::npos; cut = folder.find_last_of(L"\\/")) {
-    folder.erase(cut);
-    const std::wstring candidate = folder + L"\\data\\world";
-    if (GetFileAttributesW((candidate + L"\\td_num.ntx").c_str()) != INVALID_FILE_ATTRIBUTES) return candidate;
-  }
-  return std::wstring();
 }
 
 bool TideService::Create(std::string& error) {

@@ -68,8 +68,4 @@ private:
 // the library starts a day at local standard midnight).
 int ComputerStandardOffsetMinutes();
 
-// "data\world" beside the program or in a folder above it (the build tree's program
-// finds the source tree's world set); empty when there is none.
-std::wstring DefaultStationFolder();
-
 }  // namespace br::brtide
