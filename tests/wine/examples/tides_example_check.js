@@ -28,7 +28,8 @@ try {
   var root = fso.GetParentFolderName(fso.GetParentFolderName(fso.GetParentFolderName(
       fso.GetParentFolderName(WScript.ScriptFullName))));
   var folder = fso.BuildPath(root, "data\\world");
-  var example = capture("cscript //nologo \"" + fso.BuildPath(root, "examples\\tides.js") + "\"");
+  var script = "cscript //nologo \"" + fso.BuildPath(root, "examples\\tides.js") + "\"";
+  var example = capture(script);
   check(example.status == 0, "the example exits 0, got " + example.status);
   var out = example.lines;
 
@@ -59,6 +60,12 @@ try {
                       port.MinValue.toFixed(3) + " m at " + clock(port.MinValueIndex / 24),
         "extremes line: " + out[3]);
   check(out[4 + 24] == "  24:00  " + port.WavePoint(24).toFixed(3), "last point line: " + out[28]);
+
+  // An error is caught and printed with its code, and the script exits 1 (Wine's cscript
+  // would print nothing and exit 0).
+  var failed = capture(script + " \"" + fso.BuildPath(root, "no such folder") + "\"");
+  check(failed.status == 1, "a bad folder: exit status 1, got " + failed.status);
+  check(failed.lines[0].indexOf("tides.js: error 0x80070057: ") == 0, "a bad folder: " + failed.lines[0]);
 
   // brtide, the C++ client, prints the same heights for the same station and day.
   var brtide = "Z:" + shell.Environment("PROCESS")("BR_WIN64_DIR").replace(/\//g, "\\") + "\\host\\brtide\\brtide.exe";
