@@ -1,6 +1,7 @@
 // The tide road from JScript: open the world station set, look at a box, find Brest,
-// calculate today's tides and read the extremes, sun times and every point.
-//   cscript //nologo tides.js [station folder]
+// calculate a day's tides (today's unless a date is given) and read the extremes, sun
+// times and every point.
+//   cscript //nologo tides.js [station folder [YYYY-MM-DD]]
 // Wine's cscript says nothing about an error the script does not catch: every error is
 // caught here, printed with its code, and ends the script with exit status 1.
 try {
@@ -25,8 +26,13 @@ try {
     var m = Math.round(days * 1440);
     return ("0" + Math.floor(m / 60)).slice(-2) + ":" + ("0" + m % 60).slice(-2);
   };
-  var now = new Date();  // today as a day-count date: days since 1899-12-30
-  port.Calculate(1, (Date.UTC(now.getFullYear(), now.getMonth(), now.getDate()) - Date.UTC(1899, 11, 30)) / 864e5);
+  var now = new Date(), day = [now.getFullYear(), now.getMonth() + 1, now.getDate()];
+  if (WScript.Arguments.length > 1) {
+    day = WScript.Arguments(1).split("-");
+    if (day.length != 3 || isNaN(Date.UTC(day[0], day[1] - 1, day[2]))) throw new Error("the date wants YYYY-MM-DD");
+  }
+  // The day as a day-count date: days since 1899-12-30.
+  port.Calculate(1, (Date.UTC(day[0], day[1] - 1, day[2]) - Date.UTC(1899, 11, 30)) / 864e5);
   var d = port.PredictionDate;  // one point an hour, 00:00 to 24:00 local standard time
   WScript.Echo(port.PortName + ", zone " + port.TimeZone + ": sunrise " + clock(port.SunRise - d) + ", sunset " +
                clock(port.SunSet - d) + ", twilight " + clock(port.BeginTwilight - d) + " to " + clock(port.EndTwilight - d));

@@ -1,5 +1,7 @@
 #include "host/brtide/usage.h"
 
+#include <algorithm>
+
 #include "host/brtide/position_text.h"
 
 namespace br::brtide {
@@ -26,18 +28,46 @@ std::string Synopsis(const CommandSpec& command) {
   return text;
 }
 
+constexpr std::size_t kLineWidth = 88;
+
+// words wrapped to lines of at most width characters (a longer word stands alone), the
+// first line after first, the others after indent.
+std::string Wrapped(const std::string& words, std::size_t width, const std::string& first, const std::string& indent) {
+  std::string text = first, line;
+  std::size_t start = 0;
+  while (start < words.size()) {
+    std::size_t end = words.find(' ', start);
+    if (end == std::string::npos) end = words.size();
+    const std::string word = words.substr(start, end - start);
+    start = end + 1;
+    if (!line.empty() && Utf8Width(line) + 1 + Utf8Width(word) > width) {
+      text += line + "\n" + indent;
+      line.clear();
+    }
+    line += (line.empty() ? "" : " ") + word;
+  }
+  return text + line + "\n";
+}
+
 }  // namespace
 
 void WriteUsage(const std::vector<CommandSpec>& commands, const CommandSpec* command, std::ostream& out) {
   if (command) {
-    out << "usage: " << Synopsis(*command) << "\n\n" << command->summary << "\n\n";
+    out << Wrapped(Synopsis(*command), kLineWidth - 7, "usage: ", std::string(7 + 7 + command->name.size() + 1, ' '))
+        << '\n' << command->summary << "\n\n";
+    std::size_t column = 0;
+    for (const OptionSpec& option : command->options) column = std::max(column, Utf8Width(OptionWithValues(option)));
+    column = std::min<std::size_t>(column, 28) + 2;
     for (const OptionSpec& option : command->options) {
-      out << "  " << PadRight(OptionWithValues(option), 34) << " " << option.help << '\n';
+      const std::string name = OptionWithValues(option);
+      const std::string indent(2 + column, ' ');
+      const std::string first = Utf8Width(name) < column ? "  " + PadRight(name, column) : "  " + name + "\n" + indent;
+      out << Wrapped(option.help, kLineWidth - 2 - column, first, indent);
     }
     return;
   }
   out << "brtide: tide tables from a folder of tide stations, through the BR_Info library\n\n";
-  for (const CommandSpec& spec : commands) out << "  " << Synopsis(spec) << '\n';
+  for (const CommandSpec& spec : commands) out << Wrapped(Synopsis(spec), kLineWidth - 2, "  ", std::string(10 + spec.name.size(), ' '));
   out << "\nCommands:\n";
   for (const CommandSpec& spec : commands) out << "  " << PadRight(spec.name, 8) << spec.summary << '\n';
   out << "\n\"brtide COMMAND --help\" describes a command's options. Exit status: 0 done, 1 the folder,\n"
