@@ -6,6 +6,7 @@
 #include "host/brtide/day_report.h"
 #include "host/brtide/picture_title.h"
 #include "host/brtide/position_text.h"
+#include "host/brtide/printable_text.h"
 #include "host/brtide/requests.h"  // BrtideCommands
 #include "host/brtide/value_parsers.h"
 
@@ -170,4 +171,12 @@ TEST_CASE("the picture's title names the clock of the curve and of the sun bands
   day.stationTime = true;
   day.clockOffsetMinutes = 60;
   CHECK(PictureTitle(day)[1] == "curve and sun bands: station time UTC+01:00");
+}
+
+TEST_CASE("names are data: control characters never reach the terminal, quotes never break the JSON") {
+  // ESC [2J would clear the screen; CR, LF and BEL, and the 8-bit CSI (U+009B), likewise.
+  CHECK(PrintableText("Bad\x1B[2Jname\r\n\a") == "Bad?[2Jname???");
+  CHECK(PrintableText("Csi\xC2\x9B" "1m ok") == "Csi?1m ok");
+  CHECK(PrintableText("Saint-Nazaire \xC3\xA9t\xC3\xA9") == "Saint-Nazaire \xC3\xA9t\xC3\xA9");
+  CHECK(JsonString("Say \"hi\"\\\x1B") == "\"Say \\\"hi\\\"\\\\\\u001b\"");
 }
