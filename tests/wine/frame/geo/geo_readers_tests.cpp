@@ -15,6 +15,10 @@
 #include "frame/geo/catalogue_texts.h"
 #include "frame/geo/geo_enumeration.h"
 #include "frame/geo/header_reader.h"
+#include "frame/geo/volume_files.h"
+#include "frame/settings/cRegSettings.h"
+#include "frame/settings/settings.h"
+#include "tests/wine/common/registry_test_support.h"
 
 using namespace br::geo;
 
@@ -149,6 +153,28 @@ public:
     lastBufferSize = size;
     std::memcpy(buffer, text.data(), text.size());
     return textResult;
+  }
+};
+
+// A database that only has a name.
+class FakeDatabase : public Fake<IGeoDatabase> {
+public:
+  HRESULT nameResult = S_OK;
+  const wchar_t* name = nullptr;  // null: a null BSTR
+
+  RESERVED(3)
+  STDMETHODIMP GetKindId(GUID*) override { return E_NOTIMPL; }
+  RESERVED(5) RESERVED(6)
+  STDMETHODIMP GetDataSetById(REFGUID, IGeoDataSet**) override { return E_NOTIMPL; }
+  STDMETHODIMP GetDataSetHeader(REFGUID, SAFEARRAY**) override { return E_NOTIMPL; }
+  STDMETHODIMP GetGeoObject(REFGUID, IGeoObject**) override { return E_NOTIMPL; }
+  RESERVED(10) RESERVED(11)
+  STDMETHODIMP CreateSelection(long, const GEO_SELECTION_RECORD*, long*) override { return E_NOTIMPL; }
+  STDMETHODIMP ReleaseSelection(long) override { return E_NOTIMPL; }
+  RESERVED(14) RESERVED(15) RESERVED(16)
+  STDMETHODIMP GetName(BSTR* out) override {
+    *out = name ? SysAllocString(name) : nullptr;
+    return nameResult;
   }
 };
 
@@ -410,4 +436,34 @@ TEST_CASE("enumerators: every item is released, odd ends stop the walk, endless 
   CHECK(Fake<IUnknown>::live == 0);
   CHECK(Fake<IGeoObjectEnum>::live == 0);
   CHECK(ForEachItem(nullptr, [](IUnknown*) { return true; }) == 0);
+}
+
+TEST_CASE("volume files by database: its name as it answers, failures as they are, odd names read nothing") {
+  ScratchFolder volume;
+  WriteTextFile(volume / "shoal.txt", "text");
+  REQUIRE(SetFileAttributesA((volume / "shoal.txt").c_str(), FILE_ATTRIBUTE_ARCHIVE));
+  const std::string database = "BrGeoDb" + std::to_string(GetCurrentProcessId());
+  const std::string enumKey = br::cRegSettings::FullPath(br::SETTINGS_ENUM_KEY);
+  SavedRegistryValue folder(HKEY_LOCAL_MACHINE, enumKey + "\\" + database + "\\Volumes\\00", "");
+  folder.SetString(volume.Path() + "\\");
+  const std::wstring wideName(database.begin(), database.end());
+
+  auto* host = new FakeDatabase;
+  host->name = wideName.c_str();
+  std::string path;
+  REQUIRE(FindVolumeFile(host, "SHOAL.TXT", path) == S_OK);
+  CHECK(path == volume / "shoal.txt");
+  CHECK(FindVolumeFile(host, "absent.txt", path) == E_FAIL);
+  host->nameResult = E_ACCESSDENIED;
+  CHECK(FindVolumeFile(host, "shoal.txt", path) == E_ACCESSDENIED);
+  host->nameResult = S_OK;
+  host->name = nullptr;
+  CHECK(FindVolumeFile(host, "shoal.txt", path) == REGDB_E_READREGDB);
+  host->name = L"..\\..";
+  CHECK(FindVolumeFile(host, "shoal.txt", path) == REGDB_E_READREGDB);
+  CHECK(FindVolumeFile(nullptr, "shoal.txt", path) == E_POINTER);
+  host->Release();
+  CHECK(Fake<IGeoDatabase>::live == 0);
+  folder.Delete();
+  RegDeleteTreeA(HKEY_LOCAL_MACHINE, (enumKey + "\\" + database).c_str());
 }
