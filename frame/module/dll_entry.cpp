@@ -1,6 +1,7 @@
 // The four exported entry points and DllMain of BR_Info.dll.
 #include "frame/com/Module.h"
 #include "frame/com/TypeLibrary.h"
+#include "frame/geo/GeodesyLibrary.h"
 #include "frame/module/class_rows.h"
 #include "frame/module/registration.h"
 #include "frame/settings/localised_texts.h"
@@ -41,11 +42,13 @@ extern "C" BOOL WINAPI DllMain(HINSTANCE instance, DWORD reason, LPVOID reserved
 }
 
 // Accessibility clients may hold the toolkit's objects after their controls are gone.
-// Letting the library go is the one moment the text component can be released properly:
-// at process detach the loader lock forbids calling into other DLLs.
+// Letting the library go is the one moment the text component and the geodesy library
+// can be released properly: at process detach the loader lock forbids calling into other
+// DLLs, so there both are only forgotten.
 STDAPI DllCanUnloadNow() {
   if (Module::LockCount() != 0 || toolkit::ComponentAccessible::liveObjects() != 0) return S_FALSE;
   br::DestroyLocaliserAtUnload();
+  br::geo::GeodesyLibrary::ReleaseShared();
   return S_OK;
 }
 
