@@ -177,18 +177,18 @@ TEST_CASE("refused scenes name the line and column of the fault and leave the sc
   };
   const Row rows[] = {
       {"JSON", "\"format\": \"chartscene 1\",", "\"format\": \"chartscene 1\"", "\"catalogue\"", "expected ','"},
-      {"format", "chartscene 1", "chartscene 2", "\"chartscene 2\"", "format"},
+      {"format", "\"chartscene 1\"", "\"chartscene 2\"", "\"chartscene 2\"", "format"},
       {"unknown key", "\"parametersForm\"", "\"parameterForm\"", "\"parameterForm\"", "unknown key"},
       {"acronym in letter case", "\"LITCHR\": 2", "\"Litchr\": 2", "\"Litchr\"", "unknown attribute"},
       {"class", "\"class\": \"LIGHTS\"", "\"class\": \"LIGHT\"", "\"LIGHT\"", "unknown object class"},
       {"float as text", "\"SIGPER\": 4.0", "\"SIGPER\": \"4\"", "\"4\"", "expected a number"},
       {"enum out of range", "\"LITCHR\": 2", "\"LITCHR\": 70000", "70000", "from 0 to 65535"},
       {"member", "\"beacon\"]", "\"bacon\"]", "\"bacon\"", "unknown object"},
-      {"stored file", "files/note.txt", "files/none.txt", "\"files/none.txt\"", "cannot read"},
+      {"stored file", "\"files/note.txt\"", "\"files/none.txt\"", "\"files/none.txt\"", "cannot read"},
       {"second object name", "{\"name\": \"beacon\"", "{\"name\": \"light\"", "{", "second object"},
       {"dataset id", "\"id\": \"1\"", "\"id\": \"1.2\"", "\"1.2\"", "full stop"},
       {"typed value", "{\"R4\": 1.5}", "{\"R16\": 1.5}", "\"R16\"", "unknown value type"},
-      {"date", "2022-11-15T12:00", "2022-02-30T12:00", "\"2022-02-30", "date"},
+      {"date", "\"2022-11-15T12:00\"", "\"2022-02-30T12:00\"", "\"2022-02-30", "date"},
       {"position", "[48.3581, -4.5683]", "[98.3581, -4.5683]", "[98.3581", "out of range"},
       {"fault", "\"0x80004005\"", "\"80004005\"", "\"80004005\"", "HRESULT"},
   };
