@@ -10,6 +10,7 @@ struct State {
   std::mutex lock;
   std::map<std::string, long> counters;
   std::map<std::string, std::uint32_t> faults;
+  std::map<long, std::string> options;
 };
 
 // Never destroyed: wrappers may still count while the process ends.
@@ -66,6 +67,19 @@ std::optional<std::uint32_t> CallAndFault(const std::string& operation) {
   const auto it = state.faults.find(operation);
   if (it == state.faults.end()) return std::nullopt;
   return it->second;
+}
+
+void RecordFormatterOption(long id, const std::string& value) {
+  State& state = TheState();
+  std::lock_guard<std::mutex> guard(state.lock);
+  state.options[id] = value;
+}
+
+std::string FormatterOption(long id) {
+  State& state = TheState();
+  std::lock_guard<std::mutex> guard(state.lock);
+  const auto it = state.options.find(id);
+  return it == state.options.end() ? std::string() : it->second;
 }
 
 }  // namespace br::chartscene

@@ -1,5 +1,5 @@
 #pragma once
-// Process-wide counters and injected faults of the stand-in host, so tests can prove that
+// Process-wide counters, injected faults and formatter option records of the stand-in host, so tests can prove that
 // a client released everything it was given and can make any operation fail.
 //
 // Counter names: "live.<Kind>" (wrappers alive now), "calls.<Interface>.<Method>" (calls
@@ -24,5 +24,10 @@ void SetFault(const std::string& operation, std::uint32_t result);
 void ClearFaults();
 // Counts the call and gives the injected result, if any.
 std::optional<std::uint32_t> CallAndFault(const std::string& operation);
+
+// The last value each object formatter option was set to ("I4:1036", "BSTR:unknown"),
+// whichever formatter was given it; empty for an option never set.
+void RecordFormatterOption(long id, const std::string& value);
+std::string FormatterOption(long id);
 
 }  // namespace br::chartscene

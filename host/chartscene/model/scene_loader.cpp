@@ -707,7 +707,7 @@ private:
     if (const JsonValue* text = value.Find("text")) {
       object.text = Text(*text);
     } else {
-      for (const SceneAttribute& attribute : object.attributes) {
+      for (const SceneAttributeModel& attribute : object.attributes) {
         if (attribute.code == 116 && attribute.value.type == TypedValue::Type::Text) object.text = attribute.value.text;
       }
     }

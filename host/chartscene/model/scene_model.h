@@ -34,7 +34,7 @@ struct GeoPosition {
   double lon = 0;
 };
 
-struct SceneAttribute {
+struct SceneAttributeModel {
   long code = 0;
   TypedValue value;
 };
@@ -49,7 +49,7 @@ struct SceneObjectModel {
   long classCode = 0;
   long primitive = 6;  // 1 point, 2 line, 3 area, 6 none
   std::vector<GeoPosition> geometry;
-  std::vector<SceneAttribute> attributes;  // in file order
+  std::vector<SceneAttributeModel> attributes;  // in file order
   std::vector<std::size_t> members;   // objects it holds (indices into SceneModel::objects)
   std::vector<std::size_t> holders;   // objects that hold it
   std::map<long, TypedValue> properties;  // GetProperty; 0 is the flag word (VT_UI4)

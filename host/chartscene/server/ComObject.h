@@ -29,6 +29,8 @@ public:
     *out = nullptr;
     if (IsEqualIID(iid, IID_IUnknown)) {
       *out = static_cast<IUnknown*>(static_cast<First*>(this));
+    } else if (!Offers(iid)) {
+      return E_NOINTERFACE;
     } else if (!((IsEqualIID(iid, __uuidof(Interfaces)) &&
                   (*out = static_cast<Interfaces*>(this), true)) || ...)) {
       *out = QueryExtra(iid);
@@ -51,6 +53,9 @@ protected:
   }
   // Interfaces answered by a member rather than a base; null when there is none.
   virtual void* QueryExtra(REFIID) { return nullptr; }
+  // False for a base interface this object does not answer after all (a vector dataset
+  // that is no library).
+  virtual bool Offers(REFIID) const { return true; }
 
 private:
   using First = std::tuple_element_t<0, std::tuple<Interfaces...>>;

@@ -2,7 +2,12 @@
 
 #include <string>
 
+#include <oleauto.h>
+
+#include "ChartScene_h.h"
 #include "GeoData.h"
+#include "host/chartscene/server/ChartScene.h"
+#include "host/chartscene/server/ObjectFormatter.h"
 #include "host/chartscene/server/TextTable.h"
 
 namespace br::chartscene {
@@ -10,6 +15,8 @@ namespace br::chartscene {
 namespace {
 
 const SceneClass kClasses[] = {
+    {&CLSID_ChartScene, L"ChartScene.Scene", L"Chart scene", ChartScene::Create},
+    {&CLSID_ObjectFormatter, L"ChartScene.ObjectFormatter", L"Chart scene object formatter", ObjectFormatter::Create},
     {&CLSID_TextTable, L"ChartScene.TextTable", L"Chart scene text table", TextTable::Create},
     {nullptr, nullptr, nullptr, nullptr},
 };
@@ -47,7 +54,11 @@ HRESULT RegisterSceneClasses(const std::wstring& modulePath) {
     if (status == ERROR_SUCCESS) status = SetText(HKEY_CLASSES_ROOT, std::wstring(row->progId) + L"\\CLSID", nullptr, clsid);
     if (status != ERROR_SUCCESS) return HRESULT_FROM_WIN32(status);
   }
-  return S_OK;
+  // The scriptable class's type library, from the module itself.
+  ITypeLib* library = nullptr;
+  const HRESULT hr = LoadTypeLibEx(modulePath.c_str(), REGKIND_REGISTER, &library);
+  if (library) library->Release();
+  return hr;
 }
 
 HRESULT UnregisterSceneClasses() {
@@ -55,6 +66,7 @@ HRESULT UnregisterSceneClasses() {
     RegDeleteTreeW(HKEY_CLASSES_ROOT, (L"CLSID\\" + GuidText(*row->clsid)).c_str());
     RegDeleteTreeW(HKEY_CLASSES_ROOT, row->progId);
   }
+  UnRegisterTypeLib(LIBID_ChartSceneLib, 1, 0, LOCALE_NEUTRAL, sizeof(void*) == 8 ? SYS_WIN64 : SYS_WIN32);
   return S_OK;
 }
 

@@ -131,7 +131,7 @@ TEST_CASE("a scene: header record, parameters, values by catalogue type, relatio
   CHECK(light.properties.at(0).integer == 256);
   CHECK(light.properties.at(500).integer == 184);
   const auto value = [&](long code) {
-    for (const SceneAttribute& attribute : light.attributes)
+    for (const SceneAttributeModel& attribute : light.attributes)
       if (attribute.code == code) return attribute.value;
     FAIL("no attribute " << code);
     return TypedValue();
