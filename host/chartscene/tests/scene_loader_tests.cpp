@@ -7,6 +7,8 @@
 #include <cstring>
 #include <filesystem>
 #include <fstream>
+#include <iterator>
+#include <set>
 #include <string>
 
 #include "frame/geo/dataset_header.h"
@@ -257,4 +259,36 @@ TEST_CASE("scene dates and display arithmetic") {
   CHECK(ShapeHitsRect(3, {{0, 0}, {800, 0}, {800, 600}, {0, 600}}, rect));  // holds the rectangle
   CHECK_FALSE(ShapeHitsRect(3, {{0, 0}, {100, 0}, {0, 100}}, rect));
   CHECK_FALSE(ShapeHitsRect(6, {{400, 300}}, rect));
+}
+
+TEST_CASE("the sample harbour scene loads whole: every database kind, dataset type and relation it shows") {
+  const char* root = std::getenv("BR_SOURCE_DIR");
+  REQUIRE(root != nullptr);
+  const fs::path file = fs::path(root) / "data" / "harbour" / "harbour.json";
+  std::ifstream in(file, std::ios::binary);
+  const std::string text((std::istreambuf_iterator<char>(in)), std::istreambuf_iterator<char>());
+  SceneModel scene;
+  SceneError error;
+  REQUIRE_MESSAGE(LoadScene(text, file.parent_path().string(), Catalogue(), scene, error), error.Text());
+  REQUIRE(scene.databases.size() == 3);
+  CHECK(scene.databases[0].kind == DatabaseKind::Chart);
+  CHECK(scene.databases[1].kind == DatabaseKind::User);
+  CHECK(scene.databases[2].kind == DatabaseKind::Hierarchy);
+  std::set<DataSetType> types;
+  for (const SceneDataSetModel& dataSet : scene.dataSets) types.insert(dataSet.type);
+  CHECK(types.size() == 3);
+  std::set<long> classes;
+  std::size_t stored = 0;
+  for (const SceneObjectModel& object : scene.objects) {
+    classes.insert(object.classCode);
+    stored += object.files.size();
+  }
+  // The classes the inspector groups and the legend reads: aids, dangers, areas, routeing,
+  // collections, meta objects, magnetic variation, the harbour services and the hierarchy.
+  for (long code : {5L, 7L, 12L, 17L, 74L, 75L, 84L, 86L, 153L, 159L, 4L, 20L, 85L, 109L, 13L, 400L, 401L, 81L,
+                    300L, 308L, 309L, 312L, 500L, 502L, 53355L, 55001L, 55059L, 55060L, 55500L, 57001L, 57004L}) {
+    INFO(code);
+    CHECK(classes.count(code) == 1);
+  }
+  CHECK(stored >= 8);
 }
