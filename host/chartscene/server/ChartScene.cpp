@@ -61,6 +61,10 @@ HRESULT ChartScene::Create(IUnknown** object) {
   return S_OK;
 }
 
+void* ChartScene::QueryExtra(REFIID iid) {
+  return IsEqualIID(iid, IID_IDispatch) ? static_cast<IDispatch*>(static_cast<IChartScene*>(this)) : nullptr;
+}
+
 HRESULT ChartScene::TypeInfo(ITypeInfo** info) {
   if (!typeInfo_) {
     ComPtr<ITypeLib> library;

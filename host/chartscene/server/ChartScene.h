@@ -50,6 +50,10 @@ public:
   // ISupportErrorInfo
   STDMETHODIMP InterfaceSupportsErrorInfo(REFIID iid) override;
 
+protected:
+  // IDispatch is the dual interface's base.
+  void* QueryExtra(REFIID iid) override;
+
 private:
   ChartScene();
 
