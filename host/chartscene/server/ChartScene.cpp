@@ -269,7 +269,7 @@ STDMETHODIMP ChartScene::ObjectRecords(BSTR names, VARIANT* records) {
       }
       if (found == SIZE_MAX) return Fail(E_INVALIDARG, L"no dataset " + WideFromUtf8(name.substr(8)));
       ComPtr<IUnknown> owner;
-      owner.Attach(NewDataSet(scene_, found));
+      *owner.GetAddressOf() = NewDataSet(scene_, found);
       record.Owner = owner.Get();
       record.Id = GuidOf(DataSetIdentity(model, found));
       owners_.push_back(owner);
@@ -280,7 +280,7 @@ STDMETHODIMP ChartScene::ObjectRecords(BSTR names, VARIANT* records) {
       }
       if (found == SIZE_MAX) return Fail(E_INVALIDARG, L"no object named " + WideFromUtf8(name));
       ComPtr<IUnknown> owner;
-      owner.Attach(NewDatabase(scene_, model.dataSets[model.objects[found].dataSet].database));
+      *owner.GetAddressOf() = NewDatabase(scene_, model.dataSets[model.objects[found].dataSet].database);
       record.Owner = owner.Get();
       record.Id = GuidOf(ObjectIdentity(model, found));
       owners_.push_back(owner);
@@ -361,7 +361,7 @@ STDMETHODIMP ChartScene::AttributeText(IUnknown* object, BSTR* text) {
     return Fail(E_INVALIDARG, L"not an object");
   }
   ComPtr<IGeoCatalog> catalogue;
-  catalogue.Attach(CatalogueOfObject(face.Get()));
+  *catalogue.GetAddressOf() = CatalogueOfObject(face.Get());
   ComPtr<IGeoObjectEnum> attributes;
   HRESULT hr = face->GetAttributes(&attributes);
   if (FAILED(hr)) return Fail(hr, L"GetAttributes failed");

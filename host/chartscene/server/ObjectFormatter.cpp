@@ -62,7 +62,7 @@ HRESULT ObjectFormatter::AttributeText(IGeoAttribute* attribute, const std::wstr
   ComPtr<IGeoObject> object;
   ComPtr<IGeoCatalog> catalogue;
   if (SUCCEEDED(attribute->GetOwner(&owner)) && owner && SUCCEEDED(owner.As(&object))) {
-    catalogue.Attach(CatalogueOfObject(object.Get()));
+    *catalogue.GetAddressOf() = CatalogueOfObject(object.Get());
   }
   std::wstring name = AttributeNameText(catalogue.Get(), code);
   if (name.empty()) name = std::to_wstring(code);
@@ -80,7 +80,7 @@ STDMETHODIMP ObjectFormatter::FormatObject(long, long flags, IGeoObject* object,
   HRESULT hr = object->GetClassCode(&classCode);
   if (FAILED(hr)) return hr;
   ComPtr<IGeoCatalog> catalogue;
-  catalogue.Attach(CatalogueOfObject(object));
+  *catalogue.GetAddressOf() = CatalogueOfObject(object);
   std::wstring className = ClassNameText(catalogue.Get(), classCode);
   if (className.empty()) className = std::to_wstring(classCode);
 

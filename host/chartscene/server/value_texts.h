@@ -12,7 +12,8 @@
 namespace br::chartscene {
 
 // The catalogue of an object's database (GetDataSet, GetDatabase, IGeoCatalog); null
-// when a step fails. The caller releases it.
+// when a step fails. The caller releases it: into a ComPtr through GetAddressOf, as
+// mingw's ComPtr::Attach adds a reference of its own.
 IGeoCatalog* CatalogueOfObject(IGeoObject* object);
 
 // A catalogue text by its length and text calls; empty when either fails.
