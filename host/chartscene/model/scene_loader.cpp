@@ -716,6 +716,10 @@ private:
       for (const JsonMember& member : files->members) {
         StoredFile file;
         file.name = member.key;
+        // Stream names of structured storage: 1 to 31 characters, none of \ / : !
+        if (file.name.empty() || file.name.size() > 31 || file.name.find_first_of("\\/:!") != std::string::npos) {
+          Refuse(member, "a stored file name has 1 to 31 characters and none of \\ / : !");
+        }
         if (!ReadStoredFile(Text(member.value), file.bytes)) Refuse(member.value, "cannot read \"" + member.value.text + "\"");
         object.files.push_back(std::move(file));
       }

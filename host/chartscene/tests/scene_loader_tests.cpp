@@ -193,6 +193,7 @@ TEST_CASE("refused scenes name the line and column of the fault and leave the sc
       {"date", "\"2022-11-15T12:00\"", "\"2022-02-30T12:00\"", "\"2022-02-30", "date"},
       {"position", "[48.3581, -4.5683]", "[98.3581, -4.5683]", "[98.3581", "out of range"},
       {"fault", "\"0x80004005\"", "\"80004005\"", "\"80004005\"", "HRESULT"},
+      {"stream name", "{\"note.txt\":", "{\"notes/note.txt\":", "\"notes/", "stored file name"},
   };
   // Line and column (from 1) of an offset of an ASCII text.
   const auto position = [](const std::string& text, std::size_t offset) {
