@@ -14,6 +14,7 @@ target_link_libraries(BR_Info PRIVATE
   br_module
   br_com
   br_idl
+  br_geo
   br_tide_objects
   br_tide_controls
 )

@@ -1,8 +1,10 @@
 // The four exported entry points and DllMain of BR_Info.dll.
 #include "frame/com/Module.h"
 #include "frame/com/TypeLibrary.h"
+#include "frame/geo/GeodesyLibrary.h"
 #include "frame/module/class_rows.h"
 #include "frame/module/registration.h"
+#include "frame/settings/localised_texts.h"
 #include "tides/objects/TidesDatabase.h"
 #include "toolkit/access/ComponentAccessible.h"
 #include "toolkit/core/ToolkitWindows.h"
@@ -23,6 +25,7 @@ extern "C" BOOL WINAPI DllMain(HINSTANCE instance, DWORD reason, LPVOID reserved
     case DLL_PROCESS_DETACH:
       TheClassTable().ReleaseClassObjects();
       br::tides::TidesDatabase::CloseStationFiles();
+      br::DropLocaliserAtDetach();
       // At process exit other DLLs may be gone already: let the cached type library go
       // only when the library itself is being unloaded.
       if (!reserved) {
@@ -39,8 +42,14 @@ extern "C" BOOL WINAPI DllMain(HINSTANCE instance, DWORD reason, LPVOID reserved
 }
 
 // Accessibility clients may hold the toolkit's objects after their controls are gone.
+// Letting the library go is the one moment the text component and the geodesy library
+// can be released properly: at process detach the loader lock forbids calling into other
+// DLLs, so there both are only forgotten.
 STDAPI DllCanUnloadNow() {
-  return Module::LockCount() == 0 && toolkit::ComponentAccessible::liveObjects() == 0 ? S_OK : S_FALSE;
+  if (Module::LockCount() != 0 || toolkit::ComponentAccessible::liveObjects() != 0) return S_FALSE;
+  br::DestroyLocaliserAtUnload();
+  br::geo::GeodesyLibrary::ReleaseShared();
+  return S_OK;
 }
 
 STDAPI DllGetClassObject(REFCLSID clsid, REFIID riid, LPVOID* out) {

@@ -32,3 +32,24 @@ bool cDiskFolderLister::SameName(const std::string& entryName, const std::string
 }
 
 }  // namespace br
+
+namespace br {
+
+bool cDiskFolderLister::Identity(const std::string& folder, FolderIdentity& identity) const {
+  // Folders open only with backup semantics; no access right is needed to ask.
+  const HANDLE handle = CreateFileA(folder.c_str(), 0, FILE_SHARE_READ | FILE_SHARE_WRITE | FILE_SHARE_DELETE,
+                                    nullptr, OPEN_EXISTING, FILE_FLAG_BACKUP_SEMANTICS, nullptr);
+  if (handle == INVALID_HANDLE_VALUE) {
+    return false;
+  }
+  BY_HANDLE_FILE_INFORMATION information;
+  const bool known = GetFileInformationByHandle(handle, &information) != FALSE;
+  CloseHandle(handle);
+  if (known) {
+    identity.volume = information.dwVolumeSerialNumber;
+    identity.index = (static_cast<std::uint64_t>(information.nFileIndexHigh) << 32) | information.nFileIndexLow;
+  }
+  return known;
+}
+
+}  // namespace br

@@ -12,6 +12,8 @@ public:
   std::vector<FolderEntry> List(const std::string& folder) const override;
   // The platform's case-blind comparison, for letters beyond ASCII too.
   bool SameName(const std::string& entryName, const std::string& wanted) const override;
+  // The volume serial and file index of the folder itself, links followed.
+  bool Identity(const std::string& folder, FolderIdentity& identity) const override;
 };
 
 }  // namespace br

@@ -27,6 +27,11 @@ HRESULT FindFileInTree(const std::string& folder, const char* fileName, std::str
 }
 
 HRESULT FindVolumeFile(const std::string& databaseName, const char* fileName, std::string& path) {
+  // The name becomes part of a registry path: an empty one would read the Enum key's
+  // own subtree, a backslash would step into another key.
+  if (databaseName.empty() || databaseName.find('\\') != std::string::npos) {
+    return REGDB_E_READREGDB;
+  }
   return SearchConfiguredFolder(ReadVolumeFolder(databaseName), fileName, path);
 }
 

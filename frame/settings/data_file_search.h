@@ -15,7 +15,9 @@ HRESULT FindFileInTree(const std::string& folder, const char* fileName, std::str
 
 // The same below the first volume folder of a chart database (the default value
 // of Brdata\Enum\<database>\Volumes\00, less its last character).
-// REGDB_E_READREGDB when that value is empty, E_FAIL when the file is not found.
+// REGDB_E_READREGDB when that value is empty, or at once, without reading the
+// registry, for a database name that is empty or holds a backslash; E_FAIL when the
+// file is not found.
 HRESULT FindVolumeFile(const std::string& databaseName, const char* fileName, std::string& path);
 
 // The same below the "BasesStore" folder.

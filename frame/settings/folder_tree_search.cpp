@@ -1,10 +1,47 @@
 #include "frame/settings/folder_tree_search.h"
 
+#include <set>
+#include <utility>
+
 namespace br {
 
 namespace {
+
 char LowerAscii(char c) { return (c >= 'A' && c <= 'Z') ? static_cast<char>(c - 'A' + 'a') : c; }
+
+using VisitedFolders = std::set<std::pair<std::uint32_t, std::uint64_t>>;
+
+bool SearchFolder(const cFolderLister& lister, const std::string& folder, const std::string& fileName,
+                  int depth, VisitedFolders& visited, std::string& path) {
+  FolderIdentity identity;
+  if (lister.Identity(folder, identity) && !visited.insert({identity.volume, identity.index}).second) {
+    return false;  // reached again through a link: searched already
+  }
+  std::vector<std::string> subfolders;
+  for (const FolderEntry& entry : lister.List(folder)) {
+    if (entry.isFolder) {
+      if (!entry.name.empty() && entry.name[0] != '.') {
+        subfolders.push_back(entry.name);
+      }
+    } else if (entry.archive && !entry.hidden && lister.SameName(entry.name, fileName)) {
+      path = JoinFolderPath(folder, entry.name);
+      return true;
+    }
+  }
+  if (depth >= MAX_SEARCH_DEPTH) {
+    return false;
+  }
+  for (const std::string& name : subfolders) {
+    if (SearchFolder(lister, JoinFolderPath(folder, name), fileName, depth + 1, visited, path)) {
+      return true;
+    }
+  }
+  return false;
+}
+
 }  // namespace
+
+bool cFolderLister::Identity(const std::string&, FolderIdentity&) const { return false; }
 
 bool cFolderLister::SameName(const std::string& entryName, const std::string& wanted) const {
   if (entryName.size() != wanted.size()) {
@@ -32,23 +69,8 @@ bool SearchFolderTree(const cFolderLister& lister, const std::string& folder,
   if (folder.empty() || fileName.empty()) {
     return false;
   }
-  std::vector<std::string> subfolders;
-  for (const FolderEntry& entry : lister.List(folder)) {
-    if (entry.isFolder) {
-      if (!entry.name.empty() && entry.name[0] != '.') {
-        subfolders.push_back(entry.name);
-      }
-    } else if (entry.archive && !entry.hidden && lister.SameName(entry.name, fileName)) {
-      path = JoinFolderPath(folder, entry.name);
-      return true;
-    }
-  }
-  for (const std::string& name : subfolders) {
-    if (SearchFolderTree(lister, JoinFolderPath(folder, name), fileName, path)) {
-      return true;
-    }
-  }
-  return false;
+  VisitedFolders visited;
+  return SearchFolder(lister, folder, fileName, 0, visited, path);
 }
 
 }  // namespace br

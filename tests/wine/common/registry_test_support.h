@@ -1,5 +1,6 @@
 #pragma once
-// Registry values restored after a test, scratch folders, whole-file reads and writes.
+// Registry values restored after a test, scratch folders, folder links, whole-file reads
+// and writes.
 
 #include <windows.h>
 #include <shellapi.h>
@@ -73,4 +74,88 @@ inline void WriteTextFile(const std::string& path, const std::string& text) {
 inline std::string ReadWholeFile(const std::string& path) {
   std::ifstream file(path, std::ios::binary);
   return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+}
+
+// Folder links. Wine's CreateSymbolicLink makes nothing, but it shows Unix symbolic links
+// as folder links (directory + reparse point), so under Wine the link is made, and a tree
+// holding links removed, by the Unix ln and rm; on Windows by the platform's own calls.
+namespace folder_links {
+
+inline bool OnWine() { return GetProcAddress(GetModuleHandleA("ntdll.dll"), "wine_get_version") != nullptr; }
+
+inline std::string UnixPath(const std::string& path) {
+  using ToUnix = char*(CDECL*)(LPCWSTR);
+  const auto toUnix = reinterpret_cast<ToUnix>(
+      reinterpret_cast<void*>(GetProcAddress(GetModuleHandleA("kernel32.dll"), "wine_get_unix_file_name")));
+  const std::wstring wide(path.begin(), path.end());
+  char* unixPath = toUnix ? toUnix(wide.c_str()) : nullptr;
+  const std::string result = unixPath ? unixPath : "";
+  HeapFree(GetProcessHeap(), 0, unixPath);
+  return result;
+}
+
+inline void RunUnix(const char* program, std::string commandLine) {
+  STARTUPINFOA startup{};
+  startup.cb = sizeof(startup);
+  PROCESS_INFORMATION process{};
+  if (CreateProcessA(program, &commandLine[0], nullptr, nullptr, FALSE, 0, nullptr, nullptr, &startup, &process)) {
+    WaitForSingleObject(process.hProcess, 30000);
+    CloseHandle(process.hThread);
+    CloseHandle(process.hProcess);
+  }
+}
+
+}  // namespace folder_links
+
+// A link at linkPath to the folder target; true when the link lists as a folder link.
+inline bool MakeFolderLink(const std::string& linkPath, const std::string& target) {
+  if (folder_links::OnWine()) {
+    folder_links::RunUnix("Z:\\bin\\ln", "ln -s \"" + folder_links::UnixPath(target) + "\" \"" +
+                                                 folder_links::UnixPath(linkPath) + "\"");
+  } else {
+    CreateSymbolicLinkA(linkPath.c_str(), target.c_str(), SYMBOLIC_LINK_FLAG_DIRECTORY);
+  }
+  // As a folder listing shows it (asking the path itself may follow the link). Wine's
+  // process handle for a Unix program does not wait for the program: look until it is there.
+  const DWORD links = FILE_ATTRIBUTE_REPARSE_POINT | FILE_ATTRIBUTE_DIRECTORY;
+  for (int attempt = 0; attempt < 100; ++attempt) {
+    WIN32_FIND_DATAA found;
+    const HANDLE search = FindFirstFileA(linkPath.c_str(), &found);
+    if (search != INVALID_HANDLE_VALUE) {
+      FindClose(search);
+      return (found.dwFileAttributes & links) == links;
+    }
+    Sleep(50);
+  }
+  return false;
+}
+
+// Removes a folder tree that holds folder links without following them (a recursive
+// delete through the shell would walk a link loop).
+inline void RemoveTreeWithLinks(const std::string& folder) {
+  if (folder_links::OnWine()) {
+    folder_links::RunUnix("Z:\\bin\\rm", "rm -rf \"" + folder_links::UnixPath(folder) + "\"");
+    for (int attempt = 0; attempt < 100 && GetFileAttributesA(folder.c_str()) != INVALID_FILE_ATTRIBUTES; ++attempt) {
+      Sleep(50);
+    }
+    return;
+  }
+  WIN32_FIND_DATAA found;
+  const HANDLE search = FindFirstFileA((folder + "\\*").c_str(), &found);
+  if (search != INVALID_HANDLE_VALUE) {
+    do {
+      const std::string name = found.cFileName;
+      if (name == "." || name == "..") continue;
+      const std::string path = folder + "\\" + name;
+      if ((found.dwFileAttributes & FILE_ATTRIBUTE_REPARSE_POINT) != 0) {
+        RemoveDirectoryA(path.c_str());
+      } else if ((found.dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY) != 0) {
+        RemoveTreeWithLinks(path);
+      } else {
+        DeleteFileA(path.c_str());
+      }
+    } while (FindNextFileA(search, &found));
+    FindClose(search);
+  }
+  RemoveDirectoryA(folder.c_str());
 }

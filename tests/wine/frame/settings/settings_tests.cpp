@@ -91,3 +91,47 @@ TEST_CASE("volume and store files are searched below their registry folders: own
   store.Delete();
   CHECK(FindStoreFile("shoal.tif", path) == REGDB_E_READREGDB);
 }
+
+TEST_CASE("folder links: two links to their own folder end the search at once; the file past them is found") {
+  ScratchFolder volume;
+  const std::string root = volume / "V";
+  REQUIRE(CreateDirectoryA(root.c_str(), nullptr));
+  struct LinkTreeCleanup {  // before the scratch folder's own delete, which would meet the links
+    std::string root;
+    ~LinkTreeCleanup() { RemoveTreeWithLinks(root); }
+  } cleanup{root};
+  REQUIRE(CreateDirectoryA((root + "\\loop").c_str(), nullptr));
+  REQUIRE(CreateDirectoryA((root + "\\zz").c_str(), nullptr));
+  REQUIRE(MakeFolderLink(root + "\\loop\\a", root + "\\loop"));
+  REQUIRE(MakeFolderLink(root + "\\loop\\b", root + "\\loop"));
+  REQUIRE(MakeFolderLink(root + "\\zz\\up", root));
+  MakeFile(root + "\\zz\\pic.png");
+
+  std::string path;
+  const ULONGLONG start = GetTickCount64();
+  const HRESULT found = FindFileInTree(root, "PIC.PNG", path);
+  const HRESULT missing = FindFileInTree(root, "absent.png", path);
+  // Without the guard the links double the listings per level (minutes); a hang detector.
+  CHECK(GetTickCount64() - start < 2000);
+  CHECK(found == S_OK);
+  CHECK(missing == E_FAIL);
+  CHECK(path == root + "\\zz\\pic.png");
+}
+
+TEST_CASE("a database name that is empty or holds a backslash reads no volume folder") {
+  ScratchFolder volume;
+  MakeFile(volume / "chart.txt");
+  const std::string enumKey = cRegSettings::FullPath(SETTINGS_ENUM_KEY);
+  // Folders that the two names would reach if they were put into the registry path.
+  SavedRegistryValue empty(HKEY_LOCAL_MACHINE, enumKey + "\\\\Volumes\\00", "");
+  SavedRegistryValue nested(HKEY_LOCAL_MACHINE, enumKey + "\\BrTestA\\BrTestB\\Volumes\\00", "");
+  empty.SetString(volume.Path() + "\\");
+  nested.SetString(volume.Path() + "\\");
+  std::string path = "unchanged";
+  CHECK(FindVolumeFile("", "chart.txt", path) == REGDB_E_READREGDB);
+  CHECK(FindVolumeFile("BrTestA\\BrTestB", "chart.txt", path) == REGDB_E_READREGDB);
+  CHECK(path == "unchanged");
+  empty.Delete();
+  nested.Delete();
+  RegDeleteTreeA(HKEY_LOCAL_MACHINE, (enumKey + "\\BrTestA").c_str());
+}

@@ -1,0 +1,85 @@
+#include "host/chartscene/model/scene_counters.h"
+
+#include <mutex>
+
+namespace br::chartscene {
+
+namespace {
+
+struct State {
+  std::mutex lock;
+  std::map<std::string, long> counters;
+  std::map<std::string, std::uint32_t> faults;
+  std::map<long, std::string> options;
+};
+
+// Never destroyed: wrappers may still count while the process ends.
+State& TheState() {
+  static State* state = new State;
+  return *state;
+}
+
+}  // namespace
+
+void AddToCounter(const std::string& name, long delta) {
+  State& state = TheState();
+  std::lock_guard<std::mutex> guard(state.lock);
+  state.counters[name] += delta;
+}
+
+long CounterValue(const std::string& name) {
+  State& state = TheState();
+  std::lock_guard<std::mutex> guard(state.lock);
+  const auto it = state.counters.find(name);
+  return it == state.counters.end() ? 0 : it->second;
+}
+
+std::map<std::string, long> Counters(const std::string& prefix) {
+  State& state = TheState();
+  std::lock_guard<std::mutex> guard(state.lock);
+  std::map<std::string, long> found;
+  for (const auto& [name, value] : state.counters) {
+    if (name.compare(0, prefix.size(), prefix) == 0) found.emplace(name, value);
+  }
+  return found;
+}
+
+void SetFault(const std::string& operation, std::uint32_t result) {
+  State& state = TheState();
+  std::lock_guard<std::mutex> guard(state.lock);
+  if (result == 0) {
+    state.faults.erase(operation);
+  } else {
+    state.faults[operation] = result;
+  }
+}
+
+void ClearFaults() {
+  State& state = TheState();
+  std::lock_guard<std::mutex> guard(state.lock);
+  state.faults.clear();
+}
+
+std::optional<std::uint32_t> CallAndFault(const std::string& operation) {
+  State& state = TheState();
+  std::lock_guard<std::mutex> guard(state.lock);
+  ++state.counters["calls." + operation];
+  const auto it = state.faults.find(operation);
+  if (it == state.faults.end()) return std::nullopt;
+  return it->second;
+}
+
+void RecordFormatterOption(long id, const std::string& value) {
+  State& state = TheState();
+  std::lock_guard<std::mutex> guard(state.lock);
+  state.options[id] = value;
+}
+
+std::string FormatterOption(long id) {
+  State& state = TheState();
+  std::lock_guard<std::mutex> guard(state.lock);
+  const auto it = state.options.find(id);
+  return it == state.options.end() ? std::string() : it->second;
+}
+
+}  // namespace br::chartscene

@@ -1,0 +1,33 @@
+#pragma once
+// Process-wide counters, injected faults and formatter option records of the stand-in host, so tests can prove that
+// a client released everything it was given and can make any operation fail.
+//
+// Counter names: "live.<Kind>" (wrappers alive now), "calls.<Interface>.<Method>" (calls
+// made), "selections.open" (selections created and not released), and whatever else a
+// component counts ("TextTable.created", ...).
+// Operation names: "<Interface>.<Method>" ("IGeoDatabase.GetName", "ITextTable.LoadTable").
+
+#include <cstdint>
+#include <map>
+#include <optional>
+#include <string>
+
+namespace br::chartscene {
+
+void AddToCounter(const std::string& name, long delta);
+long CounterValue(const std::string& name);
+// Every counter whose name starts with prefix (all of them for "").
+std::map<std::string, long> Counters(const std::string& prefix);
+
+// The HRESULT an operation is to return, as a 32-bit pattern; 0 removes the fault.
+void SetFault(const std::string& operation, std::uint32_t result);
+void ClearFaults();
+// Counts the call and gives the injected result, if any.
+std::optional<std::uint32_t> CallAndFault(const std::string& operation);
+
+// The last value each object formatter option was set to ("I4:1036", "BSTR:unknown"),
+// whichever formatter was given it; empty for an option never set.
+void RecordFormatterOption(long id, const std::string& value);
+std::string FormatterOption(long id);
+
+}  // namespace br::chartscene
