@@ -41,32 +41,21 @@ void SetUpDay(double t0) {
   }
 }
 
-namespace {
-// The series in the form the sample loop wants: one multiply-add and one cosine per term.
-struct Term {
-  double amplitude;  // H x f
-  double phase;      // V + u - g, advanced by each step
-  double advance;    // step x speed
-};
-}  // namespace
+HarmonicSeries DaySeries(double step) {
+  const TideEngine& e = TheTideEngine();
+  HarmonicSeries series;
+  series.terms = e.workingCount;
+  for (std::size_t j = 0; j < static_cast<std::size_t>(e.workingCount); ++j) {
+    const StationConstituent& w = e.working[j];
+    series.amplitude[j] = w.H * w.f;
+    series.phase[j] = w.V + w.u - w.g;
+    series.advance[j] = step * e.constituents[static_cast<std::size_t>(w.number)].speed;
+  }
+  return series;
+}
 
 void SynthesizeSamples(double step, float* samples, std::int32_t count) {
-  TideEngine& e = TheTideEngine();
-  const std::int32_t n = e.workingCount;
-  Term terms[kConstituentCount];
-  for (std::int32_t j = 0; j < n; ++j) {
-    const StationConstituent& w = e.working[static_cast<std::size_t>(j)];
-    const double speed = e.constituents[static_cast<std::size_t>(w.number)].speed;
-    terms[j] = Term{w.H * w.f, w.V + w.u - w.g, step * speed};
-  }
-  for (std::int32_t k = 0; k < count; ++k) {
-    float sum = 0.0f;
-    for (std::int32_t j = 0; j < n; ++j) {
-      sum = static_cast<float>(sum + terms[j].amplitude * std::cos(terms[j].phase));
-      terms[j].phase += terms[j].advance;
-    }
-    samples[k] = sum;
-  }
+  SumSeries(DaySeries(step), samples, count);
 }
 
 DayPrediction PredictDay(const StationIndexRecord& key, StationHeader& header, const CalendarDate& date,

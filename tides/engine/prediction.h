@@ -10,6 +10,7 @@
 #include <cstdint>
 
 #include "tides/engine/calendar.h"
+#include "tides/engine/harmonic_sum.h"
 #include "tides/engine/station_files.h"
 #include "tides/engine/sun_events.h"
 #include "tides/engine/TideEngine.h"
@@ -36,9 +37,13 @@ double StartHours(std::int64_t localMidnightSeconds);
 // at t0 (15 degrees per hour since the UT midnight before it).
 void SetUpDay(double t0);
 
+// The loaded station's series for samples step hours apart: per working record, in order,
+// amplitude H x f, phase V + u - g and advance step x speed. The records are not changed.
+HarmonicSeries DaySeries(double step);
+
 // Sums the loaded station's series into count samples step hours apart, the sum kept in a
-// 32-bit float after each term, each argument advanced by step x speed per sample. The
-// arguments run in a local copy: the working records keep the day's starting V.
+// 32-bit float after each term, each argument advanced by step x speed per sample
+// (SumSeries over DaySeries). The working records keep the day's starting V.
 void SynthesizeSamples(double step, float* samples, std::int32_t count);
 
 struct DayPrediction {
