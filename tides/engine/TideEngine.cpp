@@ -85,6 +85,28 @@ namespace {
 AstronomicalArgument Degrees(double epochValue, double rate) {
   return {epochValue * kDegreesToRadians, rate * kDegreesToRadians};
 }
+
+AstronomicalArguments EpochArguments() {
+  AstronomicalArguments a;
+  a.s = Degrees(41.01, 0.549017);
+  a.h = Degrees(279.94, 0.041069);
+  a.p = Degrees(280.54, 0.004642);
+  a.N = Degrees(202.44, -0.002206);
+  a.p1 = Degrees(282.87, 0.000002);
+  return a;
+}
+
+// 2pi in two parts of 25 significant bits: n times either is exact for n below 2^20.
+constexpr double kTwoPiHigh = 0x1.921fb5p+2;
+constexpr double kTwoPiLow = 0x1.110b46p-24;
+static_assert(kTwoPiHigh + kTwoPiLow == kTwoPi, "the parts add up to 2pi exactly");
+constexpr double kSplitTurnsLimit = 0x1p20 * kTwoPi;
+
+// x - n 2pi for 0 <= x < kSplitTurnsLimit and whole n >= 0. x and n x kTwoPiHigh are both
+// multiples of ulp(x), so the first difference is exact; the second is exact whenever the
+// true result is representable, as fmod's remainder always is. For an n one too large the
+// result is still negative.
+double LessTurns(double x, double n) { return (x - n * kTwoPiHigh) - n * kTwoPiLow; }
 }  // namespace
 
 double NormalizeAngle(double x) {
@@ -92,7 +114,14 @@ double NormalizeAngle(double x) {
   // Far-off dates give arguments of many turns: cut them down before stepping by whole turns.
   if (x < -1024.0 * kTwoPi) x = std::fmod(x, kTwoPi);
   while (x < 0.0) x += kTwoPi;
-  return std::fmod(x, kTwoPi);
+  if (x < kTwoPi) return x;
+  if (!(x < kSplitTurnsLimit)) return std::fmod(x, kTwoPi);
+  // fmod(x, 2pi) bit for bit, without the C runtime's loop over the quotient's bits (a day's
+  // set-up reduces one argument per constituent). The rounded quotient is never below the
+  // true one's whole part, and at most one above it.
+  const double n = static_cast<double>(static_cast<std::int32_t>(x / kTwoPi));
+  const double r = LessTurns(x, n);
+  return r < 0.0 ? LessTurns(x, n - 1.0) : r;
 }
 
 double ConstituentSpeed(const DoodsonRow& d, const AstronomicalArguments& a) {
@@ -102,15 +131,18 @@ double ConstituentSpeed(const DoodsonRow& d, const AstronomicalArguments& a) {
 }
 
 void ResetConstituents() {
+  // The speeds follow from the fixed rates alone: worked out once, copied at every reset.
+  static const std::array<double, kConstituentCount> speeds = [] {
+    const AstronomicalArguments a = EpochArguments();
+    std::array<double, kConstituentCount> v{};
+    for (int n = 1; n < kConstituentCount; ++n) v[n] = ConstituentSpeed(DoodsonTable[n], a);
+    return v;
+  }();
   TideEngine& e = TheTideEngine();
-  e.arguments.s = Degrees(41.01, 0.549017);
-  e.arguments.h = Degrees(279.94, 0.041069);
-  e.arguments.p = Degrees(280.54, 0.004642);
-  e.arguments.N = Degrees(202.44, -0.002206);
-  e.arguments.p1 = Degrees(282.87, 0.000002);
+  e.arguments = EpochArguments();
   for (int n = 0; n < kConstituentCount; ++n) {
     ConstituentTableEntry& c = e.constituents[n];
-    c.speed = n == kMeanLevel ? 0.0 : ConstituentSpeed(DoodsonTable[n], e.arguments);
+    c.speed = speeds[n];
     c.u = 0.0;
     c.f = 1.0;
   }

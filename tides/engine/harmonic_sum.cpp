@@ -32,15 +32,17 @@ inline void Widen(const float* p, Doubles& low, Doubles& high) {
   low = _mm_cvtps_pd(f);
   high = _mm_cvtps_pd(_mm_movehl_ps(f, f));
 }
-inline Floats Narrow(Doubles low, Doubles high) { return _mm_movelh_ps(_mm_cvtpd_ps(low), _mm_cvtpd_ps(high)); }
+inline void Narrow(const Doubles& low, const Doubles& high, Floats& out) {
+  out = _mm_movelh_ps(_mm_cvtpd_ps(low), _mm_cvtpd_ps(high));
+}
 #else
 inline void Widen(const float* p, Doubles& low, Doubles& high) {
   low = Doubles{p[0], p[1]};
   high = Doubles{p[2], p[3]};
 }
-inline Floats Narrow(Doubles low, Doubles high) {
-  return Floats{static_cast<float>(low[0]), static_cast<float>(low[1]), static_cast<float>(high[0]),
-                static_cast<float>(high[1])};
+inline void Narrow(const Doubles& low, const Doubles& high, Floats& out) {
+  out = Floats{static_cast<float>(low[0]), static_cast<float>(low[1]), static_cast<float>(high[0]),
+               static_cast<float>(high[1])};
 }
 #endif
 
@@ -134,8 +136,9 @@ void AddTerm(DaySum& day, std::size_t j, const float* prev, float* cur, int leng
       Widen(prev + k, before0, before1);
       const Doubles sum0 = before0 + amplitude * cos0;
       const Doubles sum1 = before1 + amplitude * cos1;
-      const Floats low = Narrow(sum0 - tolerance, sum1 - tolerance);
-      const Floats high = Narrow(sum0 + tolerance, sum1 + tolerance);
+      Floats low, high;
+      Narrow(sum0 - tolerance, sum1 - tolerance, low);
+      Narrow(sum0 + tolerance, sum1 + tolerance, high);
       std::memcpy(cur + k, &low, sizeof low);
       spread += high - low;
       const Doubles c0 = cos0 * jumpCos - sin0 * jumpSin;

@@ -71,6 +71,27 @@ TEST_CASE("nodal corrections: factors at N = 0, angles that combine the base con
   CHECK((u(kM1) == doctest::Approx(std::atan2(y, x)) && f(kM1) == doctest::Approx(std::hypot(x, y))));
 }
 
+TEST_CASE("NormalizeAngle: the remainder of whole turns, bit for bit what fmod gives") {
+  const auto byFmod = [](double x) {
+    if (x < -1024.0 * kTwoPi) x = std::fmod(x, kTwoPi);
+    while (x < 0.0) x += kTwoPi;
+    return std::fmod(x, kTwoPi);
+  };
+  std::vector<double> angles = {0.0, -0.0, kTwoPi, -1e-300, 6.5e6, 1e12, -1e5, 41.01 * kPi / 180.0};
+  // Either side of whole turns, where a quotient rounded the wrong way would show.
+  for (int n = -3; n < 40000; n += n < 40 ? 1 : 997) {
+    double above = n * kTwoPi, below = above;
+    for (int u = 0; u < 8; ++u) {
+      angles.push_back(above = std::nextafter(above, 1e300));
+      angles.push_back(below = std::nextafter(below, -1e300));
+    }
+  }
+  for (double x = 0.5; x < 1e7; x = x * 1.37 + 0.91) angles.insert(angles.end(), {x, -x});
+  int differ = 0;
+  for (double x : angles) differ += NormalizeAngle(x) != byFmod(x);
+  CHECK(differ == 0);
+}
+
 TEST_CASE("the worked day: M2 at 1996-01-01 on a UTC computer") {
   OpenFolder folder({Station(0, 0, {{0, 0, 0}, {kM2, 0, 1000}})});
   const Day d = Predict(Key(0, 0), {1996, 1, 1}, 1.0);
