@@ -75,9 +75,11 @@ struct AstronomicalAngles {
   double s = 0.0, h = 0.0, p = 0.0, N = 0.0, p1 = 0.0;
 };
 
+using ConstituentTable = std::array<ConstituentTableEntry, kConstituentCount>;
+
 struct TideEngine {
   AstronomicalArguments arguments;
-  std::array<ConstituentTableEntry, kConstituentCount> constituents{};
+  ConstituentTable constituents{};
   std::array<StationConstituent, kConstituentCount> working{};
   std::int32_t workingCount = 0;
 };

@@ -80,10 +80,8 @@ constexpr CopyRule kCopies[] = {
     {25, kM2}, {26, kM2}, {32, kM2}, {43, kM2}, {44, kM2}, {54, kM2}, {56, kM2},
 };
 
-}  // namespace
-
-void ApplyNodalCorrections(double N, double p) {
-  auto& table = TheTideEngine().constituents;
+// Every rule that applies to the table's used rows, and the five that always run.
+void CorrectTable(ConstituentTable& table, double N, double p) {
   auto used = [&](int n) { return table[static_cast<std::size_t>(n)].used != 0; };
 
   const double sinN = std::sin(N), sin2N = std::sin(2.0 * N), sin3N = std::sin(3.0 * N);
@@ -148,6 +146,17 @@ void ApplyNodalCorrections(double N, double p) {
     table[static_cast<std::size_t>(r.number)].u = table[static_cast<std::size_t>(r.source)].u;
     table[static_cast<std::size_t>(r.number)].f = table[static_cast<std::size_t>(r.source)].f;
   }
+}
+
+}  // namespace
+
+void ApplyNodalCorrections(double N, double p) { CorrectTable(TheTideEngine().constituents, N, p); }
+
+ConstituentTable NodalCorrectionsOfEveryRow(double N, double p) {
+  ConstituentTable table{};
+  for (ConstituentTableEntry& c : table) c.used = 1;
+  CorrectTable(table, N, p);
+  return table;
 }
 
 }  // namespace br::tides

@@ -32,9 +32,11 @@ inline constexpr std::int32_t kMaxDayPoints = 24 * 3600 + 1;
 double StartHours(std::int64_t localMidnightSeconds);
 
 // The arguments of the loaded station at t0 hours after the epoch: writes V of working
-// records 1..count-1 (record 0, the mean level, keeps V = 0), the nodal corrections, and
-// copies u and f into the records. The mean lunar time includes the mean solar hour angle
-// at t0 (15 degrees per hour since the UT midnight before it).
+// records 1..count-1 (record 0, the mean level, keeps V = 0), the nodal corrections of the
+// station's rows into the table, and copies u and f into the records. The mean lunar time
+// includes the mean solar hour angle at t0 (15 degrees per hour since the UT midnight
+// before it). The values of the last t0 are kept for every row, so the stations of one
+// start instant (a chart's stations on one date) share one computation.
 void SetUpDay(double t0);
 
 // The loaded station's series for samples step hours apart: per working record, in order,

@@ -2,6 +2,7 @@
 // the Wine port suites.
 #include <doctest/doctest.h>
 
+#include <array>
 #include <cmath>
 #include <vector>
 
@@ -90,6 +91,39 @@ TEST_CASE("NormalizeAngle: the remainder of whole turns, bit for bit what fmod g
   int differ = 0;
   for (double x : angles) differ += NormalizeAngle(x) != byFmod(x);
   CHECK(differ == 0);
+}
+
+TEST_CASE("a station's arguments do not depend on the station set up before it on the same instant") {
+  // The second station's rows are partly the first's and partly not (Mm, M1, L2, MK3: rules
+  // that run only for used rows).
+  OpenFolder folder({Station(0, 0, {{0, 0, 100}, {kM2, 100, 900}, {kK1, 200, 300}, {kO1, 300, 200}}),
+                     Station(60, 60, {{0, 0, 100}, {kM2, 150, 800}, {kMm, 10, 30}, {kM1, 20, 20}, {kL2, 30, 40},
+                                      {45, 40, 10}, {kS2, 50, 300}})});
+  const auto records = [](const StationIndexRecord& key, CalendarDate date) {
+    Predict(key, date, 1.0);
+    const TideEngine& e = TheTideEngine();
+    std::vector<std::array<double, 3>> out;
+    for (std::int32_t j = 0; j < e.workingCount; ++j) {
+      const StationConstituent& w = e.working[static_cast<std::size_t>(j)];
+      out.push_back({w.V, w.u, w.f});
+    }
+    return out;
+  };
+  const CalendarDate date{2011, 8, 9};
+  const auto alone = records(Key(60, 60), date);
+  records(Key(0, 0), date);
+  CHECK(records(Key(60, 60), date) == alone);
+  records(Key(0, 0), {2011, 8, 10});
+  CHECK(records(Key(60, 60), date) == alone);
+  // The rows' values are those ApplyNodalCorrections gives a station that uses them.
+  const TideEngine& e = TheTideEngine();
+  ConstituentTable applied = e.constituents;
+  const AstronomicalAngles a = ArgumentsAt(e.arguments, StartHours(DaysFromCivil(date) * 86400));
+  ApplyNodalCorrections(a.N, a.p);
+  for (std::int32_t j = 0; j < e.workingCount; ++j) {
+    const auto n = static_cast<std::size_t>(e.working[static_cast<std::size_t>(j)].number);
+    CHECK((applied[n].u == TheTideEngine().constituents[n].u && applied[n].f == TheTideEngine().constituents[n].f));
+  }
 }
 
 TEST_CASE("the worked day: M2 at 1996-01-01 on a UTC computer") {
