@@ -7,6 +7,9 @@
 #if defined(__SSE2__)
 #include <emmintrin.h>
 #endif
+#if defined(__x86_64__) && !defined(_WIN32) && defined(__GNUC__)
+#include <immintrin.h>
+#endif
 
 #include "tides/engine/sine_cosine.h"
 
@@ -14,36 +17,71 @@ namespace br::tides {
 
 namespace {
 
-constexpr int kLanes = 4;   // samples of one term turned side by side
 constexpr int kChunk = 64;  // samples checked together, and summed again on doubt
 constexpr int kSpan = 512;  // samples between true sines and cosines
-static_assert(kSpan % kChunk == 0 && kChunk % kLanes == 0, "chunks hold whole lane groups");
+constexpr int kMostLanes = 8;
+static_assert(kSpan % kChunk == 0 && kChunk % kMostLanes == 0, "chunks hold whole lane groups");
 
-// Two lanes in a vector of the GCC and clang extension (an SSE2 register: the arithmetic
-// below is packed whatever the compiler makes of scalar code); four floats in another.
-typedef double Doubles __attribute__((vector_size(2 * sizeof(double))));
-typedef float Floats __attribute__((vector_size(4 * sizeof(float))));
-static_assert(kLanes == 4, "the lanes fill two double vectors and one float vector");
+// The samples of one term turned side by side, in two vectors of the GCC and clang
+// extension so that the loop runs in packed instructions whatever the compiler makes of
+// scalar code. Each policy gives the vector type and the float conversions.
 
-// The float vector's conversions, which compilers do poorly from the generic types.
+// Four lanes in two SSE2 registers (the baseline of x86-64 and of the Windows builds).
+struct FourLanes {
+  static constexpr int kCount = 4;
+  typedef double Doubles __attribute__((vector_size(2 * sizeof(double))));
+  typedef float Floats __attribute__((vector_size(4 * sizeof(float))));
 #if defined(__SSE2__)
-inline void Widen(const float* p, Doubles& low, Doubles& high) {
-  const __m128 f = _mm_loadu_ps(p);
-  low = _mm_cvtps_pd(f);
-  high = _mm_cvtps_pd(_mm_movehl_ps(f, f));
-}
-inline void Narrow(const Doubles& low, const Doubles& high, Floats& out) {
-  out = _mm_movelh_ps(_mm_cvtpd_ps(low), _mm_cvtpd_ps(high));
-}
+  // Compilers convert the generic pair types poorly: the SSE2 conversions directly.
+  static void Widen(const float* p, Doubles (&out)[2]) {
+    const __m128 f = _mm_loadu_ps(p);
+    out[0] = _mm_cvtps_pd(f);
+    out[1] = _mm_cvtps_pd(_mm_movehl_ps(f, f));
+  }
+  static void Narrow(const Doubles& low, const Doubles& high, Floats& out) {
+    out = _mm_movelh_ps(_mm_cvtpd_ps(low), _mm_cvtpd_ps(high));
+  }
 #else
-inline void Widen(const float* p, Doubles& low, Doubles& high) {
-  low = Doubles{p[0], p[1]};
-  high = Doubles{p[2], p[3]};
-}
-inline void Narrow(const Doubles& low, const Doubles& high, Floats& out) {
-  out = Floats{static_cast<float>(low[0]), static_cast<float>(low[1]), static_cast<float>(high[0]),
-               static_cast<float>(high[1])};
-}
+  static void Widen(const float* p, Doubles (&out)[2]) {
+    out[0] = Doubles{p[0], p[1]};
+    out[1] = Doubles{p[2], p[3]};
+  }
+  static void Narrow(const Doubles& low, const Doubles& high, Floats& out) {
+    out = Floats{static_cast<float>(low[0]), static_cast<float>(low[1]), static_cast<float>(high[0]),
+                 static_cast<float>(high[1])};
+  }
+#endif
+  // Both halves rounded to floats, stored; high - low added to the spread.
+  static void Round(const Doubles (&sum)[2], double tolerance, float* out, Floats& spread) {
+    Floats low, high;
+    Narrow(sum[0] - tolerance, sum[1] - tolerance, low);
+    Narrow(sum[0] + tolerance, sum[1] + tolerance, high);
+    std::memcpy(out, &low, sizeof low);
+    spread += high - low;
+  }
+};
+
+// Eight lanes in two AVX registers, for processors that have them (native builds only: the
+// Windows compiler does not keep the stack aligned for AVX spills).
+#if defined(__x86_64__) && !defined(_WIN32) && defined(__GNUC__)
+#define BR_HARMONIC_SUM_AVX 1
+struct EightLanes {
+  static constexpr int kCount = 8;
+  typedef double Doubles __attribute__((vector_size(4 * sizeof(double))));
+  typedef float Floats __attribute__((vector_size(4 * sizeof(float))));
+  __attribute__((target("avx"))) static void Widen(const float* p, Doubles (&out)[2]) {
+    out[0] = _mm256_cvtps_pd(_mm_loadu_ps(p));
+    out[1] = _mm256_cvtps_pd(_mm_loadu_ps(p + 4));
+  }
+  static void Round(const Doubles (&sum)[2], double tolerance, float* out, Floats& spread) {
+    for (int v = 0; v < 2; ++v) {
+      const Floats low = __builtin_convertvector(sum[v] - tolerance, Floats);
+      const Floats high = __builtin_convertvector(sum[v] + tolerance, Floats);
+      std::memcpy(out + 4 * v, &low, sizeof low);
+      spread += high - low;
+    }
+  }
+};
 #endif
 
 constexpr double kUnit = 0x1p-53;  // half a unit in the last place of 1
@@ -80,8 +118,8 @@ struct DaySum {
   const HarmonicSeries& series;
   std::size_t terms = 0;
   double sumBound = 0.0;           // no partial sum of any sample is larger
-  TermValues turnCos[kLanes + 1];  // cos and sin of l steps, l = 0..kLanes
-  TermValues turnSin[kLanes + 1];
+  TermValues turnCos[kMostLanes + 1];  // cos and sin of l steps, l = 0..kMostLanes
+  TermValues turnSin[kMostLanes + 1];
   TermValues phase;                // the reference's phase at the span's first sample
   TermValues phaseCos, phaseSin;   // its cosine and sine
   std::int32_t resummed = 0;
@@ -102,7 +140,10 @@ void AddTermByCosine(const DaySum& day, std::size_t j, const float* prev, float*
 }
 
 // Adds term j to the first length samples of a span: cur = prev + term, rounded to floats.
-void AddTerm(DaySum& day, std::size_t j, const float* prev, float* cur, int length) {
+template <typename Lanes>
+inline void AddTerm(DaySum& day, std::size_t j, const float* prev, float* cur, int length) {
+  using Doubles = typename Lanes::Doubles;
+  constexpr int kLanes = Lanes::kCount, kWidth = kLanes / 2;
   const double amplitude = day.series.amplitude[j];
   const double size = std::fabs(amplitude);
   const double reach = std::fabs(day.phase[j]) + std::fabs(day.series.advance[j]) * length;
@@ -113,15 +154,13 @@ void AddTerm(DaySum& day, std::size_t j, const float* prev, float* cur, int leng
   const double atStart = 2.0 * (size * (kTurnErrorPerStep + kSineCosineError + kLibraryCosineError + 2 * kUnit) +
                                 2.0 * day.sumBound * kUnit);
 
-  // Lane l holds samples l, l + kLanes, l + 2 kLanes, ... of the span: lanes 0 and 1 in
-  // the first vector, 2 and 3 in the second.
-  double startCos[kLanes], startSin[kLanes];
+  // Lane l holds samples l, l + kLanes, l + 2 kLanes, ... of the span: the first half of
+  // the lanes in the first vector, the rest in the second.
+  Doubles laneCos[2], laneSin[2];
   for (int l = 0; l < kLanes; ++l) {
-    startCos[l] = day.phaseCos[j] * day.turnCos[l][j] - day.phaseSin[j] * day.turnSin[l][j];
-    startSin[l] = day.phaseSin[j] * day.turnCos[l][j] + day.phaseCos[j] * day.turnSin[l][j];
+    laneCos[l / kWidth][l % kWidth] = day.phaseCos[j] * day.turnCos[l][j] - day.phaseSin[j] * day.turnSin[l][j];
+    laneSin[l / kWidth][l % kWidth] = day.phaseSin[j] * day.turnCos[l][j] + day.phaseCos[j] * day.turnSin[l][j];
   }
-  Doubles cos0 = {startCos[0], startCos[1]}, cos1 = {startCos[2], startCos[3]};
-  Doubles sin0 = {startSin[0], startSin[1]}, sin1 = {startSin[2], startSin[3]};
   const double jumpCos = day.turnCos[kLanes][j], jumpSin = day.turnSin[kLanes][j];
 
   for (int first = 0; first < length; first += kChunk) {
@@ -129,27 +168,21 @@ void AddTerm(DaySum& day, std::size_t j, const float* prev, float* cur, int leng
     const double tolerance = atStart + perSample * last;
     // high - low is 0 where both ends round to one float, else positive: their total says
     // whether any rounding of the chunk is in doubt.
-    Floats spread = {};
+    typename Lanes::Floats spread = {};
     // Whole lane groups: the last may run past length into the span's padding.
     for (int k = first; k < last; k += kLanes) {
-      Doubles before0, before1;
-      Widen(prev + k, before0, before1);
-      const Doubles sum0 = before0 + amplitude * cos0;
-      const Doubles sum1 = before1 + amplitude * cos1;
-      Floats low, high;
-      Narrow(sum0 - tolerance, sum1 - tolerance, low);
-      Narrow(sum0 + tolerance, sum1 + tolerance, high);
-      std::memcpy(cur + k, &low, sizeof low);
-      spread += high - low;
-      const Doubles c0 = cos0 * jumpCos - sin0 * jumpSin;
-      const Doubles c1 = cos1 * jumpCos - sin1 * jumpSin;
-      sin0 = sin0 * jumpCos + cos0 * jumpSin;
-      sin1 = sin1 * jumpCos + cos1 * jumpSin;
-      cos0 = c0;
-      cos1 = c1;
+      Doubles sum[2];
+      Lanes::Widen(prev + k, sum);
+      for (int v = 0; v < 2; ++v) sum[v] += amplitude * laneCos[v];
+      Lanes::Round(sum, tolerance, cur + k, spread);
+      for (int v = 0; v < 2; ++v) {
+        const Doubles c = laneCos[v] * jumpCos - laneSin[v] * jumpSin;
+        laneSin[v] = laneSin[v] * jumpCos + laneCos[v] * jumpSin;
+        laneCos[v] = c;
+      }
     }
     float doubt = 0.0f;
-    for (int l = 0; l < kLanes; ++l) doubt += spread[l];
+    for (int l = 0; l < 4; ++l) doubt += spread[l];
     // A rounding too close to call: the reference's cosines decide these samples.
     if (doubt != 0.0f) {
       AddTermByCosine(day, j, prev, cur, first, last);
@@ -157,6 +190,36 @@ void AddTerm(DaySum& day, std::size_t j, const float* prev, float* cur, int leng
     }
   }
 }
+
+// The terms of one span summed with the lanes' policy; returns the buffer of the sums.
+template <typename Lanes>
+inline float* AddTerms(DaySum& day, float* prev, float* cur, int length) {
+  for (std::size_t j = 0; j < day.terms; ++j) {
+    // A term of no amplitude adds a zero, which leaves every float as it is (the sum is
+    // never -0). Skipped, it cannot fall on a rounding too close to call near 0.
+    if (day.series.amplitude[j] == 0.0) continue;
+    AddTerm<Lanes>(day, j, prev, cur, length);
+    std::swap(prev, cur);
+  }
+  return prev;
+}
+
+float* AddTermsInFourLanes(DaySum& day, float* prev, float* cur, int length) {
+  return AddTerms<FourLanes>(day, prev, cur, length);
+}
+
+#if defined(BR_HARMONIC_SUM_AVX)
+// The same code compiled for AVX, everything it calls inlined so that it is too.
+__attribute__((target("avx"), flatten)) float* AddTermsInEightLanes(DaySum& day, float* prev, float* cur,
+                                                                     int length) {
+  return AddTerms<EightLanes>(day, prev, cur, length);
+}
+
+bool HasAvx() {
+  static const bool has = __builtin_cpu_supports("avx");
+  return has;
+}
+#endif
 
 }  // namespace
 
@@ -182,7 +245,7 @@ std::int32_t SumSeries(const HarmonicSeries& series, float* samples, std::int32_
     return 0;
   }
 
-  // Once a day: the turn of 0 to kLanes steps of every term, each loop over all terms.
+  // Once a day: the turn of 0 to kMostLanes steps of every term, each loop over all terms.
   DaySum day(series);
   day.terms = terms;
   for (std::size_t j = 0; j < terms; ++j) {
@@ -190,7 +253,7 @@ std::int32_t SumSeries(const HarmonicSeries& series, float* samples, std::int32_
     day.turnSin[0][j] = 0.0;
     SineCosine(series.advance[j], day.turnSin[1][j], day.turnCos[1][j]);
   }
-  for (int l = 2; l <= kLanes; ++l) {
+  for (int l = 2; l <= kMostLanes; ++l) {
     for (std::size_t j = 0; j < terms; ++j) {
       const double c = day.turnCos[l - 1][j], s = day.turnSin[l - 1][j];
       day.turnCos[l][j] = c * day.turnCos[1][j] - s * day.turnSin[1][j];
@@ -207,20 +270,17 @@ std::int32_t SumSeries(const HarmonicSeries& series, float* samples, std::int32_
   float spanA[kSpan], spanB[kSpan];
   for (std::int32_t start = 0; start < count; start += kSpan) {
     const int length = static_cast<int>(std::min<std::int32_t>(kSpan, count - start));
-    const int padded = (length + kLanes - 1) / kLanes * kLanes;
+    const int padded = (length + kMostLanes - 1) / kMostLanes * kMostLanes;
     for (std::size_t j = 0; j < terms; ++j) SineCosine(day.phase[j], day.phaseSin[j], day.phaseCos[j]);
 
-    float* prev = spanA;
-    float* cur = spanB;
-    std::fill(prev, prev + padded, 0.0f);
-    for (std::size_t j = 0; j < terms; ++j) {
-      // A term of no amplitude adds a zero, which leaves every float as it is (the sum is
-      // never -0). Skipped, it cannot fall on a rounding too close to call near 0.
-      if (series.amplitude[j] == 0.0) continue;
-      AddTerm(day, j, prev, cur, length);
-      std::swap(prev, cur);
-    }
-    std::copy(prev, prev + length, samples + start);
+    std::fill(spanA, spanA + padded, 0.0f);
+#if defined(BR_HARMONIC_SUM_AVX)
+    const float* sums = HasAvx() ? AddTermsInEightLanes(day, spanA, spanB, length)
+                                 : AddTermsInFourLanes(day, spanA, spanB, length);
+#else
+    const float* sums = AddTermsInFourLanes(day, spanA, spanB, length);
+#endif
+    std::copy(sums, sums + length, samples + start);
 
     // The next span starts from the reference's own phases, added up sample by sample.
     if (count - start > kSpan) {
