@@ -26,7 +26,8 @@ static_assert(kSpan % kChunk == 0 && kChunk % kMostLanes == 0, "chunks hold whol
 // extension so that the loop runs in packed instructions whatever the compiler makes of
 // scalar code. Each policy gives the vector type and the float conversions.
 
-// Four lanes in two SSE2 registers (the baseline of x86-64 and of the Windows builds).
+// Four lanes in two SSE2 registers (the baseline of x86-64; a target without SSE2, such as
+// the 32-bit Windows build, takes the generic conversions).
 struct FourLanes {
   static constexpr int kCount = 4;
   typedef double Doubles __attribute__((vector_size(2 * sizeof(double))));

@@ -26,13 +26,13 @@ struct HarmonicSeries {
 // One cosine per term and sample: the reference SumSeries is held to.
 void SumSeriesByCosine(const HarmonicSeries& series, float* samples, std::int32_t count);
 
-// The same samples as SumSeriesByCosine. Each term turns a unit vector by its step (eight
-// samples side by side, each turned by eight steps at a time) from a true sine and cosine
-// every 512 samples; every float rounding is checked against a bound on how far the turned
-// cosine can be from the reference's, and where the bound cannot tell which float the
-// reference gets, that term's 64 samples are summed again with the cosine. Returns how many
-// times that happened. Series that are not finite, or whose phases run beyond what the
-// turning is built for, are summed by SumSeriesByCosine.
+// The same samples as SumSeriesByCosine. Each term turns a unit vector by its step (four or
+// eight consecutive samples side by side, each lane turned by as many steps at a time) from
+// a true sine and cosine every 512 samples; every float rounding is checked against a bound
+// on how far the turned cosine can be from the reference's, and where the bound cannot tell
+// which float the reference gets, that term's 64 samples are summed again with the cosine.
+// Returns how many times that happened. Series that are not finite, or whose phases run
+// beyond what the turning is built for, are summed by SumSeriesByCosine.
 std::int32_t SumSeries(const HarmonicSeries& series, float* samples, std::int32_t count);
 
 }  // namespace br::tides
