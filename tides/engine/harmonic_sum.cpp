@@ -120,11 +120,11 @@ using TermValues = std::array<double, kConstituentCount>;
 struct DaySum {
   const HarmonicSeries& series;
   std::size_t terms = 0;
-  double sumBound = 0.0;           // no partial sum of any sample is larger
+  double sumBound = 0.0;               // no partial sum of any sample is larger
   TermValues turnCos[kMostLanes + 1];  // cos and sin of l steps, l = 0..kMostLanes
   TermValues turnSin[kMostLanes + 1];
-  TermValues phase;                // the reference's phase at the span's first sample
-  TermValues phaseCos, phaseSin;   // its cosine and sine
+  TermValues phase;                    // the reference's phase at the span's first sample
+  TermValues phaseCos, phaseSin;       // its cosine and sine
   std::int32_t resummed = 0;
 
   explicit DaySum(const HarmonicSeries& s) : series(s) {}
