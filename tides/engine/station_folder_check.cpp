@@ -37,7 +37,7 @@ std::string Angle(int minutes, int degreeDigits, const char* hemispheres) {
 
 // "01°00'N 001°00'E" (UTF-8).
 std::string Position(const StationIndexRecord& r) {
-  return Angle(r.latitude, 2, "NS") + " " + Angle(r.longitude, 3, "EW");
+  return WholeMinutePositionText(r.latitude, r.longitude);
 }
 
 std::vector<StationIndexRecord> Records(const std::vector<std::uint8_t>& bytes) {
@@ -224,6 +224,10 @@ class FolderChecker {
 }  // namespace
 
 std::vector<std::string> CheckStationFolder(const StationFolderBytes& folder) { return FolderChecker(folder).Run(); }
+
+std::string WholeMinutePositionText(int latitudeMinutes, int longitudeMinutes) {
+  return Angle(latitudeMinutes, 2, "NS") + " " + Angle(longitudeMinutes, 3, "EW");
+}
 
 long ProblemStation(const std::string& problem) {
   static const char kMark[] = ": station ";

@@ -25,4 +25,7 @@ std::vector<std::string> CheckStationFolder(const StationFolderBytes& folder);
 // for a problem of the folder as a whole.
 long ProblemStation(const std::string& problem);
 
+// A whole-minute position as the check's lines give it: "48°23'N 004°30'W" (UTF-8).
+std::string WholeMinutePositionText(int latitudeMinutes, int longitudeMinutes);
+
 }  // namespace br::tides

@@ -1,5 +1,7 @@
 #include "tools/tidefiles/station_entry.h"
 
+#include "tides/engine/station_folder_check.h"
+
 #include <cstdio>
 
 namespace br::tidefiles {
@@ -11,18 +13,9 @@ std::string DescribeStation(std::size_t index, const std::string& utf8Name) {
   return s;
 }
 
-namespace {
-std::string Angle(int minutes, int degreeDigits, const char* hemispheres) {
-  const int size = minutes < 0 ? -minutes : minutes;
-  char text[32];
-  std::snprintf(text, sizeof text, "%0*d\xC2\xB0%02d'%c", degreeDigits, size / 60, size % 60,
-                minutes < 0 ? hemispheres[1] : hemispheres[0]);
-  return text;
-}
-}  // namespace
 
 std::string PositionText(int latitudeMinutes, int longitudeMinutes) {
-  return Angle(latitudeMinutes, 2, "NS") + " " + Angle(longitudeMinutes, 3, "EW");
+  return br::tides::WholeMinutePositionText(latitudeMinutes, longitudeMinutes);
 }
 
 std::string MessageText(const std::string& text) {
