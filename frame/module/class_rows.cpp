@@ -3,6 +3,7 @@
 // A class joins with one row here (and its library in frame/dll.cmake).
 #include "frame/module/class_rows.h"
 
+#include "contours/XContoursView.h"
 #include "tides/controls/TidesPortList.h"
 #include "tides/controls/TidesWindow.h"
 #include "tides/objects/TidesDatabase.h"
@@ -16,6 +17,7 @@ ClassEntry gRows[] = {
     PlainObjectRow<br::tides::TidesPort>(L"TidesPort"),
     ControlRow<br::tides::TidesPortList>(L"TidesPortList", 107),
     ControlRow<br::tides::TidesWindow>(L"TidesWindow", 109),
+    ControlRow<br::contours::XContoursView>(L"XContoursView", 116),
 };
 
 }  // namespace
