@@ -34,9 +34,12 @@ struct Row {
   const wchar_t* name;
   const CLSID* clsid;
   bool control;
+  const wchar_t* toolboxBitmap;
 };
-// One plain row and one control row: the other rows take the same paths.
-const Row kRows[] = {{L"TidesPort", &CLSID_TidesPort, false}, {L"TidesWindow", &CLSID_TidesWindow, true}};
+// One plain row and two control rows (one without events): the other rows take the same paths.
+const Row kRows[] = {{L"TidesPort", &CLSID_TidesPort, false, nullptr},
+                     {L"TidesWindow", &CLSID_TidesWindow, true, L", 109"},
+                     {L"XContoursView", &CLSID_XContoursView, true, L", 116"}};
 
 }  // namespace
 
@@ -62,7 +65,7 @@ TEST_CASE("DllRegisterServer writes the class keys and the type library; DllUnre
     for (const wchar_t* entry : {L"Control", L"Insertable", L"MiscStatus", L"ToolboxBitmap32", L"Version"})
       CHECK(KeyExists(key + L"\\" + entry) == p.control);
     if (p.control) {
-      CHECK(SamePath(Value(key + L"\\ToolboxBitmap32"), dll.Path() + L", 109"));
+      CHECK(SamePath(Value(key + L"\\ToolboxBitmap32"), dll.Path() + p.toolboxBitmap));
       CHECK(Value(key + L"\\MiscStatus\\1") == L"131473");
     }
   }
