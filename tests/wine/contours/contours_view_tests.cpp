@@ -3,6 +3,7 @@
 // what the view does with the host's components, palette, font and device context.
 #include "tests/wine/common/Canvas.h"
 #include "tests/wine/common/DllUnderTest.h"
+#include "tests/wine/common/SceneProbe.h"
 
 #include "contours/layout/contour_layout.h"
 
@@ -14,8 +15,10 @@
 #include <olectl.h>
 
 #include <algorithm>
+#include <cstdlib>
 #include <ios>
 #include <map>
+#include <string>
 #include <vector>
 
 using namespace br::test;
@@ -463,4 +466,101 @@ TEST_CASE("a control without events, with the preferred size 300 x 200") {
   CHECK(embedded->GetPreferredSize(&width, &height) == S_OK);
   CHECK(width == 300);
   CHECK(height == 200);
+}
+
+namespace {
+
+// The stand-in chart host's scene object, called through IDispatch.
+class Scene {
+public:
+  Scene() {
+    CLSID clsid{};
+    REQUIRE(CLSIDFromProgID(L"ChartScene.Scene", &clsid) == S_OK);
+    REQUIRE(CoCreateInstance(clsid, nullptr, CLSCTX_INPROC_SERVER, IID_IDispatch, scene_.OutVoid()) == S_OK);
+    const char* root = getenv("BR_SOURCE_DIR");
+    REQUIRE(root != nullptr);
+    std::wstring path = L"Z:";
+    for (const char* c = root; *c; ++c) path += *c == '/' ? L'\\' : static_cast<wchar_t>(*c);
+    path += L"\\data\\harbour\\harbour.json";
+    VARIANT result = Call(L"Load", path.c_str());
+    VariantClear(&result);
+  }
+  // The scene's component of that kind and name (one reference for the caller).
+  ComRef<IUnknown> Component(const wchar_t* kind, const wchar_t* name) {
+    VARIANT result = Call(kind, name);
+    REQUIRE(result.vt == VT_UNKNOWN);
+    return ComRef<IUnknown>::Adopt(result.punkVal);
+  }
+  long Palette(const wchar_t* name) {
+    VARIANT result = Call(L"Palette", name);
+    REQUIRE(result.vt == VT_I4);
+    return result.lVal;
+  }
+
+private:
+  VARIANT Call(const wchar_t* method, const wchar_t* text) {
+    DISPID id = 0;
+    LPOLESTR names[] = {const_cast<LPOLESTR>(method)};
+    REQUIRE(scene_->GetIDsOfNames(IID_NULL, names, 1, LOCALE_USER_DEFAULT, &id) == S_OK);
+    VARIANT argument;
+    argument.vt = VT_BSTR;
+    argument.bstrVal = SysAllocString(text);
+    DISPPARAMS parameters{&argument, nullptr, 1, 0};
+    VARIANT result;
+    VariantInit(&result);
+    const HRESULT hr = scene_->Invoke(id, IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_METHOD, &parameters, &result,
+                                      nullptr, nullptr);
+    VariantClear(&argument);
+    REQUIRE(hr == S_OK);
+    return result;
+  }
+  ComRef<IDispatch> scene_;
+};
+
+COLORREF Hex(unsigned rgb) { return RGB(rgb >> 16, (rgb >> 8) & 0xFF, rgb & 0xFF); }
+
+}  // namespace
+
+TEST_CASE("over the stand-in host's sample scene") {
+  View v;
+  SceneProbe probe;
+  Scene scene;
+  const long liveParams = probe.Counter("live.PresParams");
+  const long liveMaps = probe.Counter("live.ColorMap");
+  REQUIRE(v.view->put_Palette(scene.Palette(L"day")) == S_OK);
+  // The day palette's colours of the chart colours 21, 31, 30, 29 and 28.
+  const COLORREF zones[] = {Hex(0xC9EDFC), Hex(0xA7D9FB), Hex(0x82CAFF), Hex(0x61B7FF), Hex(0xD4EAEE)};
+  {
+    ComRef<IUnknown> map = scene.Component(L"ColorMap", L"day");
+    ComRef<IUnknown> four = scene.Component(L"PresParams", L"four-shades");
+    ComRef<IUnknown> two = scene.Component(L"PresParams", L"two-shades");
+    ComRef<IUnknown> wrong = scene.Component(L"PresParams", L"wrong-type");
+    const long params = probe.Counter("calls.IPresParams.GetParam");
+    const long indices = probe.Counter("calls.IColorMap.GetPaletteIndex");
+
+    REQUIRE(v.view->SetContoursData(four.Get(), map.Get(), 10.0) == S_OK);
+    CHECK(probe.Counter("calls.IPresParams.GetParam") - params == 3);
+    CHECK(probe.Counter("calls.IColorMap.GetPaletteIndex") - indices == 6);
+    Canvas picture(300, 100);
+    v.Draw(picture);
+    for (int i = 0; i < 5; ++i) CHECK(picture.At(0, 20 * i + 10) == zones[i]);
+
+    REQUIRE(v.view->SetContoursData(two.Get(), map.Get(), 10.0) == S_OK);
+    v.Draw(picture);
+    CHECK(picture.At(0, 10) == zones[0]);
+    CHECK(picture.At(0, 50) == zones[1]);
+    CHECK(picture.At(0, 90) == zones[4]);
+    CHECK(picture.At(0, 32) == kText);  // the safety contour's bars at y = 33
+
+    REQUIRE(v.view->SetContoursData(wrong.Get(), map.Get(), 10.0) == S_OK);
+    CHECK(v.AllGrey(300, 100));
+
+    probe.SetFault("IColorMap.GetPaletteIndex", E_FAIL);
+    CHECK(v.view->SetContoursData(four.Get(), map.Get(), 10.0) == S_OK);
+    probe.ClearFaults();
+    CHECK(v.AllGrey(300, 100));
+  }
+  // No component of the host is kept.
+  CHECK(probe.Counter("live.PresParams") == liveParams);
+  CHECK(probe.Counter("live.ColorMap") == liveMaps);
 }
