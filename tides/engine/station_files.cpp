@@ -19,10 +19,19 @@ constexpr char kPathSeparator = '\\';
 constexpr char kPathSeparator = '/';
 #endif
 
+// Longest station block: a header and 69 constituent records.
+constexpr std::size_t kMaxBlockSize = StationHeader::kSize + kConstituentCount * ConstituentRecord::kSize;
+constexpr std::uint32_t kNotRead = UINT32_MAX;
+
 struct StationFiles {
   std::vector<StationIndexRecord> byNumber;  // "td_num.ntx"
   std::vector<StationIndexRecord> byKey;     // "td_crd.ntx"
   std::FILE* data = nullptr;                 // "td_pnt.dat", open while a folder is open
+  // Blocks already read whole from this open "td_pnt.dat", so a station predicted day after
+  // day is read once: per "td_crd.ntx" record the start of its block's bytes in blocks, or
+  // kNotRead. Both are emptied with the stream, so no other folder's bytes are ever served.
+  std::vector<std::uint32_t> blockStart;
+  std::vector<std::uint8_t> blocks;
 };
 
 StationFiles& Files() {
@@ -59,8 +68,27 @@ std::vector<StationIndexRecord> DecodeIndex(const std::vector<std::uint8_t>& byt
   return records;
 }
 
-bool ReadExactly(std::FILE* f, std::uint8_t* buffer, std::size_t size) {
-  return std::fread(buffer, 1, size, f) == size;
+// The bytes of a block whose header is possible and whose records are all there, or null.
+// Read once, with one read of the longest block (fewer bytes at the end of the file).
+const std::uint8_t* StationBlock(StationFiles& files, std::size_t position) {
+  const std::uint32_t start = files.blockStart[position];
+  if (start != kNotRead) return files.blocks.data() + start;
+  const std::uint32_t offset = files.byKey[position].offset;
+  if (offset > static_cast<std::uint32_t>(LONG_MAX)) return nullptr;
+  if (std::fseek(files.data, static_cast<long>(offset), SEEK_SET) != 0) return nullptr;
+  std::uint8_t buffer[kMaxBlockSize];
+  const std::size_t got = std::fread(buffer, 1, sizeof buffer, files.data);
+  if (got < StationHeader::kSize) return nullptr;
+  // A damaged header counts as no station, like a block cut short.
+  const StationHeader header = DecodeStationHeader(buffer);
+  if (IsImpossibleHeader(header)) return nullptr;
+  const std::size_t size =
+      StationHeader::kSize + static_cast<std::size_t>(header.constituentCount) * ConstituentRecord::kSize;
+  if (got < size) return nullptr;
+  // At most 32767 blocks of kMaxBlockSize bytes: the starts fit in 32 bits.
+  files.blockStart[position] = static_cast<std::uint32_t>(files.blocks.size());
+  files.blocks.insert(files.blocks.end(), buffer, buffer + size);
+  return files.blocks.data() + files.blockStart[position];
 }
 
 }  // namespace
@@ -92,6 +120,7 @@ int OpenTideFiles(const char* folder) {
   files.byNumber = DecodeIndex(numbers, count);
   files.byKey = DecodeIndex(coordinates, count);
   files.data = data;
+  files.blockStart.assign(count, kNotRead);
   return 0;
 }
 
@@ -103,6 +132,10 @@ void CloseTideFiles() {
   files.byNumber.shrink_to_fit();
   files.byKey.clear();
   files.byKey.shrink_to_fit();
+  files.blockStart.clear();
+  files.blockStart.shrink_to_fit();
+  files.blocks.clear();
+  files.blocks.shrink_to_fit();
 }
 
 std::int32_t StationCount() {
@@ -136,19 +169,13 @@ bool FindStation(const StationIndexRecord& key, StationHeader& header) {
       [](const StationIndexRecord& r, std::uint32_t k) { return StationKey(r) < k; });
   if (found == files.byKey.end() || StationKey(*found) != wanted) return false;
 
-  // Read the whole block before touching the working records: a block cut short (or an
-  // offset past what the stream can seek to) leaves everything as it was.
-  if (found->offset > static_cast<std::uint32_t>(LONG_MAX)) return false;
-  if (std::fseek(files.data, static_cast<long>(found->offset), SEEK_SET) != 0) return false;
-  StationHeader::Bytes headerBytes;
-  if (!ReadExactly(files.data, headerBytes.data(), headerBytes.size())) return false;
-  const StationHeader read = DecodeStationHeader(headerBytes.data());
-  // A damaged header counts as no station, like a block cut short.
-  if (IsImpossibleHeader(read)) return false;
+  // The whole block is there before the working records are touched: a block cut short (or
+  // an offset past what the stream can seek to) leaves everything as it was.
+  const std::uint8_t* block = StationBlock(files, static_cast<std::size_t>(found - files.byKey.begin()));
+  if (!block) return false;
+  const StationHeader read = DecodeStationHeader(block);
   const int records = read.constituentCount;
-  std::uint8_t recordBytes[kConstituentCount * ConstituentRecord::kSize];
-  if (!ReadExactly(files.data, recordBytes, static_cast<std::size_t>(records) * ConstituentRecord::kSize))
-    return false;
+  const std::uint8_t* recordBytes = block + StationHeader::kSize;
 
   int loaded = 0;
   for (int i = 0; i < records; ++i) {

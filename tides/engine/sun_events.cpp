@@ -8,48 +8,114 @@ namespace {
 constexpr double kRad = 0.017453292519943295;
 constexpr double kDeg = 57.29577951308232;
 constexpr int kMaxPasses = 26;
+
+// fmod(x, 360), the same bits: below 360 in size fmod gives x itself, and for 360 <= |x| < 2^40
+// the remainder x - 360 n is exact (x and 360 n are both whole multiples of x's last place),
+// so only the quotient needs finding, not the library's digit-by-digit division.
+inline double Mod360(double x) {
+  const double size = std::fabs(x);
+  if (size < 360.0) return x;
+  if (!(size < 0x1p40)) return std::fmod(x, 360.0);  // and NaN
+  double r = size - 360.0 * std::trunc(size / 360.0);
+  // The rounded quotient can be one off; a turn either way is exact too.
+  if (r < 0.0) r += 360.0;
+  else if (r >= 360.0) r -= 360.0;
+  return x < 0.0 ? -r : r;  // fmod keeps the sign of x, a zero's too
+}
+
+// The sun at one instant, as each pass of an event's iteration needs it.
+struct SunSky {
+  double gha = 0.0;
+  double sinDeclination = 0.0;
+  double cosDeclination = 0.0;
+};
+
+SunSky SkyAt(std::int32_t J, double t) {
+  SunSky sky;
+  double delta = 0.0;
+  SunPosition(J, t, sky.gha, delta);
+  sky.sinDeclination = std::sin(delta * kRad);
+  sky.cosDeclination = std::cos(delta * kRad);
+  return sky;
+}
+
+// What an event's iteration needs of the place and the altitude, worked out once a day.
+struct SunPlace {
+  double sinPhi = 0.0;
+  double cosPhi = 0.0;
+  double lambda = 0.0;
+};
+
+// The first pass of every event of a day starts from noon: its sky, and per altitude its
+// cosine of the hour angle and the angle itself (a rising and a setting share them).
+struct NoonPass {
+  SunSky sky;
+  double c = 0.0;
+  double H = 0.0;
+};
+
+NoonPass FirstPass(const SunSky& noon, const SunPlace& place, double sinH0) {
+  NoonPass first;
+  first.sky = noon;
+  first.c = (sinH0 - place.sinPhi * noon.sinDeclination) / (place.cosPhi * noon.cosDeclination);
+  if (std::fabs(first.c) < 1.0) first.H = std::acos(first.c) * kDeg;
+  return first;
+}
+
+// One event from noon: each pass moves t by the hour angle still to go, until it settles.
+double IterateSunEvent(std::int32_t J, const SunPlace& place, int sign, double sinH0, const NoonPass& first,
+                       SunEventOutcome& why) {
+  why = SunEventOutcome::kNoConvergence;
+  double t = 12.0;
+  for (int pass = 0; pass < kMaxPasses; ++pass) {
+    double c = first.c, H = first.H;
+    SunSky sky = first.sky;
+    if (pass > 0) {
+      sky = SkyAt(J, t);
+      c = (sinH0 - place.sinPhi * sky.sinDeclination) / (place.cosPhi * sky.cosDeclination);
+    }
+    if (!(std::fabs(c) < 1.0)) {
+      // c >= 1: even the sun's highest point is below h0; c <= -1: its lowest is above.
+      if (c >= 1.0) why = SunEventOutcome::kSunStaysBelow;
+      else if (c <= -1.0) why = SunEventOutcome::kSunStaysAbove;
+      return kNoSunEvent;
+    }
+    if (pass > 0) H = std::acos(c) * kDeg;
+    const double correction = Mod360(sign * H + sky.gha + place.lambda);
+    const double next = t - correction / 15.0;
+    if (std::fabs(next - t) < 1e-7) {
+      why = SunEventOutcome::kOccurs;
+      return next;
+    }
+    t = next;
+  }
+  return kNoSunEvent;
+}
+
+SunPlace PlaceOf(double phi, double lambda) {
+  return SunPlace{std::sin(phi * kRad), std::cos(phi * kRad), lambda};
+}
+
 }  // namespace
 
 void SunPosition(std::int32_t J, double t, double& gha, double& declination) {
   const double T = (t * 0.041666666666666664 + J - 2451545.0) * 2.7378507871321012e-05;
-  const double L = std::fmod(280.46 + 36000.77 * T, 360.0);
-  const double G = std::fmod(357.528 + 35999.05 * T, 360.0);
+  const double L = Mod360(280.46 + 36000.77 * T);
+  const double G = Mod360(357.528 + 35999.05 * T);
   const double C = 1.915 * std::sin(G * kRad) + 0.02 * std::sin(2.0 * G * kRad);
-  const double lambda = std::fmod(L + C, 360.0);
-  const double epsilon = std::fmod(23.4393 - 0.013 * T, 360.0);
+  const double lambda = Mod360(L + C);
+  const double epsilon = Mod360(23.4393 - 0.013 * T);
   const double E = -C + 2.466 * std::sin(2.0 * lambda * kRad) - 0.053 * std::sin(4.0 * lambda * kRad);
-  gha = std::fmod(15.0 * t - 180.0 + E, 360.0);
+  gha = Mod360(15.0 * t - 180.0 + E);
   declination = std::asin(std::sin(epsilon * kRad) * std::sin(lambda * kRad)) * kDeg;
 }
 
 double ComputeSunEvent(std::int32_t J, double phi, double lambda, int sign, double h0,
                        SunEventOutcome* outcome) {
-  SunEventOutcome why = SunEventOutcome::kNoConvergence;
-  double result = kNoSunEvent;
+  const SunPlace place = PlaceOf(phi, lambda);
   const double sinH0 = std::sin(h0 * kRad);
-  const double sinPhi = std::sin(phi * kRad);
-  const double cosPhi = std::cos(phi * kRad);
-  double t = 12.0;
-  for (int pass = 0; pass < kMaxPasses; ++pass) {
-    double gha = 0.0, delta = 0.0;
-    SunPosition(J, t, gha, delta);
-    const double c = (sinH0 - sinPhi * std::sin(delta * kRad)) / (cosPhi * std::cos(delta * kRad));
-    if (!(std::fabs(c) < 1.0)) {
-      // c >= 1: even the sun's highest point is below h0; c <= -1: its lowest is above.
-      if (c >= 1.0) why = SunEventOutcome::kSunStaysBelow;
-      else if (c <= -1.0) why = SunEventOutcome::kSunStaysAbove;
-      break;
-    }
-    const double H = std::acos(c) * kDeg;
-    const double correction = std::fmod(sign * H + gha + lambda, 360.0);
-    const double next = t - correction / 15.0;
-    if (std::fabs(next - t) < 1e-7) {
-      why = SunEventOutcome::kOccurs;
-      result = next;
-      break;
-    }
-    t = next;
-  }
+  SunEventOutcome why = SunEventOutcome::kNoConvergence;
+  const double result = IterateSunEvent(J, place, sign, sinH0, FirstPass(SkyAt(J, 12.0), place, sinH0), why);
   if (outcome) *outcome = why;
   return result;
 }
@@ -65,12 +131,17 @@ HourMinute SplitHours(double x) {
 
 SunDay ComputeSunDay(const CalendarDate& date, double latitude, double longitude, int zone) {
   static constexpr int kSigns[4] = {+1, +1, -1, -1};
-  static constexpr double kAltitudes[4] = {kTwilightAltitude, kSunriseAltitude, kSunriseAltitude,
-                                           kTwilightAltitude};
+  static const double sinTwilight = std::sin(kTwilightAltitude * kRad);
+  static const double sinSunrise = std::sin(kSunriseAltitude * kRad);
   const std::int32_t J = JulianDayNumber(date);
+  const SunPlace place = PlaceOf(latitude, longitude);
+  const SunSky noon = SkyAt(J, 12.0);
+  const NoonPass twilight = FirstPass(noon, place, sinTwilight), sunrise = FirstPass(noon, place, sinSunrise);
   SunDay day;
   for (int i = 0; i < 4; ++i) {
-    double x = ComputeSunEvent(J, latitude, longitude, kSigns[i], kAltitudes[i], &day.outcomes[i]);
+    const bool isTwilight = i == kTwilightBegin || i == kTwilightEnd;
+    double x = IterateSunEvent(J, place, kSigns[i], isTwilight ? sinTwilight : sinSunrise,
+                               isTwilight ? twilight : sunrise, day.outcomes[i]);
     // The outcome, not the value, says whether the event happens: a real event at -1.0 UT
     // is still shifted.
     if (day.outcomes[i] == SunEventOutcome::kOccurs) x -= zone;
