@@ -120,3 +120,55 @@ TEST_CASE("bad station data is skipped or refused without reading past it") {
     CHECK_FALSE(FindStation(Key(40, 40), h));
   }
 }
+
+TEST_CASE("blocks read once are served again the same, and never after the folder is opened anew") {
+  Closer closer;
+  TempFolder tmp, other("engine-other");
+  const TestStation a{"Alpha", 10, 10, -1, {{0, 0, 500}, {29, 1200, 1000}, {36, 3599, 20}}};
+  const TestStation b{"Beta", 20, 20, 3, {{0, 0, 700}, {8, 900, 300}}};
+  WriteStationFolder(tmp.path(), {a, b});
+  WriteStationFolder(other.path(), {TestStation{"Other", 10, 10, 5, {{0, 0, 42}}}});
+  const TideEngine& engine = TheTideEngine();
+  const auto working = [&] {
+    std::vector<std::array<double, 3>> rows;
+    for (int i = 0; i < engine.workingCount; ++i) {
+      const StationConstituent& w = engine.working[static_cast<std::size_t>(i)];
+      rows.push_back({static_cast<double>(w.number), w.g, w.H});
+    }
+    return rows;
+  };
+
+  REQUIRE(OpenTideFiles(tmp.str().c_str()) == 0);
+  StationHeader h;
+  REQUIRE(FindStation(Key(10, 10), h));
+  const auto first = working();
+  REQUIRE(first.size() == 3);
+  CHECK(first[2][1] == doctest::Approx(359.9 * kPi / 180.0));
+  CHECK(first[1][2] == doctest::Approx(100.0));
+  // Another station in between, then the first again: the same header and records.
+  REQUIRE(FindStation(Key(20, 20), h));
+  CHECK((StationName(h) == "Beta" && h.zone == 3 && engine.workingCount == 2));
+  REQUIRE(FindStation(Key(10, 10), h));
+  CHECK((StationName(h) == "Alpha" && h.zone == -1));
+  CHECK(working() == first);
+  CHECK(engine.constituents[29].used == 1);
+  CHECK(engine.constituents[8].used == 0);
+
+  SUBCASE("the same folder rewritten and opened again") {
+    WriteStationFolder(tmp.path(), {TestStation{"Gamma", 10, 10, 2, {{0, 0, 9}}}, b});
+    REQUIRE(OpenTideFiles(tmp.str().c_str()) == 0);
+    REQUIRE(FindStation(Key(10, 10), h));
+    CHECK((StationName(h) == "Gamma" && h.zone == 2 && engine.workingCount == 1));
+    CHECK(engine.working[0].H == doctest::Approx(0.9));
+  }
+  SUBCASE("another folder with a station at the same place") {
+    REQUIRE(OpenTideFiles(other.str().c_str()) == 0);
+    REQUIRE(FindStation(Key(10, 10), h));
+    CHECK((StationName(h) == "Other" && h.zone == 5 && engine.workingCount == 1));
+    CHECK_FALSE(FindStation(Key(20, 20), h));
+  }
+  SUBCASE("closed, nothing is found") {
+    CloseTideFiles();
+    CHECK_FALSE(FindStation(Key(10, 10), h));
+  }
+}

@@ -1,7 +1,11 @@
 #include <doctest/doctest.h>
 
+#include <cmath>
+#include <cstdlib>
+#include <cstring>
 #include <string>
 
+#include "tides/engine/station_files.h"
 #include "tides/engine/sun_events.h"
 #include "tides/engine/TideEngine.h"
 
@@ -18,7 +22,102 @@ std::string Times(const std::array<HourMinute, 4>& events) {
   return text;
 }
 
+// The events by their definition, each on its own from noon with the library's fmod, as a
+// reference for the day's shared passes.
+namespace definition {
+constexpr double kRad = 0.017453292519943295;
+constexpr double kDeg = 57.29577951308232;
+
+void Sun(std::int32_t J, double t, double& gha, double& declination) {
+  const double T = (t * 0.041666666666666664 + J - 2451545.0) * 2.7378507871321012e-05;
+  const double L = std::fmod(280.46 + 36000.77 * T, 360.0);
+  const double G = std::fmod(357.528 + 35999.05 * T, 360.0);
+  const double C = 1.915 * std::sin(G * kRad) + 0.02 * std::sin(2.0 * G * kRad);
+  const double lambda = std::fmod(L + C, 360.0);
+  const double epsilon = std::fmod(23.4393 - 0.013 * T, 360.0);
+  const double E = -C + 2.466 * std::sin(2.0 * lambda * kRad) - 0.053 * std::sin(4.0 * lambda * kRad);
+  gha = std::fmod(15.0 * t - 180.0 + E, 360.0);
+  declination = std::asin(std::sin(epsilon * kRad) * std::sin(lambda * kRad)) * kDeg;
+}
+
+double Event(std::int32_t J, double phi, double lambda, int sign, double h0, SunEventOutcome& why) {
+  why = SunEventOutcome::kNoConvergence;
+  double t = 12.0;
+  for (int pass = 0; pass < 26; ++pass) {
+    double gha = 0.0, delta = 0.0;
+    Sun(J, t, gha, delta);
+    const double c = (std::sin(h0 * kRad) - std::sin(phi * kRad) * std::sin(delta * kRad)) /
+                     (std::cos(phi * kRad) * std::cos(delta * kRad));
+    if (!(std::fabs(c) < 1.0)) {
+      if (c >= 1.0) why = SunEventOutcome::kSunStaysBelow;
+      else if (c <= -1.0) why = SunEventOutcome::kSunStaysAbove;
+      return kNoSunEvent;
+    }
+    const double next = t - std::fmod(sign * std::acos(c) * kDeg + gha + lambda, 360.0) / 15.0;
+    if (std::fabs(next - t) < 1e-7) {
+      why = SunEventOutcome::kOccurs;
+      return next;
+    }
+    t = next;
+  }
+  return kNoSunEvent;
+}
+}  // namespace definition
+
+// Compares a day's four events with the definition bit for bit; counts the mismatches.
+int Mismatches(const CalendarDate& date, double latitude, double longitude, int zone) {
+  const SunDay day = ComputeSunDay(date, latitude, longitude, zone);
+  const int signs[4] = {+1, +1, -1, -1};
+  const double altitudes[4] = {kTwilightAltitude, kSunriseAltitude, kSunriseAltitude, kTwilightAltitude};
+  int wrong = 0;
+  const auto same = [](double a, double b) { return std::memcmp(&a, &b, sizeof a) == 0; };
+  for (int i = 0; i < 4; ++i) {
+    const std::int32_t J = JulianDayNumber(date);
+    SunEventOutcome why, alone;
+    const double ut = definition::Event(J, latitude, longitude, signs[i], altitudes[i], why);
+    const double zoneTime = why == SunEventOutcome::kOccurs ? ut - zone : ut;
+    if (why != day.outcomes[i] || !same(zoneTime, day.zoneHours[i])) ++wrong;
+    if (!same(ut, ComputeSunEvent(J, latitude, longitude, signs[i], altitudes[i], &alone)) || alone != why) ++wrong;
+  }
+  return wrong;
+}
+
 }  // namespace
+
+TEST_CASE("the day's events are those of the definition, bit for bit") {
+  SUBCASE("the world set's stations over dates from 1900 to 2100") {
+    const char* root = std::getenv("BR_SOURCE_DIR");
+    REQUIRE_MESSAGE(root != nullptr, "BR_SOURCE_DIR names the source tree");
+    std::string folder = std::string(root) + "/data/world";
+#ifdef _WIN32
+    if (folder.front() == '/') folder = "Z:" + folder;
+    for (char& c : folder) c = c == '/' ? '\\' : c;
+#endif
+    REQUIRE(OpenTideFiles(folder.c_str()) == 0);
+    const CalendarDate dates[] = {{1900, 1, 1}, {1987, 3, 20}, {2000, 6, 21}, {2026, 12, 21}, {2100, 9, 23}};
+    int stations = 0, wrong = 0;
+    for (std::int32_t i = 0; i < StationCount(); i += 7) {
+      StationIndexRecord key;
+      StationHeader h;
+      if (!ReadStationIndexRecord(i, key) || !FindStation(key, h)) continue;
+      ++stations;
+      for (const CalendarDate& d : dates) wrong += Mismatches(d, h.latitude / 60.0, h.longitude / 60.0, h.zone);
+    }
+    CloseTideFiles();
+    CHECK(stations > 500);
+    CHECK(wrong == 0);
+  }
+  SUBCASE("poles, the date line and far years") {
+    int wrong = 0;
+    for (int year : {1700, 1999, 2000, 2400})
+      for (int month = 1; month <= 12; month += 2)
+        for (double latitude : {-89.9, -66.5, -12.25, 0.0, 48.5, 66.6, 78.2, 90.0})
+          for (double longitude : {-180.0, -97.75, 0.0, 13.4, 179.9})
+            wrong += Mismatches({static_cast<std::int16_t>(year), static_cast<std::uint8_t>(month), 11}, latitude,
+                                longitude, static_cast<int>(-longitude / 15.0));
+    CHECK(wrong == 0);
+  }
+}
 
 TEST_CASE("the equator at the March equinox") {
   const SunDay d = ComputeSunDay({2000, 3, 20}, 0, 0, 0);
