@@ -1,5 +1,6 @@
 #include "tides/engine/sun_events.h"
 
+#include <climits>
 #include <cmath>
 
 namespace br::tides {
@@ -36,6 +37,18 @@ SunSky SkyAt(std::int32_t J, double t) {
   SunPosition(J, t, sky.gha, delta);
   sky.sinDeclination = std::sin(delta * kRad);
   sky.cosDeclination = std::cos(delta * kRad);
+  return sky;
+}
+
+// The sun at noon UT of day J, where every event's iteration starts: the same for every
+// station of a day, so the last day's is kept (the engine runs on one thread at a time).
+const SunSky& NoonSky(std::int32_t J) {
+  static std::int32_t day = INT32_MIN;
+  static SunSky sky;
+  if (J != day) {
+    sky = SkyAt(J, 12.0);
+    day = J;
+  }
   return sky;
 }
 
@@ -135,7 +148,7 @@ SunDay ComputeSunDay(const CalendarDate& date, double latitude, double longitude
   static const double sinSunrise = std::sin(kSunriseAltitude * kRad);
   const std::int32_t J = JulianDayNumber(date);
   const SunPlace place = PlaceOf(latitude, longitude);
-  const SunSky noon = SkyAt(J, 12.0);
+  const SunSky& noon = NoonSky(J);
   const NoonPass twilight = FirstPass(noon, place, sinTwilight), sunrise = FirstPass(noon, place, sinSunrise);
   SunDay day;
   for (int i = 0; i < 4; ++i) {
