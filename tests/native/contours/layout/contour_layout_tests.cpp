@@ -80,7 +80,6 @@ TEST_CASE("depth labels of any size") {
   CHECK(huge.size() == 303);
   CHECK(huge.substr(0, 2) == "10");
   CHECK(huge.substr(huge.size() - 2) == ".0");
-  CHECK(DepthLabel(-std::numeric_limits<double>::max()).size() == 312);
   CHECK(DepthLabel(std::numeric_limits<double>::quiet_NaN()).find("nan") != std::string::npos);
 }
 

@@ -235,7 +235,6 @@ TEST_CASE("header arrays: only one-dimensional arrays of bytes are read, as far 
 }
 
 TEST_CASE("parameter arrays: direct, by reference, inside a VARIANT by reference; elements of sizeof(VARIANT)") {
-  CHECK(sizeof(VARIANT) == (sizeof(void*) == 8 ? 24u : 16u));
   SAFEARRAY* array = Variants(40);
   ParameterList list;
 
