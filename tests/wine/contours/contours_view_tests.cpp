@@ -334,23 +334,20 @@ TEST_CASE("grey in every invalid state") {
     CHECK(v.view->SetContoursData(&good, nullptr, 10.0) == S_FALSE);
     CHECK(v.AllGrey(120, 100));
   }
-  SUBCASE("a shallow contour of VT_R8") {
-    FakePresParams wrong(false, 2.0f, 30.0f);
-    wrong.values[0].vt = VT_R8;
-    wrong.values[0].dblVal = 2.0;
-    CHECK(v.Give(wrong, 10.0) == S_OK);
-    CHECK(v.AllGrey(120, 100));
-    CHECK(wrong.references == 1);
-  }
-  SUBCASE("a missing parameter, a deep contour of the wrong type") {
-    FakePresParams missing(false, 2.0f, 30.0f);
-    missing.values.erase(2);
-    CHECK(v.Give(missing, 10.0) == S_OK);
-    CHECK(v.AllGrey(120, 100));
-    FakePresParams wrong(false, 2.0f, 30.0f);
-    wrong.values[2].vt = VT_I4;
-    CHECK(v.Give(wrong, 10.0) == S_OK);
-    CHECK(v.AllGrey(120, 100));
+  SUBCASE("a shallow contour of VT_R8, a deep one of VT_I4, a missing deep one") {
+    const struct {
+      long index;
+      VARTYPE type;  // VT_EMPTY: no such parameter
+    } rows[] = {{0, VT_R8}, {2, VT_I4}, {2, VT_EMPTY}};
+    for (const auto& row : rows) {
+      CAPTURE(row.index);
+      FakePresParams wrong(false, 2.0f, 30.0f);
+      if (row.type == VT_EMPTY) wrong.values.erase(row.index);
+      else wrong.values[row.index].vt = row.type;
+      if (row.type == VT_R8) wrong.values[row.index].dblVal = 2.0;  // the right depth, the wrong type
+      CHECK(v.Give(wrong, 10.0) == S_OK);
+      CHECK(v.AllGrey(120, 100));
+    }
   }
   SUBCASE("components without their interfaces") {
     FakePresParams mute(false, 2.0f, 30.0f);
