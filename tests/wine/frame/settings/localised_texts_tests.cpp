@@ -9,7 +9,6 @@
 #include <string>
 
 #include "GeoData.h"
-#include "frame/settings/cLocaliser.h"
 #include "frame/settings/localised_texts.h"
 #include "tests/wine/common/SceneProbe.h"
 #include "tests/wine/common/registry_test_support.h"
@@ -68,15 +67,6 @@ TEST_CASE("without a component every text is its default, and the attempt is not
   CHECK(GetText("ObjInspector", 1, "Attributes") == "Attributes");
   CHECK(Probe().Counter("calls.ITextTable.LoadTable") > 0);
   DestroyLocaliser();
-
-  // An unregistered class, made directly.
-  GUID nowhere;
-  REQUIRE(CoCreateGuid(&nowhere) == S_OK);
-  cLocaliser unregistered(nowhere);
-  CHECK_FALSE(unregistered.HasComponent());
-  std::string text = "kept";
-  CHECK_FALSE(unregistered.Lookup("ObjInspector", 1, text));
-  CHECK(text == "kept");
 }
 
 TEST_CASE("texts: the table's language, exactly S_OK, an empty text replacing the default") {
