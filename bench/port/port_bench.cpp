@@ -4,6 +4,7 @@
 // Processor time of the thread, best of alternating rounds.
 //   port_bench FOLDER [STATIONS (default every station)] [ROUNDS (default 5)]
 #include "BR_Info.h"
+#include "bench/common/tides_database_opener.h"
 
 #include <windows.h>
 
@@ -63,19 +64,12 @@ struct Mode {
 };
 
 int Run(const wchar_t* folder, int wanted, int rounds) {
-  CLSID clsid{};
-  ITidesDatabase* database = nullptr;
-  if (FAILED(CLSIDFromProgID(L"BR_Info.TidesDatabase", &clsid)) ||
-      FAILED(CoCreateInstance(clsid, nullptr, CLSCTX_INPROC_SERVER, IID_ITidesDatabase,
-                              reinterpret_cast<void**>(&database)))) {
-    return Fail("BR_Info.TidesDatabase cannot be made (is BR_Info.dll registered?)");
-  }
-  BSTR name = SysAllocString(folder);
-  const HRESULT opened = database->Initialize(name);
-  SysFreeString(name);
+  const char* failure = "";
+  ITidesDatabase* database = br::bench::OpenTidesDatabase(folder, failure);
+  if (!database) return Fail(failure);
   long stations = 0;
-  if (FAILED(opened) || FAILED(database->get_NumPorts(&stations)) || stations < 1) {
-    return Fail("the folder cannot be opened");
+  if (FAILED(database->get_NumPorts(&stations)) || stations < 1) {
+    return Fail("the folder holds no station");
   }
 
   // The ports, spread over the folder, and the same stations for the engine.

@@ -2,6 +2,7 @@
 // world box: filling, name order and the first selection), then a jump to the last row
 // by Ctrl+End and Down, as a user would. Usage: portlist_bench FOLDER
 #include "BR_Info.h"
+#include "bench/common/tides_database_opener.h"
 
 #include <windows.h>
 
@@ -36,17 +37,9 @@ int Run(const wchar_t* folder) {
       atl ? reinterpret_cast<GetControlFn>(reinterpret_cast<void*>(GetProcAddress(atl, "AtlAxGetControl"))) : nullptr;
   if (!init || !getControl || !init()) return Fail("atl.dll is not available");
 
-  CLSID clsid{};
-  ITidesDatabase* database = nullptr;
-  if (FAILED(CLSIDFromProgID(L"BR_Info.TidesDatabase", &clsid)) ||
-      FAILED(CoCreateInstance(clsid, nullptr, CLSCTX_INPROC_SERVER, IID_ITidesDatabase,
-                              reinterpret_cast<void**>(&database)))) {
-    return Fail("BR_Info.TidesDatabase cannot be made (is BR_Info.dll registered?)");
-  }
-  BSTR name = SysAllocString(folder);
-  const HRESULT opened = database->Initialize(name);
-  SysFreeString(name);
-  if (FAILED(opened)) return Fail("the folder cannot be opened");
+  const char* failure = "";
+  ITidesDatabase* database = br::bench::OpenTidesDatabase(folder, failure);
+  if (!database) return Fail(failure);
   VARIANT ports;
   VariantInit(&ports);
   const Clock::time_point query = Clock::now();

@@ -1,5 +1,7 @@
 #include "host/chartscene/model/cp1252_text.h"
 
+#include "host/chartscene/model/utf8_sequence.h"
+
 #include <cstdint>
 #include <vector>
 
@@ -16,35 +18,11 @@ const std::uint16_t kHighControls[32] = {
 // Code points of valid UTF-8; false for anything else.
 bool DecodeUtf8(const std::string& text, std::vector<std::uint32_t>& codes) {
   for (std::size_t i = 0; i < text.size();) {
-    const unsigned char lead = static_cast<unsigned char>(text[i]);
-    int length = 1;
-    std::uint32_t code = lead;
-    if (lead >= 0x80) {
-      if (lead >= 0xC2 && lead <= 0xDF) {
-        length = 2;
-        code = lead & 0x1F;
-      } else if (lead >= 0xE0 && lead <= 0xEF) {
-        length = 3;
-        code = lead & 0x0F;
-      } else if (lead >= 0xF0 && lead <= 0xF4) {
-        length = 4;
-        code = lead & 0x07;
-      } else {
-        return false;
-      }
-      if (text.size() - i < static_cast<std::size_t>(length)) return false;
-      for (int k = 1; k < length; ++k) {
-        const unsigned char next = static_cast<unsigned char>(text[i + k]);
-        if ((next & 0xC0) != 0x80) return false;
-        code = (code << 6) | (next & 0x3F);
-      }
-      if ((length == 3 && code < 0x800) || (length == 4 && code < 0x10000) || code > 0x10FFFF ||
-          (code >= 0xD800 && code <= 0xDFFF)) {
-        return false;
-      }
-    }
+    std::uint32_t code = 0;
+    const std::size_t length = Utf8SequenceAt(text.data() + i, text.size() - i, code);
+    if (length == 0) return false;
     codes.push_back(code);
-    i += static_cast<std::size_t>(length);
+    i += length;
   }
   return true;
 }

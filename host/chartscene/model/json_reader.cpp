@@ -1,5 +1,7 @@
 #include "host/chartscene/model/json_reader.h"
 
+#include "host/chartscene/model/utf8_sequence.h"
+
 #include <cerrno>
 #include <cstdlib>
 
@@ -187,30 +189,10 @@ private:
 
   // One UTF-8 sequence copied whole, or an error at its first byte.
   bool CopyUtf8(std::string& out) {
-    const unsigned char lead = static_cast<unsigned char>(Peek());
-    int length = 0;
-    unsigned long code = 0;
-    if (lead >= 0xC2 && lead <= 0xDF) {
-      length = 2;
-      code = lead & 0x1F;
-    } else if (lead >= 0xE0 && lead <= 0xEF) {
-      length = 3;
-      code = lead & 0x0F;
-    } else if (lead >= 0xF0 && lead <= 0xF4) {
-      length = 4;
-      code = lead & 0x07;
-    } else {
-      return Fail("invalid UTF-8");
-    }
-    if (text_.size() - position_ < static_cast<std::size_t>(length)) return Fail("invalid UTF-8");
-    for (int i = 1; i < length; ++i) {
-      const unsigned char next = static_cast<unsigned char>(text_[position_ + i]);
-      if ((next & 0xC0) != 0x80) return Fail("invalid UTF-8");
-      code = (code << 6) | (next & 0x3F);
-    }
-    const bool overlong = (length == 3 && code < 0x800) || (length == 4 && code < 0x10000);
-    if (overlong || code > 0x10FFFF || (code >= 0xD800 && code <= 0xDFFF)) return Fail("invalid UTF-8");
-    for (int i = 0; i < length; ++i) {
+    std::uint32_t code = 0;
+    const std::size_t length = Utf8SequenceAt(text_.data() + position_, text_.size() - position_, code);
+    if (length == 0) return Fail("invalid UTF-8");
+    for (std::size_t i = 0; i < length; ++i) {
       out += text_[position_];
       Advance();
     }
