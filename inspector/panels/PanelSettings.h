@@ -1,0 +1,41 @@
+#pragma once
+// The settings block the inspector's detail panels share: the host's object formatter,
+// the two formatter flag words ORed into every call, the switch that turns the
+// unprintable-attribute test off, and the language handed to the formatter. The control
+// makes one and lends it to each panel; a panel never outlives it.
+
+#include <windows.h>
+
+#include <wrl/client.h>
+
+#include "GeoData.h"
+
+namespace br::inspector {
+
+class PanelSettings {
+public:
+  // Without a formatter; Create or SetFormatter gives one. The block uses localised
+  // texts while it lives (it is a text client).
+  PanelSettings();
+  ~PanelSettings();
+  PanelSettings(const PanelSettings&) = delete;
+  PanelSettings& operator=(const PanelSettings&) = delete;
+
+  // Creates the formatter (CLSID_ObjectFormatter) and gives it the current language
+  // (option 61) and the text for a missing value (option 64, text 55). A formatter that
+  // cannot be made leaves the block without one; panels then add no attribute rows.
+  HRESULT Create();
+  // Uses a formatter the caller made (null: none).
+  void SetFormatter(IObjectFormatter* formatter) { formatter_ = formatter; }
+
+  IObjectFormatter* Formatter() const { return formatter_.Get(); }
+  long language = 0;
+  long objectFlags = 0;     // ORed into FormatObject's flags
+  long attributeFlags = 0;  // ORed into FormatAttribute's flags
+  bool skipUnprintableTest = false;
+
+private:
+  Microsoft::WRL::ComPtr<IObjectFormatter> formatter_;
+};
+
+}  // namespace br::inspector

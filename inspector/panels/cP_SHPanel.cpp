@@ -1,0 +1,287 @@
+#include "inspector/panels/cP_SHPanel.h"
+
+#include <algorithm>
+#include <utility>
+#include <vector>
+
+#include <wrl/client.h>
+
+#include "frame/errors/cErrReporter.h"
+#include "frame/geo/geo_enumeration.h"
+#include "inspector/format/attribute_text.h"
+#include "inspector/panels/PanelSettings.h"
+#include "inspector/panels/geo_object_rules.h"
+#include "toolkit/base/class_records.h"
+#include "toolkit/layout/BorderLayout.h"
+#include "toolkit/table/logic/cell_kinds.h"
+
+using Microsoft::WRL::ComPtr;
+
+namespace br::inspector {
+
+namespace {
+
+constexpr long kAttributeFlags = 4;
+constexpr long kPropertyInformed = 500;
+
+// Related objects never shown among an object's rows: services have tabs of their own,
+// lights a panel of their own, collections are shown as the objects they gather.
+bool IsLeftOutRelation(long classCode) {
+  return classCode == kClassInternalService || classCode == kClassExternalService || classCode == kClassLight ||
+         classCode == kClassAggregation || classCode == kClassAssociation;
+}
+
+void LogFailure(const char* function, HRESULT result) {
+  cErrReporter reporter;
+  ErrRecord record(ErrPlace{__FILE__, function, __LINE__});
+  reporter.ReportResult("cP_SHPanel", record, static_cast<std::int32_t>(result));
+}
+
+struct Related {
+  std::string label;
+  ComPtr<IGeoObject> object;
+};
+
+}  // namespace
+
+cP_SHPanel::cP_SHPanel(const PanelSettings& settings)
+    : Panel(std::make_unique<toolkit::BorderLayout>()), settings_(settings) {
+  SetUp(false);
+}
+
+cP_SHPanel::cP_SHPanel(const PanelSettings& settings, TwoColumns)
+    : Panel(std::make_unique<toolkit::BorderLayout>()), settings_(settings) {
+  SetUp(true);
+}
+
+cP_SHPanel::~cP_SHPanel() = default;
+
+const toolkit::ClassRecord* cP_SHPanel::getClassRecord() const { return &toolkit::records::cP_SHPanel; }
+
+void cP_SHPanel::SetUp(bool twoColumns) {
+  using namespace toolkit::table;
+  table_.addColumn("type", "Type", kCellLong, 0, nullptr, false);
+  if (twoColumns) table_.addColumn("name", "Name", kCellText, 0, nullptr, false);
+  textColumn_ = table_.addColumn("text", "Text", kCellText, 0, nullptr, false);
+  table_.setColumnVisible(kTypeColumn, false);
+  table_.setTableStyle((table_.getTableStyle() | toolkit::Table::kStyleWholeRow | toolkit::Table::kStyleFillLast |
+                        toolkit::Table::kStyleNoEditOnSelect | toolkit::Table::kStyleOwnerDraw) &
+                       ~(toolkit::Table::kStyleHorizontalGrid | toolkit::Table::kStyleVerticalGrid));
+  insertNamed("Center", &table_, "rows");
+}
+
+int cP_SHPanel::AppendRow(int type, int column, const std::string& text) {
+  const int row = table_.appendRowLong(kTypeColumn, type, 0);
+  if (row >= 0 && column >= 0) table_.setCellText(column, row, text.c_str());
+  return row;
+}
+
+void cP_SHPanel::AddRow(const std::string& name, const std::string& value) {
+  if (name.empty() || value.empty()) return;
+  AppendRow(kRowName, textColumn_, name);
+  AppendRow(kRowValue, textColumn_, value);
+}
+
+void cP_SHPanel::AddHeading(const std::string& label) { AppendRow(kRowHeading, textColumn_, label); }
+
+void cP_SHPanel::Clear() { table_.removeAllRows(); }
+
+HRESULT cP_SHPanel::FillObject(IGeoObject* object, bool heading, bool related) {
+  if (object == nullptr) return E_INVALIDARG;
+  long classCode = 0;
+  if (FAILED(object->GetClassCode(&classCode))) return E_FAIL;
+  if (IsHiddenClass(object, classCode)) return S_FALSE;
+
+  // 1. The related objects worth a heading of their own, by label.
+  std::vector<Related> kept;
+  if (related) {
+    ComPtr<IGeoObjectEnum> relations;
+    if (FAILED(object->GetMembers(&relations)) || !relations) {
+      relations.Reset();
+      object->GetRelated(&relations);
+    }
+    if (relations) {
+      geo::ForEachItem(relations.Get(), [&](IUnknown* item) {
+        ComPtr<IGeoObject> other;
+        long otherClass = 0;
+        if (FAILED(item->QueryInterface(IID_IGeoObject, reinterpret_cast<void**>(other.GetAddressOf()))) ||
+            FAILED(other->GetClassCode(&otherClass)) || IsLeftOutRelation(otherClass) ||
+            IsHiddenClass(other.Get(), otherClass)) {
+          return true;
+        }
+        kept.push_back({ObjectLabel(settings_, other.Get(), otherClass), other});
+        return true;
+      });
+    }
+    std::stable_sort(kept.begin(), kept.end(), [](const Related& a, const Related& b) { return a.label < b.label; });
+  }
+
+  // 2. The object itself; with a heading only when there is something under it.
+  if (heading) {
+    bool hasAttributes = false;
+    ComPtr<IGeoObjectEnum> attributes;
+    if (SUCCEEDED(object->GetAttributes(&attributes)) && attributes) {
+      hasAttributes = geo::ForEachItem(attributes.Get(), [](IUnknown*) { return false; }) > 0;
+    }
+    if (kept.empty() && !hasAttributes) {
+      doLayout();
+      return S_OK;
+    }
+    if (related) AddHeading(ObjectLabel(settings_, object, classCode));
+  }
+  AddObjectAttributes(object);
+
+  // 3. Each related object under its heading.
+  for (const Related& other : kept) {
+    AddHeading(other.label);
+    AddObjectAttributes(other.object.Get());
+  }
+  doLayout();
+  return S_OK;
+}
+
+void cP_SHPanel::AddObjectAttributes(IGeoObject* object) {
+  bool chart = false;
+  bool informed = false;
+  ComPtr<IGeoDataSet> dataSet;
+  GUID kind{};
+  if (SUCCEEDED(object->GetDataSet(&dataSet)) && dataSet && SUCCEEDED(dataSet->GetKindId(&kind)) &&
+      IsChartKind(kind)) {
+    chart = true;
+    informed = LongProperty(object, kPropertyInformed) == kProperty500Informed;
+  }
+
+  ComPtr<IGeoObjectEnum> attributes;
+  if (FAILED(object->GetAttributes(&attributes)) || !attributes) return;
+  std::vector<long> codes;
+  geo::ForEachItem(attributes.Get(), [&](IUnknown* item) {
+    ComPtr<IGeoAttribute> attribute;
+    long code = 0;
+    if (FAILED(item->QueryInterface(IID_IGeoAttribute, reinterpret_cast<void**>(attribute.GetAddressOf()))) ||
+        IsUnprintable(attribute.Get()) || FAILED(attribute->GetCode(&code))) {
+      return true;
+    }
+    if (chart) {
+      codes.push_back(code);
+    } else {
+      AddAttributeToContent(attribute.Get());
+    }
+    return true;
+  });
+  if (!chart) return;
+  for (long code : OrderChartAttributeCodes(codes, informed)) {
+    ComPtr<IGeoAttribute> attribute;
+    if (object->GetAttribute(code, &attribute) == S_OK && attribute) AddAttributeToContent(attribute.Get());
+  }
+}
+
+bool cP_SHPanel::IsUnprintable(IGeoAttribute* attribute) const {
+  if (attribute == nullptr || settings_.skipUnprintableTest) return false;
+  ComPtr<IUnknown> owner;
+  HRESULT hr = attribute->GetOwner(&owner);
+  if (FAILED(hr) || !owner) {
+    LogFailure("IsUNPRINTABLE", FAILED(hr) ? hr : E_POINTER);
+    return false;
+  }
+  ComPtr<IGeoDataSet> dataSet;
+  ComPtr<IGeoObject> object;
+  if (SUCCEEDED(owner.As(&object))) {
+    hr = object->GetDataSet(&dataSet);
+  } else {
+    hr = owner.As(&dataSet);
+  }
+  if (FAILED(hr) || !dataSet) {
+    LogFailure("IsUNPRINTABLE", FAILED(hr) ? hr : E_POINTER);
+    return false;
+  }
+  ComPtr<IGeoCatalog> catalogue = CatalogueOf(dataSet.Get());
+  long code = 0;
+  long flags = 0;
+  if (!catalogue) {
+    LogFailure("IsUNPRINTABLE", E_NOINTERFACE);
+    return false;
+  }
+  if (FAILED(hr = attribute->GetCode(&code)) || FAILED(hr = catalogue->GetAttributeFlags(code, &flags))) {
+    LogFailure("IsUNPRINTABLE", hr);
+    return false;
+  }
+  return (flags & kCatalogueHiddenBit) != 0;
+}
+
+HRESULT cP_SHPanel::AddAttributeToContent(IGeoAttribute* attribute) {
+  if (attribute == nullptr) return E_INVALIDARG;
+  if (IsUnprintable(attribute)) return S_FALSE;
+  long code = 0;
+  HRESULT hr = attribute->GetCode(&code);
+  if (FAILED(hr)) {
+    LogFailure("_AddAttributeToContent", hr);
+    return hr;
+  }
+  const std::optional<GUID> kind = OwnerKindOf(attribute);
+  const bool chart = kind && IsChartKind(*kind);
+
+  // Magnetic variation is written here, whatever the formatter makes of it.
+  std::optional<std::string> variation;
+  if (chart && code == kCodeMagneticVariation) {
+    VARIANT value;
+    VariantInit(&value);
+    if (SUCCEEDED(attribute->GetValue(&value)) && value.vt == VT_R8) variation = MagneticVariationText(value.dblVal);
+    VariantClear(&value);
+  }
+
+  IObjectFormatter* formatter = settings_.Formatter();
+  if (formatter == nullptr) return E_NOINTERFACE;
+  BSTR text = nullptr;
+  hr = formatter->FormatAttribute(0, kAttributeFlags | settings_.attributeFlags, attribute, 0, 0, &text);
+  const std::string formatted = SUCCEEDED(hr) ? AnsiText(text) : std::string();
+  SysFreeString(text);
+  if (FAILED(hr)) {
+    LogFailure("_AddAttributeToContent", hr);
+    return hr;
+  }
+  std::optional<AttributeText> pair = SplitAttributeText(formatted);
+  if (!pair) return S_FALSE;
+
+  if (variation) {
+    pair->value = *variation;
+  } else {
+    if (chart && code == kCodeTidalStream) pair->value = TidalStreamValue(pair->value);
+    pair->value = CleanAttributeValue(pair->value);
+  }
+  if (IsHiddenInformation(code, pair->value)) return S_FALSE;
+  if (pair->name.empty() || pair->value.empty()) return S_FALSE;
+  AddRow(pair->name, pair->value);
+  return S_OK;
+}
+
+int cP_SHPanel::dispatchEvent(toolkit::ToolkitEvent& event) {
+  if (event.source == &table_ && event.id == toolkit::Table::kEventDrawCell) {
+    const HDC dc = reinterpret_cast<HDC>(event.params[0]);
+    const RECT* rect = reinterpret_cast<const RECT*>(event.params[1]);
+    const int column = static_cast<int>(event.params[3]);
+    const int row = static_cast<int>(event.params[4]);
+    if (dc != nullptr && rect != nullptr && DrawCell(dc, *rect, column, row)) return 1;
+  }
+  return Panel::dispatchEvent(event);
+}
+
+bool cP_SHPanel::DrawCell(HDC dc, const RECT& rect, int column, int row) {
+  if (row < 0) return false;
+  const int type = RowType(row);
+  // Indents: 15 pixels for a heading, 30 for a name, 60 for a value.
+  const int indent = type == kRowHeading ? 15 : type == kRowName ? 30 : type == kRowValue ? 60 : -1;
+  if (indent < 0) return false;
+  FillRect(dc, &rect, GetSysColorBrush(COLOR_WINDOW));
+  RECT text = rect;
+  text.left += indent;
+  // Rows are one line high: line breaks show as blanks here (clients read them as they are).
+  std::string cell = table_.getCellText(row, column);
+  std::replace(cell.begin(), cell.end(), '\r', ' ');
+  SetBkMode(dc, TRANSPARENT);
+  SetTextColor(dc, GetSysColor(type == kRowHeading ? COLOR_HIGHLIGHT : COLOR_WINDOWTEXT));
+  DrawTextA(dc, cell.c_str(), static_cast<int>(cell.size()), &text,
+            DT_LEFT | DT_VCENTER | DT_SINGLELINE | DT_END_ELLIPSIS | DT_NOPREFIX);
+  return true;
+}
+
+}  // namespace br::inspector

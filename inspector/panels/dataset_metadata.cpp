@@ -1,0 +1,184 @@
+#include "inspector/panels/dataset_metadata.h"
+
+#include <cstdint>
+#include <limits>
+
+#include <wrl/client.h>
+
+#include "frame/format/date_time_format.h"
+#include "frame/geo/GeodesyLibrary.h"
+#include "frame/geo/ParameterList.h"
+#include "frame/geo/catalogue_texts.h"
+#include "frame/geo/header_reader.h"
+#include "frame/settings/localised_texts.h"
+#include "inspector/panels/geo_object_rules.h"
+
+using Microsoft::WRL::ComPtr;
+
+namespace br::inspector {
+
+namespace {
+
+constexpr long kPropertyEmbeddedUpdate = 2;
+
+struct Target {
+  ComPtr<IGeoDataSet> dataSet;
+  bool library = false;
+};
+
+bool IsDataSetIdentity(REFGUID id) {
+  const auto* bytes = reinterpret_cast<const unsigned char*>(&id);
+  for (int i = 0; i < 8; ++i) {
+    if (bytes[i] != 0) return false;
+  }
+  return true;
+}
+
+// The dataset the owner and identity stand for.
+HRESULT FindDataSet(IUnknown* owner, REFGUID id, Target& target) {
+  ComPtr<IUnknown> unknown(owner);
+  ComPtr<IGeoRasterDataSet> raster;
+  if (SUCCEEDED(unknown.As(&raster))) return E_NOTIMPL;
+  ComPtr<IGeoLibraryDataSet> library;
+  if (SUCCEEDED(unknown.As(&library))) {
+    target.library = true;
+    if (FAILED(library->GetDataSet(&target.dataSet)) || !target.dataSet) return E_FAIL;
+    return S_OK;
+  }
+  if (SUCCEEDED(unknown.As(&target.dataSet)) && target.dataSet) return S_OK;
+  ComPtr<IGeoDatabase> database;
+  if (FAILED(unknown.As(&database))) return E_FAIL;
+  if (!IsDataSetIdentity(id)) {
+    ComPtr<IGeoObject> object;
+    if (database->GetGeoObject(id, &object) == S_OK && object && SUCCEEDED(object->GetDataSet(&target.dataSet)) &&
+        target.dataSet) {
+      return S_OK;
+    }
+    target.dataSet.Reset();
+  }
+  if (FAILED(database->GetDataSetById(id, &target.dataSet)) || !target.dataSet) return E_FAIL;
+  return S_OK;
+}
+
+std::vector<ParameterValue> ValuesOf(const geo::ParameterList& list) {
+  std::vector<ParameterValue> values(list.Size());
+  for (std::size_t i = 0; i < list.Size(); ++i) {
+    const VARIANT& v = *list.At(i);
+    ParameterValue& value = values[i];
+    value.kind = ParameterValue::kInteger;
+    switch (v.vt) {
+      case VT_BSTR:
+        value.kind = ParameterValue::kText;
+        value.text = AnsiText(v.bstrVal);
+        break;
+      case VT_DATE:
+        value.kind = ParameterValue::kDate;
+        value.date = v.date;
+        break;
+      case VT_I1: value.integer = v.cVal; break;
+      case VT_I2: value.integer = v.iVal; break;
+      case VT_I4: value.integer = v.lVal; break;
+      case VT_INT: value.integer = v.intVal; break;
+      case VT_I8: value.integer = v.llVal; break;
+      case VT_UI1: value.integer = v.bVal; break;
+      case VT_UI2: value.integer = v.uiVal; break;
+      case VT_UI4: value.integer = v.ulVal; break;
+      case VT_UINT: value.integer = v.uintVal; break;
+      case VT_UI8:
+        if (v.ullVal > static_cast<ULONGLONG>(std::numeric_limits<std::int64_t>::max())) {
+          value.kind = ParameterValue::kNone;
+        } else {
+          value.integer = static_cast<std::int64_t>(v.ullVal);
+        }
+        break;
+      default:
+        value.kind = ParameterValue::kNone;  // other types give no row
+        break;
+    }
+  }
+  return values;
+}
+
+MetadataSources SourcesFor(IGeoDataSet* dataSet) {
+  MetadataSources sources;
+  sources.text = [](long id, const char* defaultText) { return GetText("ObjInspector", id, defaultText); };
+  sources.date = [](double date) { return FormatDate(date, DATE_PATTERN); };
+  sources.agency = AgencyName;
+  ComPtr<IGeoCatalog> catalogue = CatalogueOf(dataSet);
+  sources.catalogue = [catalogue](const char* acronym, long value) -> std::optional<std::string> {
+    if (!catalogue) return std::nullopt;
+    const std::optional<long> code = geo::FindAttributeCode(catalogue.Get(), acronym);
+    std::string text;
+    if (!code || !geo::ReadEnumText(catalogue.Get(), *code, static_cast<ULONG>(value), text)) return std::nullopt;
+    return text;
+  };
+  sources.degrees = [](long normalised) { return geo::GeodesyLibrary::Shared().Degrees(normalised); };
+  return sources;
+}
+
+std::optional<std::uint16_t> EmbeddedUpdate(IGeoDataSet* dataSet) {
+  VARIANT value;
+  VariantInit(&value);
+  std::optional<std::uint16_t> update;
+  if (SUCCEEDED(dataSet->GetDataSetProperty(kPropertyEmbeddedUpdate, &value))) {
+    VARIANT converted;
+    VariantInit(&converted);
+    if (SUCCEEDED(VariantChangeType(&converted, &value, 0, VT_UI2))) update = converted.uiVal;
+    VariantClear(&converted);
+  }
+  VariantClear(&value);
+  return update;
+}
+
+HRESULT LibraryMetadata(IGeoDataSet* dataSet, std::vector<MetadataRow>& rows) {
+  geo::ParameterList parameters;
+  if (FAILED(parameters.Read(dataSet))) return E_FAIL;
+  rows = LibraryRows(ValuesOf(parameters), SourcesFor(dataSet));
+  return S_OK;
+}
+
+}  // namespace
+
+std::string AgencyName(long code) {
+  // The agency table arrives with the inspector's settings; until then every code
+  // shows in decimal, as an unlisted one does.
+  (void)code;
+  return {};
+}
+
+HRESULT ReadDataSetMetadata(IUnknown* owner, REFGUID id, std::vector<MetadataRow>& rows) {
+  rows.clear();
+  if (owner == nullptr) return E_INVALIDARG;
+  Target target;
+  const HRESULT found = FindDataSet(owner, id, target);
+  if (FAILED(found)) return found;
+  if (target.library) return LibraryMetadata(target.dataSet.Get(), rows);
+
+  geo::ParameterList parameters;
+  if (FAILED(parameters.Read(target.dataSet.Get()))) return E_FAIL;
+  geo::DataSetHeader header;
+  geo::ReadDataSetHeader(target.dataSet.Get(), header);  // a missing record leaves its rows out
+  rows = ChartDataSetRows(ValuesOf(parameters), header, EmbeddedUpdate(target.dataSet.Get()),
+                          SourcesFor(target.dataSet.Get()));
+  return S_OK;
+}
+
+HRESULT FormatDataSetMetadata(IUnknown* owner, REFGUID id, std::string& text) {
+  text.clear();
+  if (owner == nullptr) return E_INVALIDARG;
+  Target target;
+  const HRESULT found = FindDataSet(owner, id, target);
+  if (FAILED(found)) return found;
+  std::vector<MetadataRow> rows;
+  if (target.library) {
+    if (FAILED(LibraryMetadata(target.dataSet.Get(), rows))) return E_FAIL;
+  } else {
+    geo::DataSetHeader header;
+    if (FAILED(geo::ReadDataSetHeader(target.dataSet.Get(), header))) return E_FAIL;
+    rows = ChartDataSetTextRows(header, EmbeddedUpdate(target.dataSet.Get()), SourcesFor(target.dataSet.Get()));
+  }
+  text = MetadataText(rows);
+  return S_OK;
+}
+
+}  // namespace br::inspector

@@ -1,0 +1,34 @@
+#pragma once
+// The metadata of the dataset the inspector's header item stands for, read from the
+// host: the rows the attribute table panel shows, and the text form FormatAttributes
+// returns. The owner is the header record's owner (a database, a dataset or a dataset
+// entry) and the identity the header record's GUID: an object's (its dataset is asked)
+// or the dataset's own (first 8 bytes zero; the last 8 name the dataset).
+//
+// Agency codes become names through the agency table; until the inspector loads one,
+// codes show in decimal (AgencyName).
+
+#include <windows.h>
+
+#include <string>
+#include <vector>
+
+#include "GeoData.h"
+#include "inspector/format/metadata_rows.h"
+
+namespace br::inspector {
+
+// Rows of an electronic chart dataset or a library dataset (the owner answers the
+// library interface). E_INVALIDARG for a null owner; E_FAIL without a dataset or with a
+// parameter array of the wrong form; E_NOTIMPL for a raster chart entry.
+HRESULT ReadDataSetMetadata(IUnknown* owner, REFGUID id, std::vector<MetadataRow>& rows);
+
+// The text form: caption, carriage return, value, carriage return, per row. A chart
+// dataset's rows come from the header record of the dataset the identity's last 8 bytes
+// name; a library's from its parameters. Errors as above.
+HRESULT FormatDataSetMetadata(IUnknown* owner, REFGUID id, std::string& text);
+
+// The producing agency's name for a code; empty when the table does not list it.
+std::string AgencyName(long code);
+
+}  // namespace br::inspector
