@@ -63,10 +63,12 @@ void cP_SHPanel::SetUp(bool twoColumns) {
   table_.addColumn("type", "Type", kCellLong, 0, nullptr, false);
   if (twoColumns) table_.addColumn("name", "Name", kCellText, 0, nullptr, false);
   textColumn_ = table_.addColumn("text", "Text", kCellText, 0, nullptr, false);
-  table_.setColumnVisible(kTypeColumn, false);
+  // Hidden columns need the style bit first: the type column is for the panel, not for people.
   table_.setTableStyle((table_.getTableStyle() | toolkit::Table::kStyleWholeRow | toolkit::Table::kStyleFillLast |
-                        toolkit::Table::kStyleNoEditOnSelect | toolkit::Table::kStyleOwnerDraw) &
+                        toolkit::Table::kStyleNoEditOnSelect | toolkit::Table::kStyleOwnerDraw |
+                        toolkit::Table::kStyleHidden) &
                        ~(toolkit::Table::kStyleHorizontalGrid | toolkit::Table::kStyleVerticalGrid));
+  table_.setColumnVisible(kTypeColumn, false);
   insertNamed("Center", &table_, "rows");
 }
 

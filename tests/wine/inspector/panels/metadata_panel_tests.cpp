@@ -1,0 +1,181 @@
+// The metadata of a dataset in the attribute table panel, read through IAccessible, and
+// its text form, from scenes written here: chart and library rows in order, captions in
+// the host's language, status words, datum texts and shifts, short header records, and
+// what a failing host leaves out.
+#include <doctest/doctest.h>
+
+#include <string>
+
+#include "inspector/panels/cAttrViewPanel_Tbl.h"
+#include "inspector/panels/dataset_metadata.h"
+#include "tests/wine/common/SceneProbe.h"
+#include "tests/wine/common/ScratchScene.h"
+#include "tests/wine/inspector/panels/panel_test_support.h"
+
+using namespace br;
+using br::inspector::cAttrViewPanel_Tbl;
+using br::inspector::FormatDataSetMetadata;
+using br::test::MountedPanel;
+using br::test::Names;
+using br::test::ScratchScene;
+
+namespace {
+
+// A terminated chart dataset with every metadata field, one whose header record stops
+// after 40 bytes, a library and a raster chart entry.
+const char* const kScene = R"({
+  "format": "chartscene 1",
+  "databases": [{"name": "META", "kind": "chart", "datasets": [
+    {"id": "TESTDS01",
+     "header": {"scale": 22000, "level": 5, "edition": 3, "update": 2, "updateDate": "2023-05-02",
+                "issueDate": "2022-11-15", "agency": 170, "sourceAgency": 550, "sourceId": "SHOM 7401",
+                "terminated": true, "usage": 5},
+     "parameters": {"official": 0, "title": "Goulet de Brest", "archiveCode": "A7401",
+                    "horizontalDatum": 2, "horizontalDatumSource": 2, "datumShiftLon": 12000,
+                    "datumShiftLat": -8000, "verticalDatum": 3, "soundingDatum": 23},
+     "properties": {"2": {"UI2": 4}},
+     "objects": [{"name": "buoy", "class": "BOYLAT", "point": [48.3, -4.5], "attributes": {"OBJNAM": "B"}}]},
+    {"id": "SHORT01", "header": {"size": 40, "scale": 5000, "level": 2, "edition": 1, "updateDate": "2024-01-31",
+                                 "agency": 170}},
+    {"id": "LIBBRST", "type": "library", "header": {"level": 3, "fileName": "LIBBRST.LIB"},
+     "parameters": {"name": "Brest library", "description": "Harbour objects", "11": {"EMPTY": null},
+                    "sourceId": "LB 1", "libraryEdition": 7, "editionDate": "2024-03-01",
+                    "title": "metres", "27": {"BSTR": "LAT"}, "25": {"BSTR": "MSL"},
+                    "29": {"BSTR": "WGS 84"}, "31": {"BSTR": "Mercator"}}},
+    {"id": "RASTER1", "type": "raster"}
+  ]}]
+})";
+
+GUID ObjectId(const ScratchScene& scene, const wchar_t* name) { return ScratchScene::IdOf(scene.Object(name).Get()); }
+
+}  // namespace
+
+TEST_CASE("chart dataset metadata rows, in order, from the header item's record") {
+  MountedPanel<cAttrViewPanel_Tbl> m;
+  ScratchScene scene(kScene);
+  const Names expected{L"DataSet filename\tTESTDS01.000 (TERMINATED)",
+                       L"Chart Title\tGoulet de Brest",
+                       L"DataSet source type\tOfficial",
+                       L"Source identification code\tSHOM 7401",
+                       L"Source producing agency\t550",
+                       L"Producing agency\t170",
+                       L"Scale\t22000",
+                       L"Update application date\t02.05.2023",
+                       L"Issue date\t15.11.2022",
+                       L"Edition number\t3",
+                       L"Update number (embedded into ENC)\t4",
+                       L"Archive Code\tA7401",
+                       L"Horizontal Datum\tWGS 84",
+                       L"Horizontal Datum Source\tWGS 84",
+                       L"Lon Horizontal Datum Shift\t0.07200'",
+                       L"Lat Horizontal Datum Shift\t-0.04800'",
+                       L"Vertical Datum\tMean sea level",
+                       L"Sounding Datum\tLowest astronomical tide",
+                       L"Level\t5",
+                       L"Intended usage\t5"};
+
+  SUBCASE("through the database and an object's identity (the header's copy of record 1)") {
+    REQUIRE(m.panel.FillDataSetMetadata(scene.Database(L"META").Get(), ObjectId(scene, L"buoy")) == S_OK);
+    CHECK(m.Rows() == expected);
+  }
+  SUBCASE("through the database and the dataset's own identity") {
+    REQUIRE(m.panel.FillDataSetMetadata(scene.Database(L"META").Get(), ScratchScene::DataSetIdentity("TESTDS01")) ==
+            S_OK);
+    CHECK(m.Rows() == expected);
+    CHECK(m.Types() == std::vector<int>(expected.size(), cAttrViewPanel_Tbl::kRowAttribute));
+  }
+}
+
+TEST_CASE("captions come in the host's language") {
+  br::test::ScopedEnvironment french(L"CHARTSCENE_LANGUAGE", L"1036");
+  MountedPanel<cAttrViewPanel_Tbl> m;
+  ScratchScene scene(kScene);
+  REQUIRE(m.panel.FillDataSetMetadata(scene.Database(L"META").Get(), ScratchScene::DataSetIdentity("TESTDS01")) ==
+          S_OK);
+  const Names rows = m.Rows();
+  REQUIRE(rows.size() == 20);
+  CHECK(rows[0] == L"Nom du fichier du lot de donn\u00E9es\tTESTDS01.000 (ANNUL\u00C9)");
+  CHECK(rows[2] == L"Type de source du lot de donn\u00E9es\tOfficiel");
+  CHECK(rows[6] == L"\u00C9chelle\t22000");
+}
+
+TEST_CASE("library metadata rows; the scale falls back to the file name") {
+  MountedPanel<cAttrViewPanel_Tbl> m;
+  ScratchScene scene(kScene);
+  REQUIRE(m.panel.FillDataSetMetadata(scene.DataSet(L"LIBBRST").Get(), GUID{}) == S_OK);
+  CHECK(m.Rows() == Names{L"Name\tBrest library", L"Description\tHarbour objects", L"Scale\tLIBBRST.LIB",
+                          L"Level\t3", L"Source identification code\tLB 1", L"Edition date\t01.03.2024",
+                          L"Edition number\t7", L"Depth Height Units\tmetres", L"Sounding Datum\tLAT",
+                          L"Vertical Datum\tMSL", L"Horizontal Datum\tWGS 84", L"Projection\tMercator"});
+}
+
+TEST_CASE("the text form of a dataset's metadata for a zero-prefixed identity") {
+  br::test::Apartment apartment;
+  ScratchScene scene(kScene);
+  std::string text;
+  REQUIRE(FormatDataSetMetadata(scene.Database(L"META").Get(), ScratchScene::DataSetIdentity("TESTDS01"), text) ==
+          S_OK);
+  CHECK(text ==
+        "DataSet filename\rTESTDS01.000\r"
+        "Source identification code\rSHOM 7401\r"
+        "Source producing agency\r550\r"
+        "Producing agency\r170\r"
+        "Scale\r22000\r"
+        "Level\r5\r"
+        "Intended usage\r5\r"
+        "Update application date\r02.05.2023\r"
+        "Issue date\r15.11.2022\r"
+        "Edition number\r3\r"
+        "Update number (embedded into ENC)\r4\r");
+
+  // A record of 40 bytes: only the fields that end inside it, nothing read past it.
+  REQUIRE(FormatDataSetMetadata(scene.Database(L"META").Get(), ScratchScene::DataSetIdentity("SHORT01"), text) ==
+          S_OK);
+  CHECK(text == "Scale\r5000\rLevel\r2\rUpdate application date\r31.01.2024\rEdition number\r1\r");
+
+  REQUIRE(FormatDataSetMetadata(scene.DataSet(L"LIBBRST").Get(), GUID{}, text) == S_OK);
+  CHECK(text.rfind("Name\rBrest library\rDescription\rHarbour objects\rScale\rLIBBRST.LIB\r", 0) == 0);
+}
+
+TEST_CASE("metadata failures: no owner, no dataset, a failing host, a raster entry") {
+  MountedPanel<cAttrViewPanel_Tbl> m;
+  ScratchScene scene(kScene);
+  br::test::SceneProbe probe;
+  std::string text = "stale";
+  CHECK(m.panel.FillDataSetMetadata(nullptr, GUID{}) == E_INVALIDARG);
+  CHECK(FormatDataSetMetadata(nullptr, GUID{}, text) == E_INVALIDARG);
+  CHECK(text.empty());
+  CHECK(m.panel.FillDataSetMetadata(scene.Database(L"META").Get(), ScratchScene::DataSetIdentity("NOSUCH")) ==
+        E_FAIL);
+  CHECK(FormatDataSetMetadata(scene.Database(L"META").Get(), ScratchScene::DataSetIdentity("NOSUCH"), text) ==
+        E_FAIL);
+  CHECK(m.panel.FillDataSetMetadata(scene.DataSet(L"RASTER1").Get(), GUID{}) == E_FAIL);
+  CHECK_FALSE(m.panel.HasContent());
+
+  SUBCASE("no parameters: no rows") {
+    probe.SetFault("IGeoDataSet.GetParameters", E_FAIL);
+    CHECK(m.panel.FillDataSetMetadata(scene.Database(L"META").Get(), ScratchScene::DataSetIdentity("TESTDS01")) ==
+          E_FAIL);
+    CHECK_FALSE(m.panel.HasContent());
+  }
+  SUBCASE("no catalogue texts: the datum rows are left out, the rest stays") {
+    probe.SetFault("IGeoCatalog.GetEnumText", E_FAIL);
+    REQUIRE(m.panel.FillDataSetMetadata(scene.Database(L"META").Get(),
+                                        ScratchScene::DataSetIdentity("TESTDS01")) == S_OK);
+    const Names rows = m.Rows();
+    CHECK(rows.size() == 16);
+    for (const std::wstring& row : rows) CHECK(row.find(L"Datum\t") == std::wstring::npos);
+  }
+  SUBCASE("no header record: the text form fails, the rows lose only level and usage") {
+    probe.SetFault("IGeoDataSet.GetHeader", E_FAIL);
+    CHECK(FormatDataSetMetadata(scene.Database(L"META").Get(), ScratchScene::DataSetIdentity("TESTDS01"), text) ==
+          E_FAIL);
+    REQUIRE(m.panel.FillDataSetMetadata(scene.Database(L"META").Get(),
+                                        ScratchScene::DataSetIdentity("TESTDS01")) == S_OK);
+    const Names rows = m.Rows();
+    REQUIRE(rows.size() == 18);
+    CHECK(rows[0] == L"DataSet filename\tTESTDS01.000");  // the status is in the record
+    CHECK(rows.back() == L"Sounding Datum\tLowest astronomical tide");
+  }
+  probe.ClearFaults();
+}
