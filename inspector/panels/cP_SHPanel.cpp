@@ -166,14 +166,15 @@ void cP_SHPanel::AddObjectAttributes(IGeoObject* object) {
     if (chart) {
       codes.push_back(code);
     } else {
-      AddAttributeToContent(attribute.Get());
+      AddPrintableAttribute(attribute.Get());
     }
     return true;
   });
   if (!chart) return;
   for (long code : OrderChartAttributeCodes(codes, informed)) {
     ComPtr<IGeoAttribute> attribute;
-    if (object->GetAttribute(code, &attribute) == S_OK && attribute) AddAttributeToContent(attribute.Get());
+    // The codes were tested as they were listed.
+    if (object->GetAttribute(code, &attribute) == S_OK && attribute) AddPrintableAttribute(attribute.Get());
   }
 }
 
@@ -213,6 +214,10 @@ bool cP_SHPanel::IsUnprintable(IGeoAttribute* attribute) const {
 HRESULT cP_SHPanel::AddAttributeToContent(IGeoAttribute* attribute) {
   if (attribute == nullptr) return E_INVALIDARG;
   if (IsUnprintable(attribute)) return S_FALSE;
+  return AddPrintableAttribute(attribute);
+}
+
+HRESULT cP_SHPanel::AddPrintableAttribute(IGeoAttribute* attribute) {
   long code = 0;
   HRESULT hr = attribute->GetCode(&code);
   if (FAILED(hr)) {

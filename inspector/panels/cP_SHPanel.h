@@ -82,6 +82,8 @@ protected:
 
 private:
   void SetUp(bool twoColumns);
+  // AddAttributeToContent for an attribute already found printable.
+  HRESULT AddPrintableAttribute(IGeoAttribute* attribute);
   void AddObjectAttributes(IGeoObject* object);
 
   const PanelSettings& settings_;
