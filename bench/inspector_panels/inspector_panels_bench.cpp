@@ -153,7 +153,7 @@ int wmain(int argc, wchar_t** argv) {
       metadataRows = panel.table().getRowCount();
     });
     std::string text;
-    const Figures textForm = Time(count, [&] { br::inspector::FormatDataSetMetadata(database.Get(), header, text); });
+    const Figures textForm = Time(count, [&] { br::inspector::FormatDataSetMetadata(database.Get(), header, &panel.agencies(), text); });
 
     std::printf("inspector_panels_bench: %d runs each (median / worst, ms)\n", count);
     std::printf("  select an object of %d attributes (%d rows):  %.2f / %.2f   target 30\n", kAttributes, rows,

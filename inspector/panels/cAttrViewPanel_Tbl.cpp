@@ -26,7 +26,7 @@ void cAttrViewPanel_Tbl::AddHeading(const std::string& label) { AppendRow(kRowHe
 
 HRESULT cAttrViewPanel_Tbl::FillDataSetMetadata(IUnknown* owner, REFGUID id) {
   std::vector<MetadataRow> rows;
-  const HRESULT hr = ReadDataSetMetadata(owner, id, rows);
+  const HRESULT hr = ReadDataSetMetadata(owner, id, &agencies_, rows);
   if (FAILED(hr)) return hr == E_INVALIDARG ? hr : E_FAIL;
   for (const MetadataRow& row : rows) {
     if (row.caption == kHeadingCaption) {

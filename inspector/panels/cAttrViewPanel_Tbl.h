@@ -9,6 +9,7 @@
 // Accessibility clients read each row from the table's window as "name<TAB>value", a
 // heading as "label<TAB>" (its value cell is empty).
 
+#include "frame/geo/AgencyTable.h"
 #include "inspector/panels/cP_SHPanel.h"
 
 namespace br::inspector {
@@ -18,6 +19,7 @@ public:
   static constexpr int kNameColumn = 1;
   static constexpr int kTextColumn = 2;
 
+  // Loads the panel's copy of the agency table (AgencyTable::DefaultPath).
   explicit cAttrViewPanel_Tbl(const PanelSettings& settings);
 
   const toolkit::ClassRecord* getClassRecord() const override;
@@ -30,8 +32,13 @@ public:
   void AddRow(const std::string& name, const std::string& value) override;
   void AddHeading(const std::string& label) override;
 
+  const geo::AgencyTable& agencies() const { return agencies_; }
+
 protected:
   bool DrawCell(HDC dc, const RECT& rect, int column, int row) override;
+
+private:
+  geo::AgencyTable agencies_;
 };
 
 }  // namespace br::inspector

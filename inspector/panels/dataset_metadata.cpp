@@ -99,11 +99,14 @@ std::vector<ParameterValue> ValuesOf(const geo::ParameterList& list) {
   return values;
 }
 
-MetadataSources SourcesFor(IGeoDataSet* dataSet) {
+MetadataSources SourcesFor(IGeoDataSet* dataSet, const geo::AgencyTable* agencies) {
   MetadataSources sources;
   sources.text = [](long id, const char* defaultText) { return GetText("ObjInspector", id, defaultText); };
   sources.date = [](double date) { return FormatDate(date, DATE_PATTERN); };
-  sources.agency = AgencyName;
+  sources.agency = [agencies](long code) {
+    const geo::AgencyRow* row = agencies ? agencies->Find(static_cast<std::int32_t>(code)) : nullptr;
+    return row ? row->name : std::string();
+  };
   ComPtr<IGeoCatalog> catalogue = CatalogueOf(dataSet);
   sources.catalogue = [catalogue](const char* acronym, long value) -> std::optional<std::string> {
     if (!catalogue) return std::nullopt;
@@ -130,40 +133,34 @@ std::optional<std::uint16_t> EmbeddedUpdate(IGeoDataSet* dataSet) {
   return update;
 }
 
-HRESULT LibraryMetadata(IGeoDataSet* dataSet, std::vector<MetadataRow>& rows) {
+HRESULT LibraryMetadata(IGeoDataSet* dataSet, const geo::AgencyTable* agencies, std::vector<MetadataRow>& rows) {
   geo::ParameterList parameters;
   if (FAILED(parameters.Read(dataSet))) return E_FAIL;
-  rows = LibraryRows(ValuesOf(parameters), SourcesFor(dataSet));
+  rows = LibraryRows(ValuesOf(parameters), SourcesFor(dataSet, agencies));
   return S_OK;
 }
 
 }  // namespace
 
-std::string AgencyName(long code) {
-  // The agency table arrives with the inspector's settings; until then every code
-  // shows in decimal, as an unlisted one does.
-  (void)code;
-  return {};
-}
-
-HRESULT ReadDataSetMetadata(IUnknown* owner, REFGUID id, std::vector<MetadataRow>& rows) {
+HRESULT ReadDataSetMetadata(IUnknown* owner, REFGUID id, const geo::AgencyTable* agencies,
+                            std::vector<MetadataRow>& rows) {
   rows.clear();
   if (owner == nullptr) return E_INVALIDARG;
   Target target;
   const HRESULT found = FindDataSet(owner, id, target);
   if (FAILED(found)) return found;
-  if (target.library) return LibraryMetadata(target.dataSet.Get(), rows);
+  if (target.library) return LibraryMetadata(target.dataSet.Get(), agencies, rows);
 
   geo::ParameterList parameters;
   if (FAILED(parameters.Read(target.dataSet.Get()))) return E_FAIL;
   geo::DataSetHeader header;
   geo::ReadDataSetHeader(target.dataSet.Get(), header);  // a missing record leaves its rows out
   rows = ChartDataSetRows(ValuesOf(parameters), header, EmbeddedUpdate(target.dataSet.Get()),
-                          SourcesFor(target.dataSet.Get()));
+                          SourcesFor(target.dataSet.Get(), agencies));
   return S_OK;
 }
 
-HRESULT FormatDataSetMetadata(IUnknown* owner, REFGUID id, std::string& text) {
+HRESULT FormatDataSetMetadata(IUnknown* owner, REFGUID id, const geo::AgencyTable* agencies, std::string& text) {
   text.clear();
   if (owner == nullptr) return E_INVALIDARG;
   Target target;
@@ -171,11 +168,12 @@ HRESULT FormatDataSetMetadata(IUnknown* owner, REFGUID id, std::string& text) {
   if (FAILED(found)) return found;
   std::vector<MetadataRow> rows;
   if (target.library) {
-    if (FAILED(LibraryMetadata(target.dataSet.Get(), rows))) return E_FAIL;
+    if (FAILED(LibraryMetadata(target.dataSet.Get(), agencies, rows))) return E_FAIL;
   } else {
     geo::DataSetHeader header;
     if (FAILED(geo::ReadDataSetHeader(target.dataSet.Get(), header))) return E_FAIL;
-    rows = ChartDataSetTextRows(header, EmbeddedUpdate(target.dataSet.Get()), SourcesFor(target.dataSet.Get()));
+    rows = ChartDataSetTextRows(header, EmbeddedUpdate(target.dataSet.Get()),
+                                SourcesFor(target.dataSet.Get(), agencies));
   }
   text = MetadataText(rows);
   return S_OK;

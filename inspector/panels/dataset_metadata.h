@@ -5,8 +5,8 @@
 // entry) and the identity the header record's GUID: an object's (its dataset is asked)
 // or the dataset's own (first 8 bytes zero; the last 8 name the dataset).
 //
-// Agency codes become names through the agency table; until the inspector loads one,
-// codes show in decimal (AgencyName).
+// Agency codes become names through an agency table (the panel's or the control's own
+// copy); a code it does not list, or every code without a table, shows in decimal.
 
 #include <windows.h>
 
@@ -14,6 +14,7 @@
 #include <vector>
 
 #include "GeoData.h"
+#include "frame/geo/AgencyTable.h"
 #include "inspector/format/metadata_rows.h"
 
 namespace br::inspector {
@@ -21,14 +22,12 @@ namespace br::inspector {
 // Rows of an electronic chart dataset or a library dataset (the owner answers the
 // library interface). E_INVALIDARG for a null owner; E_FAIL without a dataset or with a
 // parameter array of the wrong form; E_NOTIMPL for a raster chart entry.
-HRESULT ReadDataSetMetadata(IUnknown* owner, REFGUID id, std::vector<MetadataRow>& rows);
+HRESULT ReadDataSetMetadata(IUnknown* owner, REFGUID id, const geo::AgencyTable* agencies,
+                            std::vector<MetadataRow>& rows);
 
 // The text form: caption, carriage return, value, carriage return, per row. A chart
 // dataset's rows come from the header record of the dataset the identity's last 8 bytes
 // name; a library's from its parameters. Errors as above.
-HRESULT FormatDataSetMetadata(IUnknown* owner, REFGUID id, std::string& text);
-
-// The producing agency's name for a code; empty when the table does not list it.
-std::string AgencyName(long code);
+HRESULT FormatDataSetMetadata(IUnknown* owner, REFGUID id, const geo::AgencyTable* agencies, std::string& text);
 
 }  // namespace br::inspector

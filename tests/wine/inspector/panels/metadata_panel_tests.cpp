@@ -4,12 +4,14 @@
 // what a failing host leaves out.
 #include <doctest/doctest.h>
 
+#include <fstream>
 #include <string>
 
 #include "inspector/panels/cAttrViewPanel_Tbl.h"
 #include "inspector/panels/dataset_metadata.h"
 #include "tests/wine/common/SceneProbe.h"
 #include "tests/wine/common/ScratchScene.h"
+#include "tests/wine/common/registry_test_support.h"
 #include "tests/wine/inspector/panels/panel_test_support.h"
 
 using namespace br;
@@ -48,16 +50,37 @@ const char* const kScene = R"({
 
 GUID ObjectId(const ScratchScene& scene, const wchar_t* name) { return ScratchScene::IdOf(scene.Object(name).Get()); }
 
+// A chart installation whose agency table lists 550 (twice: the first row wins) and not
+// 170, found through KeyPath as the panel is made.
+struct AgencyInstallation {
+  ScratchFolder folder;
+  SavedRegistryValue keyPath{HKEY_LOCAL_MACHINE, "SOFTWARE\\Brine\\Brdata\\Enum", "KeyPath"};
+  AgencyInstallation() {
+    REQUIRE(CreateDirectoryA((folder / "SYSTEM").c_str(), nullptr));
+    REQUIRE(CreateDirectoryA((folder / "SYSTEM\\HTML").c_str(), nullptr));
+    const std::string table = "550;SHOM;Service hydrographique de la marine\r\n550;XX;Later duplicate\r\n"
+                              "31;UKHO;United Kingdom Hydrographic Office\r\n";
+    std::ofstream(folder / "SYSTEM\\HTML\\hosource.txt", std::ios::binary) << table;
+    keyPath.SetString(folder.Path() + "\\");
+  }
+};
+
+struct MetadataPanel {
+  AgencyInstallation installation;
+  MountedPanel<cAttrViewPanel_Tbl> m;
+};
+
 }  // namespace
 
 TEST_CASE("chart dataset metadata rows, in order, from the header item's record") {
-  MountedPanel<cAttrViewPanel_Tbl> m;
+  MetadataPanel fixture;
+  auto& m = fixture.m;
   ScratchScene scene(kScene);
   const Names expected{L"DataSet filename\tTESTDS01.000 (TERMINATED)",
                        L"Chart Title\tGoulet de Brest",
                        L"DataSet source type\tOfficial",
                        L"Source identification code\tSHOM 7401",
-                       L"Source producing agency\t550",
+                       L"Source producing agency\tService hydrographique de la marine",
                        L"Producing agency\t170",
                        L"Scale\t22000",
                        L"Update application date\t02.05.2023",
@@ -111,14 +134,17 @@ TEST_CASE("library metadata rows; the scale falls back to the file name") {
 
 TEST_CASE("the text form of a dataset's metadata for a zero-prefixed identity") {
   br::test::Apartment apartment;
+  AgencyInstallation installation;
+  const geo::AgencyTable agencies;
+  REQUIRE(agencies.Size() == 3);
   ScratchScene scene(kScene);
   std::string text;
-  REQUIRE(FormatDataSetMetadata(scene.Database(L"META").Get(), ScratchScene::DataSetIdentity("TESTDS01"), text) ==
-          S_OK);
+  REQUIRE(FormatDataSetMetadata(scene.Database(L"META").Get(), ScratchScene::DataSetIdentity("TESTDS01"), &agencies,
+                                text) == S_OK);
   CHECK(text ==
         "DataSet filename\rTESTDS01.000\r"
         "Source identification code\rSHOM 7401\r"
-        "Source producing agency\r550\r"
+        "Source producing agency\rService hydrographique de la marine\r"
         "Producing agency\r170\r"
         "Scale\r22000\r"
         "Level\r5\r"
@@ -129,12 +155,17 @@ TEST_CASE("the text form of a dataset's metadata for a zero-prefixed identity") 
         "Update number (embedded into ENC)\r4\r");
 
   // A record of 40 bytes: only the fields that end inside it, nothing read past it.
-  REQUIRE(FormatDataSetMetadata(scene.Database(L"META").Get(), ScratchScene::DataSetIdentity("SHORT01"), text) ==
-          S_OK);
+  REQUIRE(FormatDataSetMetadata(scene.Database(L"META").Get(), ScratchScene::DataSetIdentity("SHORT01"), &agencies,
+                                text) == S_OK);
   CHECK(text == "Scale\r5000\rLevel\r2\rUpdate application date\r31.01.2024\rEdition number\r1\r");
 
-  REQUIRE(FormatDataSetMetadata(scene.DataSet(L"LIBBRST").Get(), GUID{}, text) == S_OK);
+  REQUIRE(FormatDataSetMetadata(scene.DataSet(L"LIBBRST").Get(), GUID{}, &agencies, text) == S_OK);
   CHECK(text.rfind("Name\rBrest library\rDescription\rHarbour objects\rScale\rLIBBRST.LIB\r", 0) == 0);
+
+  // Without a table every agency shows as its code.
+  REQUIRE(FormatDataSetMetadata(scene.Database(L"META").Get(), ScratchScene::DataSetIdentity("TESTDS01"), nullptr,
+                                text) == S_OK);
+  CHECK(text.find("Source producing agency\r550\rProducing agency\r170\r") != std::string::npos);
 }
 
 TEST_CASE("metadata failures: no owner, no dataset, a failing host, a raster entry") {
@@ -143,12 +174,12 @@ TEST_CASE("metadata failures: no owner, no dataset, a failing host, a raster ent
   br::test::SceneProbe probe;
   std::string text = "stale";
   CHECK(m.panel.FillDataSetMetadata(nullptr, GUID{}) == E_INVALIDARG);
-  CHECK(FormatDataSetMetadata(nullptr, GUID{}, text) == E_INVALIDARG);
+  CHECK(FormatDataSetMetadata(nullptr, GUID{}, nullptr, text) == E_INVALIDARG);
   CHECK(text.empty());
   CHECK(m.panel.FillDataSetMetadata(scene.Database(L"META").Get(), ScratchScene::DataSetIdentity("NOSUCH")) ==
         E_FAIL);
-  CHECK(FormatDataSetMetadata(scene.Database(L"META").Get(), ScratchScene::DataSetIdentity("NOSUCH"), text) ==
-        E_FAIL);
+  CHECK(FormatDataSetMetadata(scene.Database(L"META").Get(), ScratchScene::DataSetIdentity("NOSUCH"), nullptr,
+                              text) == E_FAIL);
   CHECK(m.panel.FillDataSetMetadata(scene.DataSet(L"RASTER1").Get(), GUID{}) == E_FAIL);
   CHECK_FALSE(m.panel.HasContent());
 
@@ -168,8 +199,8 @@ TEST_CASE("metadata failures: no owner, no dataset, a failing host, a raster ent
   }
   SUBCASE("no header record: the text form fails, the rows lose only level and usage") {
     probe.SetFault("IGeoDataSet.GetHeader", E_FAIL);
-    CHECK(FormatDataSetMetadata(scene.Database(L"META").Get(), ScratchScene::DataSetIdentity("TESTDS01"), text) ==
-          E_FAIL);
+    CHECK(FormatDataSetMetadata(scene.Database(L"META").Get(), ScratchScene::DataSetIdentity("TESTDS01"), nullptr,
+                                text) == E_FAIL);
     REQUIRE(m.panel.FillDataSetMetadata(scene.Database(L"META").Get(),
                                         ScratchScene::DataSetIdentity("TESTDS01")) == S_OK);
     const Names rows = m.Rows();
