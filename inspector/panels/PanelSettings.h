@@ -9,6 +9,7 @@
 #include <wrl/client.h>
 
 #include "GeoData.h"
+#include "frame/errors/cErrReporter.h"
 
 namespace br::inspector {
 
@@ -29,6 +30,11 @@ public:
   void SetFormatter(IObjectFormatter* formatter) { formatter_ = formatter; }
 
   IObjectFormatter* Formatter() const { return formatter_.Get(); }
+  // Where the panels report the failures they skip: the library's reporter (log file,
+  // box) unless the control hands over its own.
+  cErrHandler& Errors() const { return *errors_; }
+  void SetErrorHandler(cErrHandler* handler) { errors_ = handler ? handler : &reporter_; }
+
   long language = 0;
   long objectFlags = 0;     // ORed into FormatObject's flags
   long attributeFlags = 0;  // ORed into FormatAttribute's flags
@@ -36,6 +42,8 @@ public:
 
 private:
   Microsoft::WRL::ComPtr<IObjectFormatter> formatter_;
+  cErrReporter reporter_;
+  cErrHandler* errors_ = &reporter_;
 };
 
 }  // namespace br::inspector

@@ -6,7 +6,6 @@
 
 #include <wrl/client.h>
 
-#include "frame/errors/cErrReporter.h"
 #include "frame/geo/geo_enumeration.h"
 #include "inspector/format/attribute_text.h"
 #include "inspector/panels/PanelSettings.h"
@@ -31,10 +30,10 @@ bool IsLeftOutRelation(long classCode) {
          classCode == kClassAggregation || classCode == kClassAssociation;
 }
 
-void LogFailure(const char* function, HRESULT result) {
-  cErrReporter reporter;
-  ErrRecord record(ErrPlace{__FILE__, function, __LINE__});
-  reporter.ReportResult("cP_SHPanel", record, static_cast<std::int32_t>(result));
+void LogFailure(const PanelSettings& settings, const char* function, int line, HRESULT result) {
+  ErrRecord record(ErrPlace{__FILE__, function, line});
+  record.line = line;
+  settings.Errors().ReportResult("cP_SHPanel", record, static_cast<std::int32_t>(result));
 }
 
 struct Related {
@@ -183,7 +182,7 @@ bool cP_SHPanel::IsUnprintable(IGeoAttribute* attribute) const {
   ComPtr<IUnknown> owner;
   HRESULT hr = attribute->GetOwner(&owner);
   if (FAILED(hr) || !owner) {
-    LogFailure("IsUNPRINTABLE", FAILED(hr) ? hr : E_POINTER);
+    LogFailure(settings_, "IsUNPRINTABLE", __LINE__, FAILED(hr) ? hr : E_POINTER);
     return false;
   }
   ComPtr<IGeoDataSet> dataSet;
@@ -194,18 +193,18 @@ bool cP_SHPanel::IsUnprintable(IGeoAttribute* attribute) const {
     hr = owner.As(&dataSet);
   }
   if (FAILED(hr) || !dataSet) {
-    LogFailure("IsUNPRINTABLE", FAILED(hr) ? hr : E_POINTER);
+    LogFailure(settings_, "IsUNPRINTABLE", __LINE__, FAILED(hr) ? hr : E_POINTER);
     return false;
   }
   ComPtr<IGeoCatalog> catalogue = CatalogueOf(dataSet.Get());
   long code = 0;
   long flags = 0;
   if (!catalogue) {
-    LogFailure("IsUNPRINTABLE", E_NOINTERFACE);
+    LogFailure(settings_, "IsUNPRINTABLE", __LINE__, E_NOINTERFACE);
     return false;
   }
   if (FAILED(hr = attribute->GetCode(&code)) || FAILED(hr = catalogue->GetAttributeFlags(code, &flags))) {
-    LogFailure("IsUNPRINTABLE", hr);
+    LogFailure(settings_, "IsUNPRINTABLE", __LINE__, hr);
     return false;
   }
   return (flags & kCatalogueHiddenBit) != 0;
@@ -221,7 +220,7 @@ HRESULT cP_SHPanel::AddPrintableAttribute(IGeoAttribute* attribute) {
   long code = 0;
   HRESULT hr = attribute->GetCode(&code);
   if (FAILED(hr)) {
-    LogFailure("_AddAttributeToContent", hr);
+    LogFailure(settings_, "_AddAttributeToContent", __LINE__, hr);
     return hr;
   }
   const std::optional<GUID> kind = OwnerKindOf(attribute);
@@ -243,7 +242,7 @@ HRESULT cP_SHPanel::AddPrintableAttribute(IGeoAttribute* attribute) {
   const std::string formatted = SUCCEEDED(hr) ? AnsiText(text) : std::string();
   SysFreeString(text);
   if (FAILED(hr)) {
-    LogFailure("_AddAttributeToContent", hr);
+    LogFailure(settings_, "_AddAttributeToContent", __LINE__, hr);
     return hr;
   }
   std::optional<AttributeText> pair = SplitAttributeText(formatted);

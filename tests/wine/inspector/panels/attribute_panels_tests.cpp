@@ -3,7 +3,9 @@
 // objects, the cleaning of values, magnetic variation, and what is left out.
 #include <doctest/doctest.h>
 
+#include <cstdint>
 #include <string>
+#include <vector>
 
 #include "inspector/panels/cAttrViewPanel_Tbl.h"
 #include "inspector/panels/cP_SHPanel.h"
@@ -59,6 +61,27 @@ const char* const kScene = R"({
     ]}]}
   ]
 })";
+
+// Records the failures a panel reports instead of logging them.
+struct ReportedFailures : br::cErrHandler {
+  struct Failure {
+    std::string className;
+    std::string function;
+    std::int32_t result;
+  };
+  std::vector<Failure> seen;
+  bool Report(const char* className, br::ErrRecord& record) noexcept override {
+    seen.push_back({className, record.function, record.result});
+    return true;
+  }
+  bool AllAre(const char* function, HRESULT result) const {
+    if (seen.empty()) return false;
+    for (const Failure& f : seen) {
+      if (f.className != "cP_SHPanel" || f.function != function || f.result != result) return false;
+    }
+    return true;
+  }
+};
 
 }  // namespace
 
@@ -151,6 +174,8 @@ TEST_CASE("host failures skip what they touch") {
   MountedPanel<cAttrViewPanel_Tbl> m;
   ScratchScene scene(kScene);
   br::test::SceneProbe probe;
+  ReportedFailures failures;
+  m.settings.SetErrorHandler(&failures);
 
   SUBCASE("no class code: E_FAIL and no rows") {
     probe.SetFault("IGeoObject.GetClassCode", E_FAIL);
@@ -162,11 +187,16 @@ TEST_CASE("host failures skip what they touch") {
     REQUIRE(m.panel.FillObject(scene.Object(L"buoy").Get(), false, false) == S_OK);
     CHECK(m.Rows() == Names{L"Object name\tBuoy 1", L"Information\tPass west\rkeep clear", L"Colour\tred\rwhite",
                             L"Scale minimum\t50000", L"Buoy shape\tcan (cylindrical)"});
+    CHECK(failures.seen.size() == 5);  // one per listed attribute
+    CHECK(failures.AllAre("IsUNPRINTABLE", E_FAIL));
   }
   SUBCASE("the formatter fails: no attribute rows") {
-    probe.SetFault("IObjectFormatter.FormatAttribute", E_FAIL);
+    probe.SetFault("IObjectFormatter.FormatAttribute", E_ACCESSDENIED);
     REQUIRE(m.panel.FillObject(scene.Object(L"buoy").Get(), false, false) == S_OK);
     CHECK_FALSE(m.panel.HasContent());
+    CHECK(failures.seen.size() == 4);  // the unprintable one is never formatted
+    CHECK(failures.AllAre("_AddAttributeToContent", E_ACCESSDENIED));
   }
   probe.ClearFaults();
+  m.settings.SetErrorHandler(nullptr);
 }
