@@ -51,6 +51,8 @@ const char* const kScene = R"({
       {"name": "shop", "class": "srvint", "primitive": "none",
        "attributes": {"srvtyp": "Chandlery", "INFORM": "Open 8:00-19:00|closed Sunday"}},
       {"name": "system", "class": "M_NSYS", "primitive": "none", "attributes": {"MARSYS": 1}},
+      {"name": "holding-system", "class": "M_NSYS", "primitive": "none", "attributes": {"MARSYS": 2},
+       "members": ["plain-buoy"]},
       {"name": "empty", "class": "BOYLAT", "point": [48.3, -4.5]},
       {"name": "tower", "class": "LNDMRK", "point": [48.3, -4.5], "attributes": {"OBJNAM": "Tower"},
        "members": ["zulu", "light", "alpha", "shop"]}
@@ -156,6 +158,11 @@ TEST_CASE("what is not shown: hidden classes, empty objects, null objects, objec
   MountedPanel<cAttrViewPanel_Tbl> m;
   ScratchScene scene(kScene);
   CHECK(m.panel.FillObject(scene.Object(L"system").Get(), true, true) == S_FALSE);
+  CHECK_FALSE(m.panel.HasContent());
+  // A hidden class still shows when the object holds others.
+  REQUIRE(m.panel.FillObject(scene.Object(L"holding-system").Get(), false, false) == S_OK);
+  CHECK(m.Rows() == Names{L"Marks navigational - System of\tIALA B"});
+  m.panel.Clear();
   CHECK(m.panel.FillObject(scene.Object(L"empty").Get(), true, true) == S_OK);
   CHECK(m.panel.FillObject(nullptr, true, true) == E_INVALIDARG);
   CHECK(m.panel.AddAttributeToContent(nullptr) == E_INVALIDARG);
