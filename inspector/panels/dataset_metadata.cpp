@@ -10,7 +10,9 @@
 #include "frame/geo/ParameterList.h"
 #include "frame/geo/catalogue_texts.h"
 #include "frame/geo/header_reader.h"
+#include "frame/geo/raster_chart_codes.h"
 #include "frame/settings/localised_texts.h"
+#include "inspector/format/raster_chart_rows.h"
 #include "inspector/panels/geo_object_rules.h"
 
 using Microsoft::WRL::ComPtr;
@@ -21,8 +23,11 @@ namespace {
 
 constexpr long kPropertyEmbeddedUpdate = 2;
 
+constexpr std::size_t kMaxRasterRecordBytes = 1u << 16;
+
 struct Target {
   ComPtr<IGeoDataSet> dataSet;
+  ComPtr<IGeoRasterDataSet> raster;
   bool library = false;
 };
 
@@ -37,8 +42,7 @@ bool IsDataSetIdentity(REFGUID id) {
 // The dataset the owner and identity stand for.
 HRESULT FindDataSet(IUnknown* owner, REFGUID id, Target& target) {
   ComPtr<IUnknown> unknown(owner);
-  ComPtr<IGeoRasterDataSet> raster;
-  if (SUCCEEDED(unknown.As(&raster))) return E_NOTIMPL;
+  if (SUCCEEDED(unknown.As(&target.raster)) && target.raster) return S_OK;
   ComPtr<IGeoLibraryDataSet> library;
   if (SUCCEEDED(unknown.As(&library))) {
     target.library = true;
@@ -140,6 +144,42 @@ HRESULT LibraryMetadata(IGeoDataSet* dataSet, const geo::AgencyTable* agencies, 
   return S_OK;
 }
 
+// The bytes of a record handed back in a VARIANT: an array of bytes, directly or by
+// reference; anything else, or a failing call, gives none.
+bool RecordBytes(HRESULT answer, VARIANT& record, std::vector<unsigned char>& bytes) {
+  bool read = false;
+  if (SUCCEEDED(answer)) {
+    if (record.vt == (VT_ARRAY | VT_UI1)) {
+      read = geo::ReadByteArray(record.parray, kMaxRasterRecordBytes, bytes);
+    } else if (record.vt == (VT_BYREF | VT_ARRAY | VT_UI1) && record.pparray != nullptr) {
+      read = geo::ReadByteArray(*record.pparray, kMaxRasterRecordBytes, bytes);
+    }
+  }
+  VariantClear(&record);
+  return read;
+}
+
+HRESULT RasterMetadata(IGeoRasterDataSet* raster, const geo::AgencyTable* agencies, std::vector<MetadataRow>& rows) {
+  VARIANT record;
+  VariantInit(&record);
+  std::vector<unsigned char> header;
+  if (!RecordBytes(raster->GetChartHeader(0, &record), record, header)) return E_FAIL;
+  VariantInit(&record);
+  std::vector<unsigned char> issue;
+  std::optional<double> issueDate;
+  if (RecordBytes(raster->GetChartIssueRecord(&record), record, issue)) {
+    issueDate = ParseRasterIssueDate(issue.data(), issue.size());
+  }
+  const RasterChart chart = ParseRasterChart(header.data(), header.size());
+  static const std::vector<geo::AgencyRow> kNoAgencies;
+  const std::string producer =
+      chart.producer ? geo::RasterAgencyText(agencies ? agencies->Rows() : kNoAgencies, *chart.producer,
+                                             geo::AgencyCodeVariant::Agency)
+                     : std::string();
+  rows = RasterChartRows(chart, issueDate, producer, SourcesFor(nullptr, agencies));
+  return S_OK;
+}
+
 }  // namespace
 
 HRESULT ReadDataSetMetadata(IUnknown* owner, REFGUID id, const geo::AgencyTable* agencies,
@@ -149,6 +189,7 @@ HRESULT ReadDataSetMetadata(IUnknown* owner, REFGUID id, const geo::AgencyTable*
   Target target;
   const HRESULT found = FindDataSet(owner, id, target);
   if (FAILED(found)) return found;
+  if (target.raster) return RasterMetadata(target.raster.Get(), agencies, rows);
   if (target.library) return LibraryMetadata(target.dataSet.Get(), agencies, rows);
 
   geo::ParameterList parameters;
@@ -166,6 +207,7 @@ HRESULT FormatDataSetMetadata(IUnknown* owner, REFGUID id, const geo::AgencyTabl
   Target target;
   const HRESULT found = FindDataSet(owner, id, target);
   if (FAILED(found)) return found;
+  if (target.raster) return E_NOTIMPL;  // the text form is a vector dataset's
   std::vector<MetadataRow> rows;
   if (target.library) {
     if (FAILED(LibraryMetadata(target.dataSet.Get(), agencies, rows))) return E_FAIL;

@@ -19,15 +19,17 @@
 
 namespace br::inspector {
 
-// Rows of an electronic chart dataset or a library dataset (the owner answers the
-// library interface). E_INVALIDARG for a null owner; E_FAIL without a dataset or with a
-// parameter array of the wrong form; E_NOTIMPL for a raster chart entry.
+// Rows of a raster chart entry (the owner answers the raster interface: the chart and its
+// panels), a library dataset (the owner answers the library interface) or an electronic
+// chart dataset. E_INVALIDARG for a null owner; E_FAIL without a dataset, with a
+// parameter array of the wrong form, or without a chart header record.
 HRESULT ReadDataSetMetadata(IUnknown* owner, REFGUID id, const geo::AgencyTable* agencies,
                             std::vector<MetadataRow>& rows);
 
 // The text form: caption, carriage return, value, carriage return, per row. A chart
 // dataset's rows come from the header record of the dataset the identity's last 8 bytes
-// name; a library's from its parameters. Errors as above.
+// name; a library's from its parameters. Errors as above; E_NOTIMPL for a raster chart
+// entry, which has no text form.
 HRESULT FormatDataSetMetadata(IUnknown* owner, REFGUID id, const geo::AgencyTable* agencies, std::string& text);
 
 }  // namespace br::inspector

@@ -44,7 +44,17 @@ const char* const kScene = R"({
                     "sourceId": "LB 1", "libraryEdition": 7, "editionDate": "2024-03-01",
                     "title": "metres", "27": {"BSTR": "LAT"}, "25": {"BSTR": "MSL"},
                     "29": {"BSTR": "WGS 84"}, "31": {"BSTR": "Mercator"}}},
-    {"id": "RASTER1", "type": "raster"}
+    {"id": "RASTER1", "type": "raster"},
+    {"id": "RASTER2", "type": "raster",
+     "chartHeader": {"size": 556, "fields": [
+       {"at": 0, "u32": 550}, {"at": 4, "text": "7401"}, {"at": 32, "text": "Goulet de Brest"},
+       {"at": 296, "u16": 2},
+       {"at": 300, "u16": 0}, {"at": 302, "u16": 1}, {"at": 304, "u16": 2}, {"at": 306, "text": "MC"},
+       {"at": 308, "i32": 50000}, {"at": 312, "f64": 48.5}, {"at": 320, "f64": 0}, {"at": 336, "text": "Rade"},
+       {"at": 428, "u16": 3}, {"at": 430, "u16": 2}, {"at": 432, "u16": 2}, {"at": 434, "text": "PG"},
+       {"at": 436, "i32": 10000}, {"at": 440, "f64": 48.25}, {"at": 448, "f64": -4.5},
+       {"at": 464, "text": "Port du Chateau"}]},
+     "chartIssue": {"size": 64, "fields": [{"at": 21, "date": "2023-03-01"}, {"at": 37, "date": "2021-06-15"}]}}
   ]}]
 })";
 
@@ -130,6 +140,32 @@ TEST_CASE("library metadata rows; the scale falls back to the file name") {
                           L"Level\t3", L"Source identification code\tLB 1", L"Edition date\t01.03.2024",
                           L"Edition number\t7", L"Depth Height Units\tmetres", L"Sounding Datum\tLAT",
                           L"Vertical Datum\tMSL", L"Horizontal Datum\tWGS 84", L"Projection\tMercator"});
+}
+
+TEST_CASE("a raster chart entry: the chart, then its panels under their headings") {
+  MetadataPanel fixture;
+  auto& m = fixture.m;
+  ScratchScene scene(kScene);
+  REQUIRE(m.panel.FillDataSetMetadata(scene.DataSet(L"RASTER2").Get(), GUID{}) == S_OK);
+  CHECK(m.Rows() == Names{L"Chart\t",
+                          L"Chart Number\t7401",
+                          L"Chart Title\tGoulet de Brest",
+                          L"File Issue Date\t15.06.2021",
+                          L"Main Panel (Chart 7401, Service hydrographique de la marine)\t",
+                          L"Plan Title\tRade",
+                          L"Scale\t50000",
+                          L"Sub-Panel Number 1 of 2\t",
+                          L"Projection\tMERCATOR\rLatitude: 48\u00B0 30'.000 N\rRotation: 0.0000000",
+                          L"Plan #3 (Chart 7401, Service hydrographique de la marine)\t",
+                          L"Plan Title\tPort du Chateau",
+                          L"Scale\t10000",
+                          L"Sub-Panel Number 2 of 2\t",
+                          L"Projection\tGNOMONIC\rLatitude: 48\u00B0 15'.000 N\rLongitude: 004\u00B0 30'.000 W"});
+  CHECK(m.Types()[0] == cAttrViewPanel_Tbl::kRowHeading);
+  CHECK(m.Types()[1] == cAttrViewPanel_Tbl::kRowAttribute);
+
+  std::string text;
+  CHECK(FormatDataSetMetadata(scene.DataSet(L"RASTER2").Get(), GUID{}, nullptr, text) == E_NOTIMPL);
 }
 
 TEST_CASE("the text form of a dataset's metadata for a zero-prefixed identity") {
