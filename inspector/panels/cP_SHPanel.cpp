@@ -151,6 +151,18 @@ void cP_SHPanel::AddObjectAttributes(IGeoObject* object) {
     chart = true;
     informed = LongProperty(object, kPropertyInformed) == kProperty500Informed;
   }
+  // The object owns every attribute listed: its catalogue answers for all of them.
+  ComPtr<IGeoCatalog> catalogue = CatalogueOf(dataSet.Get());
+  const auto unprintable = [&](long code) {
+    if (settings_.skipUnprintableTest) return false;
+    long flags = 0;
+    const HRESULT hr = catalogue ? catalogue->GetAttributeFlags(code, &flags) : E_NOINTERFACE;
+    if (FAILED(hr)) {
+      LogFailure(settings_, "IsUNPRINTABLE", __LINE__, hr);
+      return false;
+    }
+    return (flags & kCatalogueHiddenBit) != 0;
+  };
 
   ComPtr<IGeoObjectEnum> attributes;
   if (FAILED(object->GetAttributes(&attributes)) || !attributes) return;
@@ -159,13 +171,13 @@ void cP_SHPanel::AddObjectAttributes(IGeoObject* object) {
     ComPtr<IGeoAttribute> attribute;
     long code = 0;
     if (FAILED(item->QueryInterface(IID_IGeoAttribute, reinterpret_cast<void**>(attribute.GetAddressOf()))) ||
-        IsUnprintable(attribute.Get()) || FAILED(attribute->GetCode(&code))) {
+        FAILED(attribute->GetCode(&code)) || unprintable(code)) {
       return true;
     }
     if (chart) {
       codes.push_back(code);
     } else {
-      AddPrintableAttribute(attribute.Get());
+      AddPrintableAttribute(attribute.Get(), false);
     }
     return true;
   });
@@ -173,7 +185,7 @@ void cP_SHPanel::AddObjectAttributes(IGeoObject* object) {
   for (long code : OrderChartAttributeCodes(codes, informed)) {
     ComPtr<IGeoAttribute> attribute;
     // The codes were tested as they were listed.
-    if (object->GetAttribute(code, &attribute) == S_OK && attribute) AddPrintableAttribute(attribute.Get());
+    if (object->GetAttribute(code, &attribute) == S_OK && attribute) AddPrintableAttribute(attribute.Get(), true);
   }
 }
 
@@ -213,18 +225,23 @@ bool cP_SHPanel::IsUnprintable(IGeoAttribute* attribute) const {
 HRESULT cP_SHPanel::AddAttributeToContent(IGeoAttribute* attribute) {
   if (attribute == nullptr) return E_INVALIDARG;
   if (IsUnprintable(attribute)) return S_FALSE;
-  return AddPrintableAttribute(attribute);
+  return AddPrintableAttribute(attribute, std::nullopt);
 }
 
-HRESULT cP_SHPanel::AddPrintableAttribute(IGeoAttribute* attribute) {
+HRESULT cP_SHPanel::AddPrintableAttribute(IGeoAttribute* attribute, std::optional<bool> chartOwner) {
   long code = 0;
   HRESULT hr = attribute->GetCode(&code);
   if (FAILED(hr)) {
     LogFailure(settings_, "_AddAttributeToContent", __LINE__, hr);
     return hr;
   }
-  const std::optional<GUID> kind = OwnerKindOf(attribute);
-  const bool chart = kind && IsChartKind(*kind);
+  bool chart = false;
+  if (chartOwner) {
+    chart = *chartOwner;
+  } else {
+    const std::optional<GUID> kind = OwnerKindOf(attribute);
+    chart = kind && IsChartKind(*kind);
+  }
 
   // Magnetic variation is written here, whatever the formatter makes of it.
   std::optional<std::string> variation;

@@ -17,6 +17,7 @@
 
 #include <windows.h>
 
+#include <optional>
 #include <string>
 
 #include "GeoData.h"
@@ -82,8 +83,9 @@ protected:
 
 private:
   void SetUp(bool twoColumns);
-  // AddAttributeToContent for an attribute already found printable.
-  HRESULT AddPrintableAttribute(IGeoAttribute* attribute);
+  // AddAttributeToContent for an attribute already found printable; whether its owner is
+  // of the chart-database kind, when the caller knows.
+  HRESULT AddPrintableAttribute(IGeoAttribute* attribute, std::optional<bool> chartOwner);
   void AddObjectAttributes(IGeoObject* object);
 
   const PanelSettings& settings_;
