@@ -1,7 +1,6 @@
 #include "inspector/panels/cP_SHPanel.h"
 
 #include <algorithm>
-#include <utility>
 #include <vector>
 
 #include <wrl/client.h>

@@ -106,6 +106,19 @@ TEST_CASE("attribute table: the name first, the information second, values clean
   CHECK(m.Rows() == Names{L"Object name\tBuoy 2", L"Information\tPass\rwest"});
   REQUIRE(m.panel.FillObject(scene.Object(L"referenced").Get(), false, false) == S_OK);
   CHECK(m.Rows() == Names{L"Object name\tBuoy 2", L"Information\tPass\rwest", L"Object name\tBuoy 3"});
+
+  // One attribute at a time: an unprintable one and an internal reference add nothing.
+  Microsoft::WRL::ComPtr<IGeoAttribute> scale, reference, colour;
+  REQUIRE(scene.Object(L"buoy")->GetAttribute(133, &scale) == S_OK);
+  REQUIRE(scene.Object(L"referenced")->GetAttribute(102, &reference) == S_OK);
+  REQUIRE(scene.Object(L"buoy")->GetAttribute(75, &colour) == S_OK);
+  CHECK(m.panel.IsUnprintable(scale.Get()));
+  CHECK_FALSE(m.panel.IsUnprintable(colour.Get()));
+  CHECK(m.panel.AddAttributeToContent(scale.Get()) == S_FALSE);
+  CHECK(m.panel.AddAttributeToContent(reference.Get()) == S_FALSE);
+  CHECK(m.panel.AddAttributeToContent(colour.Get()) == S_OK);
+  CHECK(m.Rows().size() == 4);
+  CHECK(m.Rows().back() == L"Colour\tred\rwhite");
 }
 
 TEST_CASE("magnetic variation is written with its hemisphere, whatever the formatter says") {
