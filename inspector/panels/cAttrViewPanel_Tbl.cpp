@@ -43,11 +43,14 @@ bool cAttrViewPanel_Tbl::DrawCell(HDC dc, const RECT& rect, int column, int row)
   if (row < 0) return false;
   const int type = RowType(row);
   if (type != kRowHeading && type != kRowAttribute) return false;
-  FillRect(dc, &rect, GetSysColorBrush(COLOR_WINDOW));
-  if (type == kRowHeading && column != kNameColumn) return true;  // the name cell spans the row
-  RECT text = rect;
+  // A heading spans the row: its name cell (drawn first) paints it all, the value cell
+  // leaves it be.
+  if (type == kRowHeading && column != kNameColumn) return true;
+  RECT area = rect;
+  if (type == kRowHeading) area.right = std::max(area.right, static_cast<LONG>(table().getClientRect().right));
+  FillRect(dc, &area, GetSysColorBrush(COLOR_WINDOW));
+  RECT text = area;
   text.left += type == kRowHeading ? 4 : 8;
-  if (type == kRowHeading) text.right = std::max(text.right, static_cast<LONG>(table().getClientRect().right));
   std::string cell = table().getCellText(row, column);
   std::replace(cell.begin(), cell.end(), '\r', ' ');
   SetBkMode(dc, TRANSPARENT);

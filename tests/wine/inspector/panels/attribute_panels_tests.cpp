@@ -138,6 +138,18 @@ TEST_CASE("related objects follow under their headings by label; lights and serv
   CHECK(m.Rows() == Names{L"Landmark Tower\t", L"Object name\tTower", L"Buoy, lateral Alpha\t",
                           L"Object name\tAlpha", L"Buoy, lateral Zulu\t", L"Object name\tZulu"});
 
+  // Drawn: headings in the highlight colour across the row, attributes in the text colour.
+  const toolkit::Table& table = m.panel.table();
+  wtest::Canvas canvas(500, 380, RGB(1, 2, 3));
+  m.panel.table().paint(canvas.dc());
+  const COLORREF heading = GetSysColor(COLOR_HIGHLIGHT);
+  const RECT firstHeading = table.getCellRect(-1, 0);
+  const RECT firstAttribute = table.getCellRect(-1, 1);
+  CHECK(canvas.countIn(heading, firstHeading) > 0);
+  CHECK(canvas.countIn(heading, firstAttribute) == 0);
+  CHECK(canvas.countIn(GetSysColor(COLOR_WINDOWTEXT), firstAttribute) > 0);
+  CHECK(canvas.countIn(RGB(1, 2, 3), firstHeading) == 0);  // the whole row is painted
+
   // Without related objects there is no heading at all.
   m.panel.Clear();
   REQUIRE(m.panel.FillObject(scene.Object(L"tower").Get(), true, false) == S_OK);
@@ -152,6 +164,21 @@ TEST_CASE("stacked text panel: heading, name and value rows one under the other"
   REQUIRE(m.panel.FillObject(scene.Object(L"shop").Get(), false, true) == S_OK);
   CHECK(m.Rows() == Names{L"Service", L"Chandlery", L"Information", L"Open 8:00-19:00\rclosed Sunday"});
   CHECK(m.Types() == std::vector<int>{2000, 3000, 2000, 3000});
+
+  // Names indented 30 pixels, values 60.
+  wtest::Canvas canvas(500, 380, RGB(1, 2, 3));
+  m.panel.table().paint(canvas.dc());
+  const COLORREF ink = GetSysColor(COLOR_WINDOWTEXT);
+  const auto inkIn = [&](int row, LONG from, LONG to) {
+    RECT area = m.panel.table().getCellRect(-1, row);
+    area.left = from;
+    area.right = to;
+    return canvas.countIn(ink, area);
+  };
+  CHECK(inkIn(0, 0, 30) == 0);
+  CHECK(inkIn(0, 30, 200) > 0);
+  CHECK(inkIn(1, 0, 60) == 0);
+  CHECK(inkIn(1, 60, 200) > 0);
 
   m.panel.Clear();
   REQUIRE(m.panel.FillObject(scene.Object(L"tower").Get(), true, true) == S_OK);
