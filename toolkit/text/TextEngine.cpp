@@ -7,6 +7,21 @@
 #include "toolkit/text/logic/line_filling.h"
 
 namespace toolkit {
+namespace {
+
+// The script processor's break properties over those of the portable rules: its
+// soft breaks and blanks win, but a unit either of them keeps inside a cluster
+// stays there (some scripts' marks are reported as character stops).
+void mergeBreaks(text::CharBreak* chars, int count, const SCRIPT_LOGATTR* attributes) {
+  for (int i = 0; i < count; ++i) {
+    const SCRIPT_LOGATTR& a = attributes[i];
+    chars[i].clusterStart = chars[i].clusterStart && a.fCharStop;
+    chars[i].softBreak = chars[i].clusterStart && a.fSoftBreak;
+    chars[i].whiteSpace = a.fWhiteSpace != 0;
+  }
+}
+
+}  // namespace
 
 // The fixed working arrays: a line's glyphs share one set, a paragraph's items
 // another; per-unit arrays serve the one run being shaped or broken.
@@ -255,18 +270,23 @@ int TextEngine::drawShaped(Paragraph& p, int start, int end) {
       continue;
     }
     // The run passes the limit: its first part ends the line.
-    const int fit = fitShapedRun(p, runs_[i], p.limit - p.lineWidth, p.lineCount == 0);
-    if (fit == 0) {
-      flushLine(p);
-      continue;
-    }
-    if (fit < runs_[i].length) {
+    int fit = fitShapedRun(p, runs_[i], p.limit - p.lineWidth, p.lineCount == 0);
+    for (int attempt = 0; fit > 0 && fit < runs_[i].length && attempt < 4; ++attempt) {
       splitRun(i, fit);
       hr = shapeRun(p, runs_[i], p.glyphsUsed);
       if (FAILED(hr)) {
         if (p.lineCount > 0) flushLine(p);
         return runs_[i].start;
       }
+      // Placed wider than its logical widths told (marks, overhangs): cut again
+      // with that much less room.
+      const int excess = p.lineWidth + runs_[i].width - p.limit;
+      if (excess <= 0) break;
+      fit = fitShapedRun(p, runs_[i], p.limit - p.lineWidth - excess, p.lineCount == 0);
+    }
+    if (fit == 0) {
+      flushLine(p);
+      continue;
     }
     b.lineRuns[p.lineCount++] = static_cast<int>(i);
     p.lineWidth += runs_[i].width;
@@ -308,14 +328,9 @@ bool TextEngine::itemize(Paragraph& p, int start, int end) {
         // Too long to shape at once: cut at a blank, else between clusters.
         const int window = std::min(piece, kBufferSize);
         SCRIPT_ANALYSIS analysis = items[k].a;
-        if (SUCCEEDED(e.breakText(p.text.data() + at, window, &analysis, b.logicalAttributes))) {
-          for (int i = 0; i < window; ++i) {
-            const SCRIPT_LOGATTR& a = b.logicalAttributes[i];
-            b.chars[i] = text::CharBreak{0, a.fSoftBreak != 0, a.fWhiteSpace != 0, a.fCharStop != 0};
-          }
-        } else {
-          text::markBreaks(p.text.data() + at, static_cast<std::size_t>(window), b.chars);
-        }
+        const wchar_t* units = p.text.data() + at;
+        text::markBreaks(units, static_cast<std::size_t>(window), b.chars);
+        if (SUCCEEDED(e.breakText(units, window, &analysis, b.logicalAttributes))) mergeBreaks(b.chars, window, b.logicalAttributes);
         piece = static_cast<int>(text::splitPoint(b.chars, window, kMaxRunUnits));
         if (piece <= 0) piece = kMaxRunUnits;
       }
@@ -324,6 +339,21 @@ bool TextEngine::itemize(Paragraph& p, int start, int end) {
       run.length = piece;
       run.analysis = items[k].a;
       run.slot = current_;
+      // Marks with nothing to sit on (bad input, or a blank before them in another
+      // item) go in a run of their own, unshaped: mark positioning without a base
+      // glyph is where script processors fail.
+      int marks = 0;
+      while (marks < piece && text::continuesCluster(u' ', static_cast<char16_t>(p.text[at + marks]))) ++marks;
+      if (marks > 0 && marks < piece) {
+        Run bare = run;
+        bare.length = marks;
+        bare.analysis.eScript = SCRIPT_UNDEFINED;
+        runs_.push_back(bare);
+        run.start += marks;
+        run.length -= marks;
+      } else if (marks == piece) {
+        run.analysis.eScript = SCRIPT_UNDEFINED;
+      }
       runs_.push_back(run);
       at += piece;
     }
@@ -373,14 +403,11 @@ int TextEngine::fitShapedRun(Paragraph& p, const Run& run, int room, bool firstO
   Buffers& b = *buffers_;
   const wchar_t* units = p.text.data() + run.start;
   SCRIPT_ANALYSIS analysis = run.analysis;
-  if (SUCCEEDED(e.breakText(units, run.length, &analysis, b.logicalAttributes))) {
-    for (int i = 0; i < run.length; ++i) {
-      const SCRIPT_LOGATTR& a = b.logicalAttributes[i];
-      b.chars[i] = text::CharBreak{0, a.fSoftBreak != 0, a.fWhiteSpace != 0, a.fCharStop != 0};
-    }
-  } else {
-    text::markBreaks(units, static_cast<std::size_t>(run.length), b.chars);
-  }
+  text::markBreaks(units, static_cast<std::size_t>(run.length), b.chars);
+  if (SUCCEEDED(e.breakText(units, run.length, &analysis, b.logicalAttributes))) mergeBreaks(b.chars, run.length, b.logicalAttributes);
+  // Units that shaping put in one glyph cluster stay together too.
+  for (int i = 1; i < run.length; ++i)
+    if (b.clusters[i] == b.clusters[i - 1]) b.chars[i].clusterStart = false;
   if (SUCCEEDED(e.getLogicalWidths(&run.analysis, run.length, run.glyphCount, b.advances + run.glyphStart,
                                    b.clusters, b.visualAttributes + run.glyphStart, b.widths))) {
     for (int i = 0; i < run.length; ++i) b.chars[i].width = b.widths[i];

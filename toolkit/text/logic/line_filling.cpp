@@ -9,10 +9,13 @@ std::size_t fitRun(const CharBreak* chars, std::size_t count, int room, bool fir
   while (fit < count && used + chars[fit].width <= room) used += chars[fit++].width;
   if (fit == count) return count;
 
-  // A blank at the limit: the line ends after the blanks, which hang past it.
+  // A blank at the limit: the line ends after the blanks, which hang past it,
+  // unless the last of them carries marks: then before that one.
   if (chars[fit].whiteSpace) {
-    while (fit < count && chars[fit].whiteSpace) ++fit;
-    return fit;
+    std::size_t end = fit;
+    while (end < count && chars[end].whiteSpace) ++end;
+    while (end > 0 && end < count && !chars[end].clusterStart) --end;
+    if (end > 0) return end;
   }
 
   // Pass 2: back to the last soft break among the units that fit.

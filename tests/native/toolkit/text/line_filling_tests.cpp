@@ -39,6 +39,10 @@ TEST_CASE("fitRun cuts a run at the width limit") {
   SUBCASE("blanks at the limit hang past it") {
     CHECK(Fit(u"north   harbour", 50) == 8);
     CHECK(Fit(u"north   harbour", 60) == 8);
+    // A mark on the last blank: the cut goes before that blank, never between them.
+    CHECK(Fit(u"abc \u0301x", 35) == 3);
+    CHECK(Fit(u"abc  \u0301x", 35) == 4);
+    CHECK(Fit(u" \u0301x", 5, false) == 0);
   }
   SUBCASE("a word wider than the line: the clusters that fit, at least one") {
     CHECK(Fit(u"Hafenbecken", 35) == 3);
