@@ -451,7 +451,8 @@ void TextEngine::flushLine(Paragraph& p) {
     }
     widest_ = std::max(widest_, run.width);
     layout_.push_back(PlacedRun{run.start, run.length, lines_, x, run.width,
-                                static_cast<int>(run.analysis.s.uBidiLevel), run.slot, true});
+                                static_cast<int>(run.analysis.s.uBidiLevel), run.slot,
+                                static_cast<int>(run.analysis.eScript), true});
   }
   if (wrap_) {
     p.y += p.lineHeight;
@@ -476,7 +477,7 @@ void TextEngine::drawPlain(Paragraph& p, int start, int end) {
     if (!GetTextExtentPoint32W(p.dc, units + start, n, &size)) size = SIZE{0, 0};
     if (!measureOnly_) ExtTextOutW(p.dc, p.rect.left + p.x, p.y, 0, nullptr, units + start, static_cast<UINT>(n), nullptr);
     widest_ = std::max(widest_, static_cast<int>(size.cx));
-    layout_.push_back(PlacedRun{start, n, lines_, p.x, static_cast<int>(size.cx), 0, slot, false});
+    layout_.push_back(PlacedRun{start, n, lines_, p.x, static_cast<int>(size.cx), 0, slot, 0, false});
     p.x += size.cx;
     p.openLine = true;
     return;
@@ -512,7 +513,7 @@ void TextEngine::drawPlain(Paragraph& p, int start, int end) {
     const int lineWidth = b.widths[n - 1];
     if (!measureOnly_) ExtTextOutW(p.dc, p.rect.left, p.y, 0, nullptr, units + at, static_cast<UINT>(n), nullptr);
     widest_ = std::max(widest_, lineWidth);
-    layout_.push_back(PlacedRun{at, n, lines_, 0, lineWidth, 0, slot, false});
+    layout_.push_back(PlacedRun{at, n, lines_, 0, lineWidth, 0, slot, 0, false});
     p.y += p.lineHeight;
     ++lines_;
     at += n;

@@ -40,6 +40,7 @@ public:
     int width = 0;
     int level = 0;     // bidirectional embedding level (0 without shaping)
     int slot = -1;     // font slot it was drawn with; -1 for the DC's font
+    int script = 0;    // the script processor's script id; 0 when drawn unshaped
     bool shaped = false;  // through the script processor (else plain GDI)
   };
 

@@ -261,3 +261,29 @@ TEST_CASE("text that begins with a mark or holds lone surrogates is drawn whole"
     }
   }
 }
+
+TEST_CASE("Arabic, Hebrew, Thai, Devanagari, Chinese and Hangul are shaped with the fonts that cover them") {
+  struct Sample {
+    const wchar_t* face;
+    std::wstring text;
+  };
+  const Sample samples[] = {
+      {kArabicFace, kArabicWord1},
+      {kArabicFace, L"\u05E0\u05DE\u05DC \u05D7\u05D9\u05E4\u05D4"},
+      {kThaiFace, kThai.substr(0, 12)},
+      {kDevanagariFace, L"\u092e\u0941\u0902\u092c\u0908 \u092c\u0902\u0926\u0930\u0917\u093e\u0939"},
+      {kCjkFace, kCjk.substr(0, 6)},
+      {kCjkFace, L"\ubd80\uc0b0\ud56d"},
+  };
+  for (const Sample& sample : samples) {
+    REQUIRE(HasFace(sample.face));
+    EngineOnCanvas e(sample.face, true);
+    CHECK(e.Draw(sample.text, 500) == 1);
+    CheckCovers(e.engine.lastLayout(), 0, static_cast<int>(sample.text.size()));
+    for (const auto& run : e.engine.lastLayout()) {
+      CAPTURE(run.start);
+      CHECK(run.shaped);
+      if (sample.text[run.start] != L' ') CHECK(run.script != 0);  // not the unshaped fallback
+    }
+  }
+}
