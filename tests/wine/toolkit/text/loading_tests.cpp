@@ -10,6 +10,7 @@
 #include <string>
 #include <vector>
 
+#include "tests/wine/toolkit/text/planted_script_library.h"
 #include "tests/wine/toolkit/text/text_test_support.h"
 #include "toolkit/text/TextEngine.h"
 
@@ -95,7 +96,7 @@ TEST_CASE("the script processor is loaded from the system folder with its twelve
 TEST_CASE("a planted library beside the host or in the current directory is never loaded" *
           doctest::skip(kInChild)) {
   const std::wstring host = Folder(ModulePath(nullptr));
-  const std::wstring plant = host + L"\\br_planted_usp10.dll";
+  const std::wstring plant = host + L"\\" + kPlantedLibrary;
   REQUIRE(GetFileAttributesW(plant.c_str()) != INVALID_FILE_ATTRIBUTES);
   CurrentFolder current;
   REQUIRE(current.Plant(plant, L"usp10.dll"));
@@ -103,13 +104,13 @@ TEST_CASE("a planted library beside the host or in the current directory is neve
 
   TextEngine engine(false);
   // Beside the host and in the current directory only: not found.
-  CHECK_FALSE(engine.loadScriptLibrary(L"br_planted_usp10.dll"));
+  CHECK_FALSE(engine.loadScriptLibrary(kPlantedLibrary));
   CHECK_FALSE(engine.loadScriptLibrary(L"br_cwd_usp10.dll"));
-  CHECK(GetModuleHandleW(L"br_planted_usp10.dll") == nullptr);
+  CHECK(GetModuleHandleW(kPlantedLibrary) == nullptr);
   CHECK(GetModuleHandleW(L"br_cwd_usp10.dll") == nullptr);
   // The real name: the system's library, not the plant in the current directory.
   REQUIRE(engine.loadScriptLibrary(L"usp10.dll"));
-  const bool systemIsPlant = GetProcAddress(engine.scriptModule(), "BrPlantedMarker") != nullptr;
+  const bool systemIsPlant = GetProcAddress(engine.scriptModule(), kPlantedMarker) != nullptr;
   CHECK_FALSE(systemIsPlant);
   CHECK(SameFolder(Folder(ModulePath(engine.scriptModule())), SystemFolder()));
 
@@ -117,7 +118,7 @@ TEST_CASE("a planted library beside the host or in the current directory is neve
   HMODULE naive = LoadLibraryW(L"br_cwd_usp10.dll");
   CHECK(naive != nullptr);
   if (naive) {
-    const bool naiveIsPlant = GetProcAddress(naive, "BrPlantedMarker") != nullptr;
+    const bool naiveIsPlant = GetProcAddress(naive, kPlantedMarker) != nullptr;
     CHECK(naiveIsPlant);
     FreeLibrary(naive);
   }

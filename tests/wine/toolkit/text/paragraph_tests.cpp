@@ -147,16 +147,20 @@ TEST_CASE("1500-unit paragraphs lose nothing") {
   const std::wstring oneWord(1500, L'x');
   std::wstring marks;
   while (marks.size() < 1500) marks += L"e\u0301";
+  std::wstring alternating;  // about 1000 items: more than the item buffer holds
+  while (alternating.size() < 1500) alternating += L"a\u05d0 ";
+  alternating.resize(1500);
 
   for (const Mode& mode : kModes) {
     CAPTURE(mode.name);
-    const std::wstring* texts[] = {&mixed, &oneWord, &marks};
+    const std::wstring* texts[] = {&mixed, &oneWord, &marks, &alternating};
     for (const std::wstring* text : texts) {
       EngineOnCanvas e(kArabicFace, mode.scripts, 400, 100);
       e.engine.setMeasureOnly(true);
       const int lines = e.Draw(*text, 300);
       CheckCovers(e.engine.lastLayout(), 0, 1500);
       CHECK(lines > 1);
+      if (text == &alternating && mode.scripts) CHECK(e.engine.lastLayout().size() >= TextEngine::kBufferSize);
       for (const auto& run : e.engine.lastLayout()) {
         CHECK(run.length <= TextEngine::kMaxRunUnits);
         if (run.start > 0) CHECK_FALSE(toolkit::text::continuesCluster((*text)[run.start - 1], (*text)[run.start]));

@@ -2,6 +2,8 @@
 // that tells the suite the plant, not the system's library, was loaded.
 #include <windows.h>
 
+#include "tests/wine/toolkit/text/planted_script_library.h"
+
 #define BR_PLANTED(name) \
   extern "C" __declspec(dllexport) HRESULT name() { return E_FAIL; }
 
@@ -18,4 +20,5 @@ BR_PLANTED(ScriptStringFree)
 BR_PLANTED(ScriptString_pSize)
 BR_PLANTED(ScriptStringAnalyse)
 
+// Named as kPlantedMarker says.
 extern "C" __declspec(dllexport) int BrPlantedMarker() { return 1; }
