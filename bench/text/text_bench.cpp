@@ -19,11 +19,16 @@ using Clock = std::chrono::steady_clock;
 
 std::wstring MixedParagraph(std::size_t length) {
   const wchar_t* const words[] = {
-      L"Brest",                                              L"tide",
-      L"\u0645\u064A\u0646\u0627\u0621",                     L"\u05E0\u05DE\u05DC",
-      L"\u0e17\u0e48\u0e32\u0e40\u0e23\u0e37\u0e2d",         L"\u092c\u0902\u0926\u0930\u0917\u093e\u0939",
-      L"\u4e0a\u6d77\u6e2f\u53e3",                           L"\ubd80\uc0b0\ud56d",
-      L"12:45",                                              L"high water 6.2 m",
+      L"Brest",
+      L"tide",
+      L"\u0645\u064A\u0646\u0627\u0621",
+      L"\u05E0\u05DE\u05DC",
+      L"\u0e17\u0e48\u0e32\u0e40\u0e23\u0e37\u0e2d",
+      L"\u092c\u0902\u0926\u0930\u0917\u093e\u0939",
+      L"\u4e0a\u6d77\u6e2f\u53e3",
+      L"\ubd80\uc0b0\ud56d",
+      L"12:45",
+      L"high water 6.2 m",
   };
   std::wstring text;
   for (std::size_t i = 0; text.size() < length; ++i) {

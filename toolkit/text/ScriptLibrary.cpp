@@ -41,8 +41,7 @@ bool ScriptLibrary::load(const wchar_t* fileName) {
 
   ScriptEntryPoints& e = entry_;
   available_ = find(module_, "ScriptItemize", e.itemize) && find(module_, "ScriptShape", e.shape) &&
-               find(module_, "ScriptPlace", e.place) &&
-               find(module_, "ScriptGetLogicalWidths", e.getLogicalWidths) &&
+               find(module_, "ScriptPlace", e.place) && find(module_, "ScriptGetLogicalWidths", e.getLogicalWidths) &&
                find(module_, "ScriptBreak", e.breakText) && find(module_, "ScriptLayout", e.layout) &&
                find(module_, "ScriptStringOut", e.stringOut) && find(module_, "ScriptTextOut", e.textOut) &&
                find(module_, "ScriptFreeCache", e.freeCache) && find(module_, "ScriptStringFree", e.stringFree) &&

@@ -53,9 +53,9 @@ struct TextEngine::Paragraph {
   bool rtl;
   HGDIOBJ originalFont = nullptr;
   HFONT selected = nullptr;
-  int x = 0;               // where the next line part starts (unwrapped paragraphs go on)
-  bool openLine = false;   // an unwrapped line has parts and still needs its y step
-  int lineCount = 0;       // runs on the line being filled
+  int x = 0;              // where the next line part starts (unwrapped paragraphs go on)
+  bool openLine = false;  // an unwrapped line has parts and still needs its y step
+  int lineCount = 0;      // runs on the line being filled
   int lineWidth = 0;
   int glyphsUsed = 0;
 };
@@ -95,8 +95,10 @@ void TextEngine::releaseSlotFont(int slot) {
     int other = -1;
     for (int j = 0; j < kSlots; ++j)
       if (j != slot && slots_[j].font == s.font) other = j;
-    if (other >= 0) slots_[other].owned = true;
-    else DeleteObject(s.font);
+    if (other >= 0)
+      slots_[other].owned = true;
+    else
+      DeleteObject(s.font);
   }
   s.font = nullptr;
   s.owned = false;
@@ -204,7 +206,12 @@ void TextEngine::drawParagraph(HDC dc, std::wstring_view text, int& y, const REC
   }
 
   const UINT align = GetTextAlign(dc);
-  Paragraph p{dc, text, rect, y, lineHeight, static_cast<int>(std::min<long long>(width, INT_MAX)),
+  Paragraph p{dc,
+              text,
+              rect,
+              y,
+              lineHeight,
+              static_cast<int>(std::min<long long>(width, INT_MAX)),
               (align & TA_RTLREADING) != 0};
   const int end = start + length;
   int reached = start;
@@ -330,7 +337,8 @@ bool TextEngine::itemize(Paragraph& p, int start, int end) {
         SCRIPT_ANALYSIS analysis = items[k].a;
         const wchar_t* units = p.text.data() + at;
         text::markBreaks(units, static_cast<std::size_t>(window), b.chars);
-        if (SUCCEEDED(e.breakText(units, window, &analysis, b.logicalAttributes))) mergeBreaks(b.chars, window, b.logicalAttributes);
+        if (SUCCEEDED(e.breakText(units, window, &analysis, b.logicalAttributes)))
+          mergeBreaks(b.chars, window, b.logicalAttributes);
         piece = static_cast<int>(text::splitPoint(b.chars, window, kMaxRunUnits));
         if (piece <= 0) piece = kMaxRunUnits;
       }
@@ -372,8 +380,8 @@ HRESULT TextEngine::shapeRun(Paragraph& p, Run& run, int glyphStart) {
   int count = 0;
   auto shape = [&](int slot) {
     selectRunFont(p, slot);
-    return e.shape(p.dc, &slots_[slot].cache, units, run.length, room, &run.analysis, b.glyphs + glyphStart,
-                   b.clusters, b.visualAttributes + glyphStart, &count);
+    return e.shape(p.dc, &slots_[slot].cache, units, run.length, room, &run.analysis, b.glyphs + glyphStart, b.clusters,
+                   b.visualAttributes + glyphStart, &count);
   };
   HRESULT hr = shape(run.slot);
   if (hr == USP_E_SCRIPT_NOT_IN_FONT && run.slot != 0 && slots_[0].font) {
@@ -404,12 +412,13 @@ int TextEngine::fitShapedRun(Paragraph& p, const Run& run, int room, bool firstO
   const wchar_t* units = p.text.data() + run.start;
   SCRIPT_ANALYSIS analysis = run.analysis;
   text::markBreaks(units, static_cast<std::size_t>(run.length), b.chars);
-  if (SUCCEEDED(e.breakText(units, run.length, &analysis, b.logicalAttributes))) mergeBreaks(b.chars, run.length, b.logicalAttributes);
+  if (SUCCEEDED(e.breakText(units, run.length, &analysis, b.logicalAttributes)))
+    mergeBreaks(b.chars, run.length, b.logicalAttributes);
   // Units that shaping put in one glyph cluster stay together too.
   for (int i = 1; i < run.length; ++i)
     if (b.clusters[i] == b.clusters[i - 1]) b.chars[i].clusterStart = false;
-  if (SUCCEEDED(e.getLogicalWidths(&run.analysis, run.length, run.glyphCount, b.advances + run.glyphStart,
-                                   b.clusters, b.visualAttributes + run.glyphStart, b.widths))) {
+  if (SUCCEEDED(e.getLogicalWidths(&run.analysis, run.length, run.glyphCount, b.advances + run.glyphStart, b.clusters,
+                                   b.visualAttributes + run.glyphStart, b.widths))) {
     for (int i = 0; i < run.length; ++i) b.chars[i].width = b.widths[i];
   } else {
     for (int i = 0; i < run.length; ++i) b.chars[i].width = run.width / run.length;
@@ -475,7 +484,8 @@ void TextEngine::drawPlain(Paragraph& p, int start, int end) {
     const int n = end - start;
     SIZE size{};
     if (!GetTextExtentPoint32W(p.dc, units + start, n, &size)) size = SIZE{0, 0};
-    if (!measureOnly_) ExtTextOutW(p.dc, p.rect.left + p.x, p.y, 0, nullptr, units + start, static_cast<UINT>(n), nullptr);
+    if (!measureOnly_)
+      ExtTextOutW(p.dc, p.rect.left + p.x, p.y, 0, nullptr, units + start, static_cast<UINT>(n), nullptr);
     widest_ = std::max(widest_, static_cast<int>(size.cx));
     layout_.push_back(PlacedRun{start, n, lines_, p.x, static_cast<int>(size.cx), 0, slot, 0, false});
     p.x += size.cx;

@@ -38,9 +38,9 @@ public:
     int line = 0;    // 0 for the paragraph's first line
     int x = 0;       // from the rectangle's left
     int width = 0;
-    int level = 0;     // bidirectional embedding level (0 without shaping)
-    int slot = -1;     // font slot it was drawn with; -1 for the DC's font
-    int script = 0;    // the script processor's script id; 0 when drawn unshaped
+    int level = 0;        // bidirectional embedding level (0 without shaping)
+    int slot = -1;        // font slot it was drawn with; -1 for the DC's font
+    int script = 0;       // the script processor's script id; 0 when drawn unshaped
     bool shaped = false;  // through the script processor (else plain GDI)
   };
 
@@ -89,8 +89,7 @@ public:
   // into lines no wider than the rectangle, and advances y by lineHeight per line.
   // start and length are clamped to the text; an empty paragraph or a rectangle
   // of no width only advances y by one line.
-  void drawParagraph(HDC dc, std::wstring_view text, int& y, const RECT& rect, int start, int length,
-                     int lineHeight);
+  void drawParagraph(HDC dc, std::wstring_view text, int& y, const RECT& rect, int start, int length, int lineHeight);
 
   // What the last drawParagraph put where, in drawing order, and how many lines.
   const std::vector<PlacedRun>& lastLayout() const { return layout_; }

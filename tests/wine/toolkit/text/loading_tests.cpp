@@ -93,8 +93,7 @@ TEST_CASE("the script processor is loaded from the system folder with its twelve
   }
 }
 
-TEST_CASE("a planted library beside the host or in the current directory is never loaded" *
-          doctest::skip(kInChild)) {
+TEST_CASE("a planted library beside the host or in the current directory is never loaded" * doctest::skip(kInChild)) {
   const std::wstring host = Folder(ModulePath(nullptr));
   const std::wstring plant = host + L"\\" + kPlantedLibrary;
   REQUIRE(GetFileAttributesW(plant.c_str()) != INVALID_FILE_ATTRIBUTES);

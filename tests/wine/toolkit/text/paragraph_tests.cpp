@@ -249,10 +249,12 @@ TEST_CASE("a run the slot's font cannot shape falls back to slot 0's font") {
 TEST_CASE("text that begins with a mark or holds lone surrogates is drawn whole") {
   REQUIRE(HasFace(kThaiFace));
   const std::wstring texts[] = {
-      L"\u0e49\u0e33\u0e40\u0e08\u0e49\u0e32 \u0e48\u0e48\u0e48",     // Thai tone marks first
-      L"\u064e\u0645\u064e \u0651\u0651",                                   // Arabic marks first
-      L"\u094d\u0915\u094d \u093e",                                          // Devanagari virama first
-      std::wstring(L"a\xdc00" L"b\xd800 c\xd800\xd800 \xdfff", 11),  // lone halves of pairs
+      L"\u0e49\u0e33\u0e40\u0e08\u0e49\u0e32 \u0e48\u0e48\u0e48",  // Thai tone marks first
+      L"\u064e\u0645\u064e \u0651\u0651",                          // Arabic marks first
+      L"\u094d\u0915\u094d \u093e",                                // Devanagari virama first
+      std::wstring(L"a\xdc00"
+                   L"b\xd800 c\xd800\xd800 \xdfff",
+                   11),  // lone halves of pairs
   };
   for (const Mode& mode : kModes) {
     CAPTURE(mode.name);

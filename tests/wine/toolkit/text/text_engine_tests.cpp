@@ -28,7 +28,8 @@ LOGFONTW Described(HFONT font) {
   return logFont;
 }
 
-const std::wstring kArabic = L"\u0645\u064A\u0646\u0627\u0621 \u0627\u0644\u0625\u0633\u0643\u0646\u062F\u0631\u064A\u0629";
+const std::wstring kArabic =
+    L"\u0645\u064A\u0646\u0627\u0621 \u0627\u0644\u0625\u0633\u0643\u0646\u062F\u0631\u064A\u0629";
 
 }  // namespace
 

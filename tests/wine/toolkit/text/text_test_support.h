@@ -52,7 +52,7 @@ struct EngineOnCanvas {
 void CheckCovers(const std::vector<toolkit::TextEngine::PlacedRun>& layout, int start, int length);
 // Runs of one line, and the line's width.
 std::vector<toolkit::TextEngine::PlacedRun> LineRuns(const std::vector<toolkit::TextEngine::PlacedRun>& layout,
-                                                      int line);
+                                                     int line);
 int LineWidth(const std::vector<toolkit::TextEngine::PlacedRun>& layout, int line);
 // Where each line after the first starts in the text.
 std::vector<int> LineStarts(const std::vector<toolkit::TextEngine::PlacedRun>& layout, int lines);
