@@ -60,6 +60,8 @@ TEST_CASE("marks, joiners, conjuncts and low surrogates continue a cluster") {
   CHECK(InsideClusters(u"\u0e01\u0e34\u0e48\u0e07") == V{1, 2});     // Thai vowel and tone marks
   CHECK(InsideClusters(u"\u0915\u094d\u0937\u093e") == V{1, 2, 3});  // Devanagari kssa + aa
   CHECK(InsideClusters(u"a\u200db") == V{1});
+  CHECK(InsideClusters(u"\u0995\u09bf\u0b95\u0bbf") == V{1, 3});  // Bengali and Tamil vowel signs
+  CHECK(InsideClusters(u"\u1100\u1161\u11a8") == V{1, 2});        // Hangul jamo syllable
   CHECK(InsideClusters(u"\U0001F600x") == V{1});
   // A lone low surrogate starts its own cluster rather than joining a letter.
   CHECK(InsideClusters(u"a\xdc00").empty());
