@@ -60,8 +60,22 @@ struct TextEngine::Paragraph {
   int glyphsUsed = 0;
 };
 
-TextEngine::TextEngine(bool load) : buffers_(std::make_unique<Buffers>()) {
-  if (load) script_.load(L"usp10.dll");
+TextEngine::TextEngine(bool load) : loadPending_(load), buffers_(std::make_unique<Buffers>()) {}
+
+void TextEngine::loadIfPending() const {
+  if (!loadPending_) return;
+  loadPending_ = false;
+  script_.load(L"usp10.dll");
+}
+
+bool TextEngine::available() const {
+  loadIfPending();
+  return script_.available();
+}
+
+HMODULE TextEngine::scriptModule() const {
+  loadIfPending();
+  return script_.module();
 }
 
 TextEngine::~TextEngine() {
@@ -75,6 +89,7 @@ TextEngine::~TextEngine() {
 
 bool TextEngine::loadScriptLibrary(const wchar_t* fileName) {
   // Caches belong to the library that made them.
+  loadPending_ = false;
   freeCaches();
   return script_.load(fileName);
 }

@@ -44,7 +44,8 @@ public:
     bool shaped = false;  // through the script processor (else plain GDI)
   };
 
-  // With `load` the engine loads usp10.dll at once.
+  // With `load` the engine loads usp10.dll at its first use (measuring, drawing, or
+  // asking whether it is available), not before.
   explicit TextEngine(bool load = true);
   ~TextEngine();
   TextEngine(const TextEngine&) = delete;
@@ -53,8 +54,8 @@ public:
   // See ScriptLibrary::load; a failure leaves the engine on plain GDI. Caches made
   // with the previous library are freed first.
   bool loadScriptLibrary(const wchar_t* fileName);
-  bool available() const { return script_.available(); }
-  HMODULE scriptModule() const { return script_.module(); }
+  bool available() const;
+  HMODULE scriptModule() const;
 
   // Puts `font` in slot 0..4: the slot's script cache is freed and its previous
   // font deleted if the slot owned it (unless it is the same font, which stays as
@@ -113,6 +114,7 @@ private:
   struct Buffers;
   struct Paragraph;
 
+  void loadIfPending() const;
   void freeCaches();
   void releaseSlotFont(int slot);
   HFONT selectRunFont(Paragraph& p, int slot);
@@ -124,7 +126,9 @@ private:
   void splitRun(std::size_t index, int firstLength);
   void flushLine(Paragraph& p);
 
-  ScriptLibrary script_;
+  // Loaded on first use, which may be a const question.
+  mutable ScriptLibrary script_;
+  mutable bool loadPending_;
   std::unique_ptr<Buffers> buffers_;
   Slot slots_[kSlots];
   HFONT baseFonts_[3] = {};
