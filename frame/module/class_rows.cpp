@@ -4,6 +4,7 @@
 #include "frame/module/class_rows.h"
 
 #include "contours/XContoursView.h"
+#include "legend/XChartLegend.h"
 #include "tides/controls/TidesPortList.h"
 #include "tides/controls/TidesWindow.h"
 #include "tides/objects/TidesDatabase.h"
@@ -17,6 +18,7 @@ ClassEntry gRows[] = {
     PlainObjectRow<br::tides::TidesPort>(L"TidesPort"),
     ControlRow<br::tides::TidesPortList>(L"TidesPortList", 107),
     ControlRow<br::tides::TidesWindow>(L"TidesWindow", 109),
+    PlainObjectRow<br::legend::XChartLegend>(L"XChartLegend"),
     ControlRow<br::contours::XContoursView>(L"XContoursView", 116),
 };
 

@@ -1,0 +1,78 @@
+// XChartLegend: the legend of one chart dataset at one position (units, datums, dates,
+// edition, scale, projection, quality, magnetic variation, producing agency). Windowless:
+// SetLegendData fills the record and always answers S_OK (failures are reported through
+// the error reporter and leave the defaults); the seventeen properties only read it.
+//
+// What is kept between calls: the header and parameter values of the last dataset, keyed
+// by its identity, edition and update number, and its meta object list. What is looked up
+// on every call: everything that depends on the position (magnetic variation, the two
+// qualities and the datums the meta objects give).
+#pragma once
+
+#include "frame/com/DispatchObject.h"
+#include "frame/errors/cErrReporter.h"
+#include "frame/geo/AgencyTable.h"
+#include "legend/record/legend_record.h"
+
+#include "BR_Info.h"
+#include "GeoData.h"
+
+#include <vector>
+
+namespace br::legend {
+
+class XChartLegend final : public br::com::DispatchObject<XChartLegend, IXChartLegend> {
+public:
+  static const br::com::ClassIdentity kClass;
+  static const Entry kInterfaces[];
+
+  XChartLegend();
+  ~XChartLegend() override;
+
+  // IXChartLegend
+  STDMETHODIMP SetLegendData(IUnknown* dataSet, IUnknown* projection, long latitude, long longitude) override;
+  STDMETHODIMP get_DepthUnits(BSTR* value) override;
+  STDMETHODIMP get_HeightUnits(BSTR* value) override;
+  STDMETHODIMP get_SoundingDatum(BSTR* value) override;
+  STDMETHODIMP get_VerticalDatum(BSTR* value) override;
+  STDMETHODIMP get_HorizontalDatum(BSTR* value) override;
+  STDMETHODIMP get_EditionDate(DATE* value) override;
+  STDMETHODIMP get_UpdateDate(DATE* value) override;
+  STDMETHODIMP get_EditionNumber(long* value) override;
+  STDMETHODIMP get_UpdateNumber(long* value) override;
+  STDMETHODIMP get_SourceIDCode(BSTR* value) override;
+  STDMETHODIMP get_BathymetricQuality(BSTR* value) override;
+  STDMETHODIMP get_NonBathymetricQuality(double* value) override;
+  STDMETHODIMP get_DefaultScale(long* value) override;
+  STDMETHODIMP get_Projection(BSTR* value) override;
+  STDMETHODIMP get_MagneticVariation(double* value) override;
+  STDMETHODIMP get_SourceProducingAgency(BSTR* value) override;
+
+private:
+  void Reset();
+  void Fill(IUnknown* dataSet, IUnknown* projection, long latitude, long longitude);
+  void FillVector(IGeoDataSet* dataSet, IGeoProjection* projection, long latitude, long longitude);
+  // False when the header shows the dataset of the last fill (nothing was read anew).
+  bool FillHeader(IGeoDataSet* dataSet);
+  void FillParameters(IGeoDataSet* dataSet, IGeoCatalog* catalogue);
+  void ReadMetaObjects(IGeoDataSet* dataSet);
+  void FillPosition(IGeoDataSet* dataSet, IGeoProjection* projection, IGeoCatalog* catalogue, long latitude,
+                    long longitude);
+  void FillRaster(IGeoRasterDataSet* raster);
+
+  static HRESULT ReadText(const std::string& text, BSTR* value);
+  static HRESULT ReadDate(const CalendarDate& date, DATE* value);
+
+  br::cErrReporter reporter_;
+  br::geo::AgencyTable agencies_;
+  LegendRecord record_;
+  CacheKey key_;
+  // The datums the parameters gave: each position lookup starts again from them.
+  std::string parameterSoundingDatum_;
+  std::string parameterVerticalDatum_;
+  std::vector<GUID> metaObjects_;
+  bool busy_ = false;              // a fill is running (a report's box may call us back)
+  bool selectionFailed_ = false;   // this attempt's selection step failed
+};
+
+}  // namespace br::legend
