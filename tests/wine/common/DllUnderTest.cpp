@@ -21,7 +21,9 @@ std::wstring BuiltDllPath() {
   throw std::runtime_error("BR_Info.dll not found above the test program");
 }
 
-DllUnderTest::DllUnderTest() : path_(BuiltDllPath()) {
+DllUnderTest::DllUnderTest() : DllUnderTest(BuiltDllPath()) {}
+
+DllUnderTest::DllUnderTest(const std::wstring& path) : path_(path) {
   comInitialised_ = SUCCEEDED(CoInitializeEx(nullptr, COINIT_APARTMENTTHREADED));
   module_ = LoadLibraryW(path_.c_str());
   if (!module_) throw std::runtime_error("BR_Info.dll cannot be loaded");

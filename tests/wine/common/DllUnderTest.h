@@ -20,6 +20,7 @@ std::wstring BuiltDllPath();
 class DllUnderTest {
 public:
   DllUnderTest();   // CoInitializeEx (apartment) and LoadLibrary; throws on failure
+  explicit DllUnderTest(const std::wstring& path);  // a copy of the DLL elsewhere
   ~DllUnderTest();  // FreeLibrary and CoUninitialize
   DllUnderTest(const DllUnderTest&) = delete;
   DllUnderTest& operator=(const DllUnderTest&) = delete;

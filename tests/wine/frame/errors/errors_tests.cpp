@@ -5,6 +5,7 @@
 #include <string>
 #include <vector>
 
+#include "tests/wine/common/BoxPresser.h"
 #include "tests/wine/common/registry_test_support.h"
 #include "frame/errors/guarded_operation.h"
 #include "frame/errors/cErrReporter.h"
@@ -13,6 +14,7 @@
 #include "frame/settings/cRegSettings.h"
 
 using namespace br;
+using br::test::BoxPresser;
 
 namespace {
 
@@ -36,43 +38,6 @@ std::string SystemText(std::int32_t result) {
   std::string text;
   return cErrReporter::SystemMessage(result, text) ? text : "(null)";
 }
-
-// While it lives, notes the text of each "BRCL Error" box this thread shows, counts those
-// with Abort, Retry and Ignore, and presses the given buttons in order (Abort beyond them).
-class BoxPresser {
-public:
-  explicit BoxPresser(std::vector<int> buttons) : buttons_(std::move(buttons)) { s_current = this; }
-  ~BoxPresser() { UnhookWindowsHookEx(hook_); }
-  std::vector<std::string> texts;
-  int abortRetryIgnore = 0;
-
-private:
-  static LRESULT CALLBACK OnCbt(int code, WPARAM wParam, LPARAM lParam) {
-    const HWND box = reinterpret_cast<HWND>(wParam);
-    char caption[64] = "";
-    if (code == HCBT_ACTIVATE && box != s_current->last_ && GetWindowTextA(box, caption, sizeof caption) &&
-        lstrcmpA(caption, "BRCL Error") == 0) {
-      s_current->last_ = box;
-      SetTimer(box, 1, 10, Press);  // runs in the box's own loop, once it is set up
-    }
-    return CallNextHookEx(nullptr, code, wParam, lParam);
-  }
-  static void CALLBACK Press(HWND box, UINT, UINT_PTR timer, DWORD) {
-    KillTimer(box, timer);
-    BoxPresser& self = *s_current;
-    char text[1024] = "";
-    GetDlgItemTextA(box, 0xFFFF, text, sizeof text);  // the message box's text control
-    self.abortRetryIgnore += GetDlgItem(box, IDABORT) && GetDlgItem(box, IDRETRY) && GetDlgItem(box, IDIGNORE);
-    const int button = self.texts.size() < self.buttons_.size() ? self.buttons_[self.texts.size()] : IDABORT;
-    self.texts.push_back(text);
-    PostMessageA(box, WM_COMMAND, MAKEWPARAM(button, BN_CLICKED), reinterpret_cast<LPARAM>(GetDlgItem(box, button)));
-  }
-
-  static inline BoxPresser* s_current = nullptr;
-  std::vector<int> buttons_;
-  HWND last_ = nullptr;
-  HHOOK hook_ = SetWindowsHookExA(WH_CBT, OnCbt, nullptr, GetCurrentThreadId());
-};
 
 }  // namespace
 
