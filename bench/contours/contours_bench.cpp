@@ -2,6 +2,7 @@
 // IViewObject::Draw into a 300 x 600 32-bit DIB section, repeated. Usage: contours_bench [COUNT]
 #include "BR_Info.h"
 #include "GeoData.h"
+#include "bench/common/contours_setup.h"
 
 #include <windows.h>
 #include <ocidl.h>
@@ -12,49 +13,9 @@
 
 namespace {
 
+using namespace br::bench;
+
 using Clock = std::chrono::steady_clock;
-
-// The host's components, as small as they come: fixed answers, no reference counting.
-class Params : public IPresParams {
-public:
-  STDMETHODIMP QueryInterface(REFIID riid, void** out) override {
-    *out = IsEqualIID(riid, IID_IUnknown) || IsEqualIID(riid, IID_IPresParams) ? this : nullptr;
-    return *out ? S_OK : E_NOINTERFACE;
-  }
-  STDMETHODIMP_(ULONG) AddRef() override { return 2; }
-  STDMETHODIMP_(ULONG) Release() override { return 1; }
-  STDMETHODIMP GetParam(long index, VARIANT* value) override {
-    VariantInit(value);
-    if (index == 3) {
-      value->vt = VT_I4;
-      value->lVal = 0;
-    } else {
-      value->vt = VT_R4;
-      value->fltVal = index == 0 ? 2.0f : 30.0f;
-    }
-    return S_OK;
-  }
-};
-
-class Colours : public IColorMap {
-public:
-  STDMETHODIMP QueryInterface(REFIID riid, void** out) override {
-    *out = IsEqualIID(riid, IID_IUnknown) || IsEqualIID(riid, IID_IColorMap) ? this : nullptr;
-    return *out ? S_OK : E_NOINTERFACE;
-  }
-  STDMETHODIMP_(ULONG) AddRef() override { return 2; }
-  STDMETHODIMP_(ULONG) Release() override { return 1; }
-  STDMETHODIMP Reserved3() override { return E_NOTIMPL; }
-  STDMETHODIMP Reserved4() override { return E_NOTIMPL; }
-  STDMETHODIMP Reserved5() override { return E_NOTIMPL; }
-  STDMETHODIMP Reserved6() override { return E_NOTIMPL; }
-  STDMETHODIMP Reserved7() override { return E_NOTIMPL; }
-  STDMETHODIMP Reserved8() override { return E_NOTIMPL; }
-  STDMETHODIMP GetPaletteIndex(long colour, USHORT* index) override {
-    *index = static_cast<USHORT>(colour % 7);
-    return S_OK;
-  }
-};
 
 int Fail(const char* message) {
   std::fprintf(stderr, "contours_bench: %s\n", message);
@@ -73,17 +34,9 @@ int Run(int count) {
   if (FAILED(view->QueryInterface(IID_IViewObject, reinterpret_cast<void**>(&drawing))))
     return Fail("no IViewObject");
 
-  struct {
-    LOGPALETTE head;
-    PALETTEENTRY more[6];
-  } table{};
-  table.head.palVersion = 0x300;
-  table.head.palNumEntries = 7;
-  PALETTEENTRY* entries = table.head.palPalEntry;
-  for (int i = 0; i < 7; ++i) entries[i] = PALETTEENTRY{BYTE(30 * i), BYTE(200 - 20 * i), 250, 0};
-  const HPALETTE palette = CreatePalette(&table.head);
-  Params params;
-  Colours colours;
+  const HPALETTE palette = BenchPalette();
+  BenchParams params;
+  BenchColours colours;
   const Clock::time_point read = Clock::now();
   view->SetContoursData(&params, &colours, 10.0);
   const double readMs = std::chrono::duration<double, std::milli>(Clock::now() - read).count();
