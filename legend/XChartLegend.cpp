@@ -328,8 +328,10 @@ void XChartLegend::ReadMetaObjects(IGeoDataSet* dataSet) {
   BR_CHECK_HR(objects->SetSelection(handle, 0));
   BR_CHECK_HR(objects->Reset());
   br::geo::ForEachObject(objects.Get(), [&](IGeoObject* object) {
-    GUID id{};
-    if (SUCCEEDED(object->GetId(&id))) metaObjects_.push_back(id);
+    MetaObject meta{};
+    if (FAILED(object->GetId(&meta.id))) return true;
+    if (FAILED(object->GetClassCode(&meta.classCode))) meta.classCode = 0;
+    metaObjects_.push_back(meta);
     return true;
   });
 }
@@ -353,11 +355,24 @@ void XChartLegend::FillPosition(IGeoDataSet* dataSet, IGeoProjection* projection
 
   bool accuracyFound = false;
   double fallback = kNoValue;
-  for (const GUID& id : metaObjects_) {
+  // Whether an object of the class can still change the record; the first object of a
+  // class that gives a value settles it.
+  const auto wanted = [&](long classCode) {
+    switch (classCode) {
+      case kClassMagneticVariation: return record_.magneticVariation == kNoValue;
+      case kClassDataAccuracy: return !accuracyFound;
+      case kClassDataQuality: return catalogue && record_.bathymetricQuality.empty();
+      case kClassSoundingDatum: return catalogue && record_.soundingDatum.empty();
+      case kClassVerticalDatum: return catalogue && record_.verticalDatum.empty();
+      default: return true;  // the host gave no class with the list: ask the object
+    }
+  };
+  for (const MetaObject& meta : metaObjects_) {
+    if (!wanted(meta.classCode)) continue;
     ComRef<IGeoObject> object;
-    if (dataSet->GetObjectById(id, object.Out()) != S_OK || !object) continue;
-    long classCode = 0;
-    if (FAILED(object->GetClassCode(&classCode))) continue;
+    if (dataSet->GetObjectById(meta.id, object.Out()) != S_OK || !object) continue;
+    long classCode = meta.classCode;
+    if (classCode == 0 && (FAILED(object->GetClassCode(&classCode)) || !wanted(classCode))) continue;
     if (!HitTest(geodesy, object.Get(), projection, nearRect)) {
       if (classCode == kClassMagneticVariation && fallback == kNoValue &&
           HitTest(geodesy, object.Get(), projection, screen)) {

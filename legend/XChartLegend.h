@@ -70,7 +70,13 @@ private:
   // The datums the parameters gave: each position lookup starts again from them.
   std::string parameterSoundingDatum_;
   std::string parameterVerticalDatum_;
-  std::vector<GUID> metaObjects_;
+  // The meta objects of the dataset, with their class codes (0 when the host gave none):
+  // a position lookup skips the objects whose class can add nothing more.
+  struct MetaObject {
+    GUID id;
+    long classCode;
+  };
+  std::vector<MetaObject> metaObjects_;
   bool busy_ = false;              // a fill is running (a report's box may call us back)
   bool selectionFailed_ = false;   // this attempt's selection step failed
 };

@@ -8,8 +8,8 @@ namespace {
 
 struct State {
   std::mutex lock;
-  std::map<std::string, long> counters;
-  std::map<std::string, std::uint32_t> faults;
+  std::map<std::string, long, std::less<>> counters;
+  std::map<std::string, std::uint32_t, std::less<>> faults;
   std::map<long, std::string> options;
 };
 
@@ -25,6 +25,16 @@ void AddToCounter(const std::string& name, long delta) {
   State& state = TheState();
   std::lock_guard<std::mutex> guard(state.lock);
   state.counters[name] += delta;
+}
+
+void AddToLiveCounter(std::string_view kind, long delta) {
+  thread_local std::string name;
+  name.assign("live.").append(kind);
+  State& state = TheState();
+  std::lock_guard<std::mutex> guard(state.lock);
+  auto counter = state.counters.find(name);
+  if (counter == state.counters.end()) counter = state.counters.emplace(name, 0).first;
+  counter->second += delta;
 }
 
 long CounterValue(const std::string& name) {
@@ -60,10 +70,15 @@ void ClearFaults() {
   state.faults.clear();
 }
 
-std::optional<std::uint32_t> CallAndFault(const std::string& operation) {
+std::optional<std::uint32_t> CallAndFault(std::string_view operation) {
+  thread_local std::string name;
+  name.assign("calls.").append(operation);
   State& state = TheState();
   std::lock_guard<std::mutex> guard(state.lock);
-  ++state.counters["calls." + operation];
+  auto counter = state.counters.find(name);
+  if (counter == state.counters.end()) counter = state.counters.emplace(name, 0).first;
+  ++counter->second;
+  if (state.faults.empty()) return std::nullopt;
   const auto it = state.faults.find(operation);
   if (it == state.faults.end()) return std::nullopt;
   return it->second;

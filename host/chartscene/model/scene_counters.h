@@ -11,10 +11,13 @@
 #include <map>
 #include <optional>
 #include <string>
+#include <string_view>
 
 namespace br::chartscene {
 
 void AddToCounter(const std::string& name, long delta);
+// AddToCounter("live." + kind, delta) without a new string per wrapper.
+void AddToLiveCounter(std::string_view kind, long delta);
 long CounterValue(const std::string& name);
 // Every counter whose name starts with prefix (all of them for "").
 std::map<std::string, long> Counters(const std::string& prefix);
@@ -22,8 +25,9 @@ std::map<std::string, long> Counters(const std::string& prefix);
 // The HRESULT an operation is to return, as a 32-bit pattern; 0 removes the fault.
 void SetFault(const std::string& operation, std::uint32_t result);
 void ClearFaults();
-// Counts the call and gives the injected result, if any.
-std::optional<std::uint32_t> CallAndFault(const std::string& operation);
+// Counts the call and gives the injected result, if any. Cheap enough for every call of a
+// client walking thousands of objects: no allocation once a counter exists.
+std::optional<std::uint32_t> CallAndFault(std::string_view operation);
 
 // The last value each object formatter option was set to ("I4:1036", "BSTR:unknown"),
 // whichever formatter was given it; empty for an option never set.

@@ -47,7 +47,13 @@ std::size_t FindObject(const SceneModel& scene, const unsigned char* identity) {
   for (int i = 4; i < 8; ++i) {
     if (identity[i] != 0) return SIZE_MAX;
   }
-  for (std::size_t object : scene.dataSets[dataSet].objects) {
+  // Objects are numbered from 1 in dataset order: look there first, so a lookup by
+  // identity costs no walk through a large dataset.
+  const std::vector<std::size_t>& objects = scene.dataSets[dataSet].objects;
+  if (number >= 1 && number <= objects.size() && scene.objects[objects[number - 1]].number == number) {
+    return objects[number - 1];
+  }
+  for (std::size_t object : objects) {
     if (scene.objects[object].number == number) return object;
   }
   return SIZE_MAX;

@@ -19,7 +19,7 @@ class ComObject : public Interfaces... {
 public:
   explicit ComObject(const char* kind) : kind_(kind) {
     SceneModule::Lock();
-    AddToCounter("live." + kind_, 1);
+    AddToLiveCounter(kind_, 1);
   }
   ComObject(const ComObject&) = delete;
   ComObject& operator=(const ComObject&) = delete;
@@ -48,7 +48,7 @@ public:
 
 protected:
   virtual ~ComObject() {
-    AddToCounter("live." + kind_, -1);
+    AddToLiveCounter(kind_, -1);
     SceneModule::Unlock();
   }
   // Interfaces answered by a member rather than a base; null when there is none.

@@ -16,6 +16,7 @@ SceneState::~SceneState() {
 
 HRESULT SceneState::Call(const char* operation) const {
   if (auto fault = CallAndFault(operation)) return static_cast<HRESULT>(*fault);
+  if (model_.faults.empty()) return S_OK;
   const auto it = model_.faults.find(operation);
   return it == model_.faults.end() ? S_OK : static_cast<HRESULT>(it->second);
 }
