@@ -207,7 +207,11 @@ STDMETHODIMP XChartLegend::SetLegendData(IUnknown* dataSet, IUnknown* projection
       if (selectionFailed_) key_.valid = false;
     }
   } catch (...) {
-    Reset();  // a text lookup of the reset itself ran out of memory
+    // A text lookup of the reset itself ran out of memory: try once more, never throw out.
+    try {
+      Reset();
+    } catch (...) {
+    }
   }
   busy_ = false;
   return S_OK;
