@@ -1,5 +1,5 @@
-// The legend's portable arithmetic: a reset record, the cache key, the variation of one
-// object, the hit rectangles, and the raster chart records read only inside their bytes.
+// The legend's portable arithmetic: the cache key, the variation of one object, the hit
+// rectangles, and the raster chart records read only inside their bytes.
 #include <doctest/doctest.h>
 
 #include <cstring>
@@ -8,30 +8,6 @@
 #include "legend/record/legend_record.h"
 
 using namespace br::legend;
-
-TEST_CASE("a reset record") {
-  const LegendRecord record = ResetRecord({"Metres", "Non défini", "MERCATOR"});
-  CHECK(record.depthUnits == "Metres");
-  CHECK(record.heightUnits == "Metres");
-  CHECK(record.soundingDatum == "Non défini");
-  CHECK(record.verticalDatum == "Non défini");
-  CHECK(record.horizontalDatum == "WGS-84");
-  CHECK(record.projection == "MERCATOR");
-  CHECK(record.magneticVariation == kNoValue);
-  CHECK(record.editionDate.IsNoValue());
-  CHECK(record.updateNumber == 0);
-}
-
-TEST_CASE("calendar dates: all zero and all 0xFFFF are no value, any field set is a date") {
-  CalendarDate date;
-  CHECK(date.IsNoValue());
-  CHECK(CalendarDate::Unconvertible().IsNoValue());
-  date.fields[0] = 2023;
-  CHECK_FALSE(date.IsNoValue());
-  CalendarDate partly = CalendarDate::Unconvertible();
-  partly.fields[7] = 0;
-  CHECK_FALSE(partly.IsNoValue());
-}
 
 TEST_CASE("the cache key matches only after a fill, on identity, edition and update") {
   std::array<unsigned char, 16> identity{};
