@@ -172,6 +172,17 @@ bool BytesOf(const VARIANT& value, std::size_t maxBytes, std::vector<unsigned ch
 
 }  // namespace
 
+struct XChartLegend::PositionLookup {
+  bool active = false;
+  IGeoProjection* projection = nullptr;
+  IGeoCatalog* catalogue = nullptr;
+  const br::geo::GeodesyLibrary* geodesy = nullptr;
+  PixelRect nearRect{};
+  PixelRect screen{};
+  bool accuracyFound = false;
+  double fallback = kNoValue;
+};
+
 XChartLegend::XChartLegend() {
   Reset();
   RegisterTextClient(this);
@@ -239,16 +250,28 @@ void XChartLegend::FillVector(IGeoDataSet* dataSet, IGeoProjection* projection, 
   if (FAILED(dataSet->GetDatabase(database.Out()))) database.Detach();
   const ComRef<IGeoCatalog> catalogue = database.Query<IGeoCatalog>(IID_IGeoCatalog);
 
-  if (FillHeader(dataSet)) {
-    FillParameters(dataSet, catalogue.Get());
+  const bool fresh = FillHeader(dataSet);
+  if (fresh) FillParameters(dataSet, catalogue.Get());
+  PositionLookup lookup;
+  const bool located = BeginPosition(projection, catalogue.Get(), latitude, longitude, lookup);
+  if (fresh) {
     try {
-      ReadMetaObjects(dataSet);
+      ReadMetaObjects(dataSet, lookup);
     } catch (int) {
       selectionFailed_ = true;
       throw;
     }
+  } else if (located) {
+    for (const MetaObject& meta : metaObjects_) {
+      if (!Wanted(meta.classCode, lookup)) continue;
+      ComRef<IGeoObject> object;
+      if (dataSet->GetObjectById(meta.id, object.Out()) != S_OK || !object) continue;
+      long classCode = meta.classCode;
+      if (classCode == 0 && FAILED(object->GetClassCode(&classCode))) continue;
+      LookUpObject(object.Get(), classCode, lookup);
+    }
   }
-  FillPosition(dataSet, projection, catalogue.Get(), latitude, longitude);
+  if (record_.magneticVariation == kNoValue) record_.magneticVariation = lookup.fallback;
 }
 
 bool XChartLegend::FillHeader(IGeoDataSet* dataSet) {
@@ -314,7 +337,7 @@ void XChartLegend::FillParameters(IGeoDataSet* dataSet, IGeoCatalog* catalogue) 
   parameterVerticalDatum_ = record_.verticalDatum;
 }
 
-void XChartLegend::ReadMetaObjects(IGeoDataSet* dataSet) {
+void XChartLegend::ReadMetaObjects(IGeoDataSet* dataSet, PositionLookup& lookup) {
   metaObjects_.clear();
   ComRef<IGeoDatabase> database;
   BR_CHECK_HR(dataSet->GetDatabase(database.Out()));
@@ -336,12 +359,13 @@ void XChartLegend::ReadMetaObjects(IGeoDataSet* dataSet) {
     if (FAILED(object->GetId(&meta.id))) return true;
     if (FAILED(object->GetClassCode(&meta.classCode))) meta.classCode = 0;
     metaObjects_.push_back(meta);
+    if (lookup.active && meta.classCode != 0) LookUpObject(object, meta.classCode, lookup);
     return true;
   });
 }
 
-void XChartLegend::FillPosition(IGeoDataSet* dataSet, IGeoProjection* projection, IGeoCatalog* catalogue,
-                                long latitude, long longitude) {
+bool XChartLegend::BeginPosition(IGeoProjection* projection, IGeoCatalog* catalogue, long latitude, long longitude,
+                                 PositionLookup& lookup) {
   // Everything the meta objects give belongs to this position only.
   record_.magneticVariation = kNoValue;
   record_.bathymetricQuality.clear();
@@ -350,82 +374,76 @@ void XChartLegend::FillPosition(IGeoDataSet* dataSet, IGeoProjection* projection
   record_.verticalDatum = parameterVerticalDatum_;
 
   const br::geo::GeodesyLibrary& geodesy = br::geo::GeodesyLibrary::Shared();
-  if (!geodesy.Loaded() || metaObjects_.empty()) return;
+  if (!geodesy.Loaded()) return false;
   const GEO_POINT point{latitude, longitude};
   POINT pixel{};
-  if (FAILED(projection->GeoToPixel(&point, &pixel, 1))) return;  // no position, no hit tests
-  const PixelRect nearRect = NearRect(pixel.x, pixel.y);
-  const PixelRect screen = ScreenRect(GetSystemMetrics(SM_CXSCREEN), GetSystemMetrics(SM_CYSCREEN));
+  if (FAILED(projection->GeoToPixel(&point, &pixel, 1))) return false;  // no position, no hit tests
+  lookup.projection = projection;
+  lookup.catalogue = catalogue;
+  lookup.geodesy = &geodesy;
+  lookup.nearRect = NearRect(pixel.x, pixel.y);
+  lookup.screen = ScreenRect(GetSystemMetrics(SM_CXSCREEN), GetSystemMetrics(SM_CYSCREEN));
+  lookup.active = true;
+  return true;
+}
 
-  bool accuracyFound = false;
-  double fallback = kNoValue;
-  // Whether an object of the class can still change the record; the first object of a
-  // class that gives a value settles it.
-  const auto wanted = [&](long classCode) {
-    switch (classCode) {
-      case kClassMagneticVariation: return record_.magneticVariation == kNoValue;
-      case kClassDataAccuracy: return !accuracyFound;
-      case kClassDataQuality: return catalogue && record_.bathymetricQuality.empty();
-      case kClassSoundingDatum: return catalogue && record_.soundingDatum.empty();
-      case kClassVerticalDatum: return catalogue && record_.verticalDatum.empty();
-      default: return true;  // the host gave no class with the list: ask the object
-    }
-  };
-  for (const MetaObject& meta : metaObjects_) {
-    if (!wanted(meta.classCode)) continue;
-    ComRef<IGeoObject> object;
-    if (dataSet->GetObjectById(meta.id, object.Out()) != S_OK || !object) continue;
-    long classCode = meta.classCode;
-    if (classCode == 0 && (FAILED(object->GetClassCode(&classCode)) || !wanted(classCode))) continue;
-    if (!HitTest(geodesy, object.Get(), projection, nearRect)) {
-      if (classCode == kClassMagneticVariation && fallback == kNoValue &&
-          HitTest(geodesy, object.Get(), projection, screen)) {
-        fallback = ObjectVariation(object.Get());
-      }
-      continue;
-    }
-    switch (classCode) {
-      case kClassMagneticVariation:
-        if (record_.magneticVariation == kNoValue) record_.magneticVariation = ObjectVariation(object.Get());
-        break;
-      case kClassDataAccuracy:
-        if (!accuracyFound) {
-          Variant value;
-          ComRef<IGeoAttribute> attribute;
-          if (object->GetAttribute(kAttributePositionalAccuracy, attribute.Out()) == S_OK && attribute &&
-              SUCCEEDED(attribute->GetValue(&value.value)) &&
-              (value.value.vt == VT_R4 || value.value.vt == VT_R8) && ConvertTo(value.value, VT_R4) &&
-              std::isfinite(value.value.fltVal) && value.value.fltVal != FLT_MAX) {
-            record_.nonBathymetricQuality = value.value.fltVal;
-            accuracyFound = true;
-          }
-        }
-        break;
-      case kClassDataQuality:
-        if (record_.bathymetricQuality.empty() && catalogue) {
-          Variant value;
-          if (ReadAttribute(object.Get(), kAttributeZoneOfConfidence, VT_UI2, value) && value.value.uiVal != 0) {
-            br::geo::ReadEnumText(catalogue, kAttributeZoneOfConfidence, value.value.uiVal,
-                                  record_.bathymetricQuality);
-          }
-        }
-        break;
-      case kClassSoundingDatum:
-      case kClassVerticalDatum: {
-        std::string& datum = classCode == kClassSoundingDatum ? record_.soundingDatum : record_.verticalDatum;
-        if (datum.empty() && catalogue) {
-          Variant value;
-          if (ReadAttribute(object.Get(), kAttributeVerdat, VT_UI1, value) && value.value.bVal != 0) {
-            br::geo::ReadEnumText(catalogue, kAttributeVerdat, value.value.bVal, datum);
-          }
-        }
-        break;
-      }
-      default:
-        break;
-    }
+// Whether an object of the class can still change the record: the first object of a class
+// that gives a value settles it, and later ones are not even fetched.
+bool XChartLegend::Wanted(long classCode, const PositionLookup& lookup) const {
+  switch (classCode) {
+    case kClassMagneticVariation: return record_.magneticVariation == kNoValue;
+    case kClassDataAccuracy: return !lookup.accuracyFound;
+    case kClassDataQuality: return lookup.catalogue && record_.bathymetricQuality.empty();
+    case kClassSoundingDatum: return lookup.catalogue && record_.soundingDatum.empty();
+    case kClassVerticalDatum: return lookup.catalogue && record_.verticalDatum.empty();
+    default: return classCode == 0;  // the host gave no class with the list: ask the object
   }
-  if (record_.magneticVariation == kNoValue) record_.magneticVariation = fallback;
+}
+
+void XChartLegend::LookUpObject(IGeoObject* object, long classCode, PositionLookup& lookup) {
+  if (!Wanted(classCode, lookup)) return;
+  IGeoCatalog* catalogue = lookup.catalogue;
+  if (!HitTest(*lookup.geodesy, object, lookup.projection, lookup.nearRect)) {
+    if (classCode == kClassMagneticVariation && lookup.fallback == kNoValue &&
+        HitTest(*lookup.geodesy, object, lookup.projection, lookup.screen)) {
+      lookup.fallback = ObjectVariation(object);
+    }
+    return;
+  }
+  switch (classCode) {
+    case kClassMagneticVariation:
+      record_.magneticVariation = ObjectVariation(object);
+      break;
+    case kClassDataAccuracy: {
+      Variant value;
+      ComRef<IGeoAttribute> attribute;
+      if (object->GetAttribute(kAttributePositionalAccuracy, attribute.Out()) == S_OK && attribute &&
+          SUCCEEDED(attribute->GetValue(&value.value)) && (value.value.vt == VT_R4 || value.value.vt == VT_R8) &&
+          ConvertTo(value.value, VT_R4) && std::isfinite(value.value.fltVal) && value.value.fltVal != FLT_MAX) {
+        record_.nonBathymetricQuality = value.value.fltVal;
+        lookup.accuracyFound = true;
+      }
+      break;
+    }
+    case kClassDataQuality: {
+      Variant value;
+      if (ReadAttribute(object, kAttributeZoneOfConfidence, VT_UI2, value) && value.value.uiVal != 0) {
+        br::geo::ReadEnumText(catalogue, kAttributeZoneOfConfidence, value.value.uiVal, record_.bathymetricQuality);
+      }
+      break;
+    }
+    case kClassSoundingDatum:
+    case kClassVerticalDatum: {
+      std::string& datum = classCode == kClassSoundingDatum ? record_.soundingDatum : record_.verticalDatum;
+      Variant value;
+      if (ReadAttribute(object, kAttributeVerdat, VT_UI1, value) && value.value.bVal != 0) {
+        br::geo::ReadEnumText(catalogue, kAttributeVerdat, value.value.bVal, datum);
+      }
+      break;
+    }
+    default:
+      break;
+  }
 }
 
 void XChartLegend::FillRaster(IGeoRasterDataSet* raster) {

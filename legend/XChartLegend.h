@@ -55,9 +55,17 @@ private:
   // False when the header shows the dataset of the last fill (nothing was read anew).
   bool FillHeader(IGeoDataSet* dataSet);
   void FillParameters(IGeoDataSet* dataSet, IGeoCatalog* catalogue);
-  void ReadMetaObjects(IGeoDataSet* dataSet);
-  void FillPosition(IGeoDataSet* dataSet, IGeoProjection* projection, IGeoCatalog* catalogue, long latitude,
-                    long longitude);
+  // The position's part of one call: what the hit tests need and what they found so far.
+  struct PositionLookup;
+  // Lists the meta objects; each one is also looked up for the position as it comes, so a
+  // fresh list costs no second fetch of every object.
+  void ReadMetaObjects(IGeoDataSet* dataSet, PositionLookup& lookup);
+  // Clears the position's fields; false when no hit test can run (no geodesy library, no
+  // pixel for the position).
+  bool BeginPosition(IGeoProjection* projection, IGeoCatalog* catalogue, long latitude, long longitude,
+                     PositionLookup& lookup);
+  void LookUpObject(IGeoObject* object, long classCode, PositionLookup& lookup);
+  bool Wanted(long classCode, const PositionLookup& lookup) const;
   void FillRaster(IGeoRasterDataSet* raster);
 
   static HRESULT ReadText(const std::string& text, BSTR* value);
