@@ -1,5 +1,5 @@
 #include "inspector/rules/attribute_text.h"
-#include "inspector/rules/fill_limits.h"
+#include "inspector/rules/FillLimits.h"
 #include "inspector/rules/guid_text.h"
 #include "inspector/rules/object_groups.h"
 #include "inspector/rules/record_layout.h"

@@ -1,4 +1,4 @@
-#include "inspector/rules/fill_limits.h"
+#include "inspector/rules/FillLimits.h"
 
 namespace br::inspector {
 
