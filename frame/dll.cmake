@@ -18,6 +18,7 @@ target_link_libraries(BR_Info PRIVATE
   br_tide_objects
   br_tide_controls
   br_contours
+  br_inspector
   br_legend
 )
 file(GLOB br_resource_images CONFIGURE_DEPENDS ${BR_ROOT}/resources/images/*)

@@ -4,6 +4,7 @@
 #include "frame/module/class_rows.h"
 
 #include "contours/XContoursView.h"
+#include "inspector/XObjectInspector.h"
 #include "legend/XChartLegend.h"
 #include "tides/controls/TidesPortList.h"
 #include "tides/controls/TidesWindow.h"
@@ -14,6 +15,7 @@ namespace br::module {
 namespace {
 
 ClassEntry gRows[] = {
+    ControlRow<br::inspector::XObjectInspector>(L"XObjectInspector", 103),
     PlainObjectRow<br::tides::TidesDatabase>(L"TidesDatabase"),
     PlainObjectRow<br::tides::TidesPort>(L"TidesPort"),
     ControlRow<br::tides::TidesPortList>(L"TidesPortList", 107),

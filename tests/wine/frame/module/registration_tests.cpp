@@ -38,6 +38,7 @@ struct Row {
 };
 // One plain row and two control rows (one without events): the other rows take the same paths.
 const Row kRows[] = {{L"TidesPort", &CLSID_TidesPort, false, nullptr},
+                     {L"XObjectInspector", &CLSID_XObjectInspector, true, L", 103"},
                      {L"TidesWindow", &CLSID_TidesWindow, true, L", 109"},
                      {L"XContoursView", &CLSID_XContoursView, true, L", 116"}};
 

@@ -1,0 +1,56 @@
+#include "inspector/InspectorPanel.h"
+
+#include "frame/settings/localised_texts.h"
+#include "toolkit/core/ToolkitEvent.h"
+#include "toolkit/layout/GridLayout.h"
+#include "toolkit/layout/TabLayout.h"
+
+#include <memory>
+
+namespace br::inspector {
+
+namespace {
+
+std::unique_ptr<toolkit::Layout> CardLayout() {
+  auto cards = std::make_unique<toolkit::TabLayout>();
+  cards->selectedIndex = InspectorPanel::kCardDetails;
+  cards->preferredOfAll = 1;
+  return cards;
+}
+
+}  // namespace
+
+InspectorPanel::InspectorPanel(Owner& owner)
+    : toolkit::Panel(std::make_unique<toolkit::GridLayout>(1, 2, 3, 0, "35,65")),
+      owner_(owner),
+      cards_(CardLayout()) {
+  insertNamed(nullptr, &tree_, "tree");
+  insertNamed(nullptr, &cards_, "details");
+  cards_.insertNamed(nullptr, &tabs_, "tabs");
+  cards_.insertNamed(nullptr, &hierarchy_, "hierarchy");
+  const std::string attributes = br::GetText("ObjInspector", 1, "Attributes");
+  tabs_.insertNamed(nullptr, &attributes_, attributes.c_str());
+}
+
+InspectorPanel::~InspectorPanel() = default;
+
+void InspectorPanel::showCard(int card) {
+  auto* cards = static_cast<toolkit::TabLayout*>(cards_.getLayout());
+  if (!cards || cards->selectedIndex == card) return;
+  cards->selectedIndex = card;
+  if (cards_.isValid()) cards_.doLayout();
+}
+
+int InspectorPanel::shownCard() const {
+  const auto* cards = static_cast<const toolkit::TabLayout*>(cards_.getLayout());
+  return cards ? cards->selectedIndex : kCardDetails;
+}
+
+int InspectorPanel::onAction(toolkit::ToolkitEvent& event) {
+  if (event.source != &tree_) return 0;
+  owner_.TreeItemChosen(static_cast<LPARAM>(event.params[0]),
+                        event.params[1] == toolkit::ContainedWindow::kTreeDoubleClick);
+  return 1;
+}
+
+}  // namespace br::inspector

@@ -1,0 +1,311 @@
+#include "inspector/XObjectInspector.h"
+
+#include "frame/com/bstr_text.h"
+#include "frame/control/OwnerHold.h"
+#include "frame/settings/localised_texts.h"
+#include "frame/settings/settings.h"
+#include "inspector/TreeBuilder.h"
+#include "inspector/dataset_label.h"
+#include "inspector/object_access.h"
+#include "inspector/rules/attribute_text.h"
+#include "inspector/rules/guid_text.h"
+#include "inspector/rules/record_layout.h"
+#include "inspector/rules/record_search.h"
+
+#include <cstring>
+#include <string>
+
+namespace br::inspector {
+
+namespace {
+
+constexpr DISPID kSelectObjectEvent = 1;
+constexpr long kAttributeFlags = 4;
+constexpr long kOptionLanguage = 61;
+constexpr long kOptionMissingValue = 64;
+
+bool SameId(const GUID& a, const GUID& b) { return std::memcmp(&a, &b, sizeof(GUID)) == 0; }
+
+// COM identities compare through IUnknown.
+bool SameObject(IUnknown* a, IUnknown* b) {
+  if (a == b) return true;
+  if (!a || !b) return false;
+  br::com::ComRef<IUnknown> ia, ib;
+  if (FAILED(a->QueryInterface(IID_IUnknown, ia.OutVoid())) || FAILED(b->QueryInterface(IID_IUnknown, ib.OutVoid())))
+    return false;
+  return ia.Get() == ib.Get();
+}
+
+std::wstring IdTextOf(const GUID& id) {
+  const std::u16string text = IdText(BytesOf(id));
+  return std::wstring(text.begin(), text.end());
+}
+
+const std::wstring kZeroIdText = L"{00000000-0000-0000-0000-000000000000}";
+
+}  // namespace
+
+const br::com::ClassIdentity XObjectInspector::kClass = {&CLSID_XObjectInspector, &IID_IXObjectInspector,
+                                                         &DIID__IXObjectInspectorEvents, L"XObjectInspector"};
+
+const XObjectInspector::Entry XObjectInspector::kInterfaces[] = {
+    {&IID_IUnknown, Self},
+    {&IID_IXObjectInspector, Self},
+    {&IID_IDispatch, Self},
+    {&IID_ISupportErrorInfo, ErrorInfo},
+    {&IID_IUnitsOption, UnitsOption},
+    {nullptr, nullptr},
+};
+
+XObjectInspector::XObjectInspector() {
+  br::RegisterTextClient(this);
+  CreateFormatter();
+}
+
+XObjectInspector::~XObjectInspector() {
+  std::vector<ObjectRecord> old;
+  old.swap(records_);
+  old.clear();
+  formatter_.Reset();
+  br::UnregisterTextClient(this);
+}
+
+void XObjectInspector::CreateFormatter() {
+  if (FAILED(CoCreateInstance(CLSID_ObjectFormatter, nullptr, CLSCTX_ALL, IID_IObjectFormatter, formatter_.OutVoid())))
+    formatter_.Reset();
+  if (!formatter_) return;
+  const std::string unknown = br::GetText("ObjInspector", 55, "unknown");  // makes the localiser too
+  long language = 0;
+  VARIANT option;
+  VariantInit(&option);
+  if (SUCCEEDED(br::GetLanguage(&language))) {
+    option.vt = VT_I4;
+    option.lVal = language;
+    formatter_->SetOption(kOptionLanguage, option);
+  }
+  option.vt = VT_BSTR;
+  option.bstrVal = br::com::BstrFromAnsi(unknown);
+  formatter_->SetOption(kOptionMissingValue, option);
+  VariantClear(&option);
+}
+
+// ---- SetInfo and AddInfo
+
+STDMETHODIMP XObjectInspector::SetInfo(VARIANT value) { return Take(value, true); }
+
+STDMETHODIMP XObjectInspector::AddInfo(VARIANT value) { return Take(value, false); }
+
+HRESULT XObjectInspector::Take(const VARIANT& value, bool replace) {
+  if (!Panel()) return OLE_E_BLANK;
+  if (rebuilding_) return E_ACCESSDENIED;  // a host calling back from inside its own formatter
+  br::control::OwnerHold hold(*static_cast<IXObjectInspector*>(this));
+  const toolkit::ToolkitWindows::Busy busy;
+  return Guard([&] {
+    ObjectTree& tree = Panel()->tree();
+    const long treeMode = static_cast<long>(br::ReadTreeMode());
+    // Deleting and inserting items sends selection notifications: none of them is a choice.
+    rebuilding_ = true;
+    struct Done {
+      bool& flag;
+      ObjectTree& tree;
+      ~Done() {
+        flag = false;
+        tree.SetRedraw(true);
+      }
+    } done{rebuilding_, tree};
+    tree.SetRedraw(false);
+
+    // The selected entry, to be found again after the change.
+    ObjectRecord remembered;
+    bool rememberedHeader = false;
+    bool haveRemembered = false;
+    const LPARAM selectedWord = tree.DataOf(tree.Selected());
+    if (IsRecordWord(selectedWord, records_.size())) {
+      remembered = records_[RecordOfWord(selectedWord)];
+      rememberedHeader = selectedWord == kHeaderWord;
+      haveRemembered = true;
+    }
+
+    if (replace) {
+      tree.DeleteAll();
+      std::vector<ObjectRecord> old;
+      old.swap(records_);  // an owner's release may call back: the list is already empty
+    }
+
+    TreeBuilder builder(tree, records_, formatter_.Get(), treeMode, reporter_);
+    builder.Add(ReadRecordArray(value));
+
+    HTREEITEM chosen = nullptr;
+    if (haveRemembered && !rememberedHeader) {
+      const auto index = FindRememberedRecord(records_.size(), [&](std::size_t i) {
+        return SameId(records_[i].id, remembered.id) && SameObject(records_[i].owner.Get(), remembered.owner.Get());
+      });
+      if (index) {
+        tree.ForEachItem([&](HTREEITEM item) {
+          if (tree.DataOf(item) != static_cast<LPARAM>(*index)) return true;
+          chosen = item;
+          return false;
+        });
+      }
+    }
+    if (!chosen) chosen = tree.FirstItem();
+    remembered.owner.Reset();
+    rebuilding_ = false;
+    // Selecting may fire SelectObject, whose sink may call SetInfo again: nothing below
+    // touches an item.
+    if (chosen && chosen != tree.Selected()) tree.Select(chosen);
+    return S_OK;
+  });
+}
+
+// ---- selection
+
+void XObjectInspector::ItemChosen(LPARAM data, bool doubleClick) {
+  if (rebuilding_ || !IsRecordWord(data, records_.size())) return;
+  br::control::OwnerHold hold(*static_cast<IXObjectInspector*>(this));
+  const std::size_t index = RecordOfWord(data);
+  const ObjectRecord record = records_[index];  // the list may change under the sinks
+  const bool header = index == 0;
+  ShowDetails(record, header);
+  GUID reported = record.id;
+  if (header) {
+    reported = GuidOf(DataSetIdOf(BytesOf(record.id)));
+  } else {
+    records_[0] = record;
+    if (InspectorPanel* panel = Panel()) {
+      ObjectTree& tree = panel->tree();
+      HTREEITEM top = tree.FirstItem();
+      if (top && tree.DataOf(top) == static_cast<LPARAM>(kHeaderWord))
+        tree.SetItemText(top, DataSetLabel(record.owner.Get(), record.id));
+    }
+  }
+  FireSelectObject(IdTextOf(reported), record.owner.Get(), doubleClick);
+}
+
+void XObjectInspector::ShowDetails(const ObjectRecord& record, bool header) {
+  InspectorPanel* panel = Panel();
+  if (!panel) return;
+  int card = InspectorPanel::kCardDetails;
+  if (!header) {
+    const ComRef<IGeoObject> object = ObjectOf(DatabaseOf(record.owner.Get()).Get(), record.id);
+    const auto facts = FactsOf(object.Get());
+    if (facts && IsHierarchyClass(facts->classCode) && facts->haveKind && KindNotBelow(facts->kind, kHierarchyKind))
+      card = InspectorPanel::kCardHierarchy;
+  }
+  panel->showCard(card);
+  // The attribute and metadata panels fill panel->attributesCard() here.
+}
+
+void XObjectInspector::FireSelectObject(const std::wstring& guidText, IUnknown* owner, bool doubleClick) {
+  // Everything the sinks see is a copy: they may call SetInfo or release the control.
+  VARIANT ownerValue;
+  VariantInit(&ownerValue);
+  ownerValue.vt = VT_UNKNOWN;
+  ownerValue.punkVal = owner;
+  if (owner) owner->AddRef();
+  VARIANT arguments[3];
+  for (VARIANT& argument : arguments) VariantInit(&argument);
+  arguments[2].vt = VT_BSTR;
+  arguments[2].bstrVal = SysAllocString(guidText.c_str());
+  arguments[1].vt = VT_BYREF | VT_VARIANT;
+  arguments[1].pvarVal = &ownerValue;
+  arguments[0].vt = VT_I4;
+  arguments[0].lVal = doubleClick ? 1 : 0;
+  DISPPARAMS parameters = {arguments, nullptr, 3, 0};
+  FireEvent(kSelectObjectEvent, &parameters);
+  SysFreeString(arguments[2].bstrVal);
+  VariantClear(&ownerValue);
+}
+
+STDMETHODIMP XObjectInspector::GetSelectedObject(BSTR* guid, IUnknown** owner) {
+  if (!guid || !owner) return E_INVALIDARG;
+  *guid = nullptr;
+  *owner = nullptr;
+  return Guard([&] {
+    if (!Panel()) return E_FAIL;
+    ObjectTree& tree = Panel()->tree();
+    const LPARAM word = tree.DataOf(tree.Selected());
+    if (!IsRecordWord(word, records_.size())) {
+      *guid = SysAllocString(kZeroIdText.c_str());
+      return S_FALSE;
+    }
+    const ObjectRecord& record = records_[RecordOfWord(word)];
+    const GUID id = word == kHeaderWord ? GuidOf(DataSetIdOf(BytesOf(record.id))) : record.id;
+    *guid = SysAllocString(IdTextOf(id).c_str());
+    *owner = ComRef<IUnknown>(record.owner.Get()).Detach();
+    return S_OK;
+  });
+}
+
+// ---- DataSet, agency names and attribute texts
+
+STDMETHODIMP XObjectInspector::get_DataSet(IUnknown** dataSet) {
+  if (!dataSet) return E_POINTER;
+  *dataSet = nullptr;
+  return Guard([&]() -> HRESULT {
+    if (records_.empty()) return S_FALSE;
+    const ObjectRecord& first = records_[0];
+    if (IsDataSetEntry(first.owner.Get())) {
+      *dataSet = ComRef<IUnknown>(first.owner.Get()).Detach();
+      return S_OK;
+    }
+    const ComRef<IGeoDatabase> database = DatabaseOf(first.owner.Get());
+    if (!database) return E_NOINTERFACE;
+    ComRef<IGeoObject> object;
+    HRESULT hr = database->GetGeoObject(first.id, object.Out());
+    if (hr != S_OK || !object) return FAILED(hr) ? hr : E_FAIL;
+    ComRef<IGeoDataSet> found;
+    hr = object->GetDataSet(found.Out());
+    if (FAILED(hr)) return hr;
+    if (!found) return E_FAIL;
+    *dataSet = found.Detach();
+    return S_OK;
+  });
+}
+
+STDMETHODIMP XObjectInspector::HOCode2Name(LONG code, BSTR* name, BSTR* abbreviation) {
+  // Without an agency table every code answers as itself. An out-string not filled is
+  // set to null: an untouched one would be garbage to a marshaller.
+  if (abbreviation) *abbreviation = nullptr;
+  if (name) *name = br::com::BstrFromAnsi(std::to_string(code));
+  return S_FALSE;
+}
+
+STDMETHODIMP XObjectInspector::FormatAttributes(IUnknown* database, BSTR guid, BSTR* attributes) {
+  if (!attributes) return E_INVALIDARG;
+  *attributes = nullptr;
+  if (!database || !guid) return E_INVALIDARG;
+  return Guard([&]() -> HRESULT {
+    const ComRef<IGeoDatabase> geo = DatabaseOf(database);
+    if (!geo) return E_INVALIDARG;
+    const auto id = ParseIdText(std::u16string_view(reinterpret_cast<const char16_t*>(guid), SysStringLen(guid)));
+    if (!id) return E_INVALIDARG;
+    if (IsDataSetId(*id)) return E_NOTIMPL;  // the dataset's metadata text comes with the metadata panels
+    const ComRef<IGeoObject> object = ObjectOf(geo.Get(), GuidOf(*id));
+    if (!object) return E_INVALIDARG;
+    if (!formatter_) return E_FAIL;
+    br::com::BstrHolder text;
+    if (FAILED(formatter_->FormatObject(0, kAttributeFlags, object.Get(), 0, 0, text.Out())) || !text.Get())
+      return E_INVALIDARG;
+    const auto lines =
+        AttributeLines(std::u16string_view(reinterpret_cast<const char16_t*>(text.Get()), SysStringLen(text.Get())));
+    if (!lines) return E_INVALIDARG;
+    *attributes = SysAllocStringLen(reinterpret_cast<const OLECHAR*>(lines->data()), static_cast<UINT>(lines->size()));
+    return *attributes ? S_OK : E_OUTOFMEMORY;
+  });
+}
+
+// ---- content
+
+std::unique_ptr<toolkit::Container> XObjectInspector::MakeContent() { return std::make_unique<InspectorPanel>(relay_); }
+
+void XObjectInspector::ContentGoing() {
+  rebuilding_ = true;  // the items going send selection notifications
+  std::vector<ObjectRecord> old;
+  old.swap(records_);
+  rebuilding_ = false;
+}
+
+toolkit::cXComponent* XObjectInspector::FocusChild() { return Panel() ? &Panel()->tree() : nullptr; }
+
+}  // namespace br::inspector
