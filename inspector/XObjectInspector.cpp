@@ -26,14 +26,21 @@ constexpr long kOptionMissingValue = 64;
 
 bool SameId(const GUID& a, const GUID& b) { return std::memcmp(&a, &b, sizeof(GUID)) == 0; }
 
-// COM identities compare through IUnknown.
-bool SameObject(IUnknown* a, IUnknown* b) {
+// Owners are the same object by COM identity; a host that hands out a fresh wrapper of
+// one database for every answer is recognised by the database's name.
+bool SameOwner(IUnknown* a, IUnknown* b) {
   if (a == b) return true;
   if (!a || !b) return false;
   br::com::ComRef<IUnknown> ia, ib;
-  if (FAILED(a->QueryInterface(IID_IUnknown, ia.OutVoid())) || FAILED(b->QueryInterface(IID_IUnknown, ib.OutVoid())))
-    return false;
-  return ia.Get() == ib.Get();
+  if (SUCCEEDED(a->QueryInterface(IID_IUnknown, ia.OutVoid())) && SUCCEEDED(b->QueryInterface(IID_IUnknown, ib.OutVoid())) &&
+      ia.Get() == ib.Get())
+    return true;
+  const ComRef<IGeoDatabase> da = DatabaseOf(a), db = DatabaseOf(b);
+  if (!da || !db) return false;
+  br::com::BstrHolder na, nb;
+  if (FAILED(da->GetName(na.Out())) || FAILED(db->GetName(nb.Out())) || SysStringLen(na.Get()) == 0) return false;
+  return SysStringLen(na.Get()) == SysStringLen(nb.Get()) &&
+         std::memcmp(na.Get(), nb.Get(), SysStringLen(na.Get()) * sizeof(OLECHAR)) == 0;
 }
 
 std::wstring IdTextOf(const GUID& id) {
@@ -138,7 +145,7 @@ HRESULT XObjectInspector::Take(const VARIANT& value, bool replace) {
     HTREEITEM chosen = nullptr;
     if (haveRemembered && !rememberedHeader) {
       const auto index = FindRememberedRecord(records_.size(), [&](std::size_t i) {
-        return SameId(records_[i].id, remembered.id) && SameObject(records_[i].owner.Get(), remembered.owner.Get());
+        return SameId(records_[i].id, remembered.id) && SameOwner(records_[i].owner.Get(), remembered.owner.Get());
       });
       if (index) {
         tree.ForEachItem([&](HTREEITEM item) {

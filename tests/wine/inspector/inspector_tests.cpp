@@ -1,0 +1,488 @@
+// XObjectInspector over scenes written here: record arrays, the grouped tree (labels,
+// icons, data words and order read through the tree view's messages), tree modes, the
+// chart rules, selection events, GetSelectedObject, DataSet, FormatAttributes,
+// HOCode2Name, IUnitsOption, the log of a failing fill and re-entrant sinks.
+#include "tests/wine/inspector/InspectorFixture.h"
+
+#include "tests/wine/common/SceneProbe.h"
+#include "tests/wine/common/registry_test_support.h"
+
+#include "BR_Private.h"
+#include "frame/settings/cRegSettings.h"
+#include "frame/settings/settings.h"
+
+#include <doctest/doctest.h>
+
+#include <cstring>
+#include <fstream>
+#include <memory>
+#include <sstream>
+#include <string>
+#include <vector>
+
+using namespace br::test;
+
+namespace {
+
+// A user database (grouping by class), a chart database (relations, harbours, collections),
+// the mariner's dataset "1" and a chain of landmarks deeper than the fill goes.
+std::string SceneJson() {
+  std::string chain;
+  for (int i = 0; i < 40; ++i) {
+    chain += ",{\"name\":\"deep-" + std::to_string(i) + "\",\"class\":\"LNDMRK\",\"point\":[1,1]";
+    if (i + 1 < 40) chain += ",\"members\":[\"deep-" + std::to_string(i + 1) + "\"]";
+    chain += "}";
+  }
+  return R"({"format":"chartscene 1",
+ "catalogue":{"classes":[{"code":55001,"acronym":"harbr_","name":"Harbour"},
+   {"code":55500,"acronym":"hrbent","name":"Harbour entry point"},
+   {"code":55059,"acronym":"srvint","name":"Internal service"},
+   {"code":53355,"acronym":"tecobj","name":"Technical object"}],
+   "hidden":["M_NSYS"]},
+ "databases":[
+  {"name":"USERDB","kind":"user","datasets":[{"id":"GROUPS1","objects":[
+   {"name":"u-other","class":"DEPARE","area":[[0,0],[0,1],[1,1]],"attributes":{"OBJNAM":"Deep"}},
+   {"name":"u-rock","class":"UWTROC","point":[0,0],"attributes":{"OBJNAM":"Rock"}},
+   {"name":"u-light","class":"LIGHTS","point":[0,0],"attributes":{"OBJNAM":"Lamp"}},
+   {"name":"u-track","class":"NAVLNE","line":[[0,0],[1,1]],"attributes":{"OBJNAM":"Track"}},
+   {"name":"u-area","class":"ADMARE","area":[[0,0],[0,1],[1,1]],"attributes":{"OBJNAM":"Admin"}},
+   {"name":"u-built","class":"BUAARE","area":[[0,0],[0,1],[1,1]],"attributes":{"OBJNAM":"Town"}},
+   {"name":"u-harbour","class":"harbr_","point":[0,0],"attributes":{"OBJNAM":"Port"}},
+   {"name":"u-tech","class":"tecobj","primitive":"none"},
+   {"name":"u-hidden","class":"LIGHTS","point":[0,0],"flags":1,"attributes":{"OBJNAM":"Hidden"}},
+   {"name":"u-gone","class":"LIGHTS","point":[0,0],"flags":33554432,"attributes":{"OBJNAM":"Gone"}},
+   {"name":"u-marked","class":"UWTROC","point":[0,0],"flags":256,"attributes":{"OBJNAM":"Marked"}},
+   {"name":"u-system","class":"M_NSYS","primitive":"none"},
+   {"name":"u-pair-1","class":"LIGHTS","point":[0,0],"attributes":{"OBJNAM":"Pair one"}},
+   {"name":"u-pair-2","class":"LIGHTS","point":[0,0],"attributes":{"OBJNAM":"Pair two"}},
+   {"name":"u-pair","class":"C_AGGR","primitive":"none","attributes":{"OBJNAM":"Pair"},"members":["u-pair-1","u-pair-2"]}
+  ]}]},
+  {"name":"CHARTDB","kind":"chart","datasets":[{"id":"CHART001","objects":[
+   {"name":"c-light","class":"LIGHTS","point":[0,0],"attributes":{"OBJNAM":"Alpha"}},
+   {"name":"c-beacon","class":"BCNLAT","point":[0,0],"flags":512,"attributes":{"OBJNAM":"Beacon"}},
+   {"name":"c-group","class":"C_AGGR","primitive":"none","attributes":{"OBJNAM":"Group"},"members":["c-light","c-beacon"]},
+   {"name":"c-harbour","class":"harbr_","point":[0,0],"attributes":{"OBJNAM":"Port"},"members":["c-entry","c-shop"]},
+   {"name":"c-entry","class":"hrbent","point":[0,0],"attributes":{"OBJNAM":"Entry"}},
+   {"name":"c-shop","class":"srvint","point":[0,0],"attributes":{"OBJNAM":"Shop"}},
+   {"name":"c-tech","class":"tecobj","primitive":"none"})" +
+         chain + R"(
+  ]}]},
+  {"name":"MARINER","kind":"user","datasets":[{"id":"1","objects":[
+   {"name":"m-note","class":"LIGHTS","point":[0,0],"attributes":{"OBJNAM":"Note"}}]}]}
+ ]})";
+}
+
+std::string Narrow(const std::wstring& text) {
+  std::string narrow;
+  for (wchar_t c : text) narrow += c < 128 ? static_cast<char>(c) : '?';
+  return narrow;
+}
+
+VARIANT Bytes(const std::vector<unsigned char>& bytes) {
+  VARIANT v;
+  v.vt = VT_ARRAY | VT_UI1;
+  v.parray = SafeArrayCreateVector(VT_UI1, 0, static_cast<ULONG>(bytes.size()));
+  if (!bytes.empty()) std::memcpy(v.parray->pvData, bytes.data(), bytes.size());
+  return v;
+}
+
+std::wstring Take(BSTR text) {
+  std::wstring result = text ? std::wstring(text, SysStringLen(text)) : L"<null>";
+  SysFreeString(text);
+  return result;
+}
+
+// The database name an owner answers.
+std::wstring NameOfOwner(IUnknown* owner) {
+  if (!owner) return L"<none>";
+  ComRef<IGeoDatabase> database = Query<IGeoDatabase>(owner);
+  BSTR name = nullptr;
+  REQUIRE(database->GetName(&name) == S_OK);
+  return Take(name);
+}
+
+struct Suite {
+  DllUnderTest dll;
+  TestScene scene{SceneJson()};
+  SavedRegistryValue treeMode{HKEY_LOCAL_MACHINE, std::string(br::cRegSettings::BASE_PATH) + "\\" + br::SETTINGS_ENUM_KEY,
+                              br::SETTING_TREE_MODE};
+  ~Suite() { CHECK(dll.CanUnloadNow() == S_OK); }
+};
+
+HRESULT SetRecords(InspectorControl& inspector, TestScene& scene, const wchar_t* names, bool add = false) {
+  VARIANT records = scene.Records(names);
+  const HRESULT hr = add ? inspector->AddInfo(records) : inspector->SetInfo(records);
+  VariantClear(&records);
+  return hr;
+}
+
+const wchar_t* kUserObjects =
+    L"u-other, u-rock, u-light, u-track, u-area, u-built, u-harbour, u-tech, u-hidden, u-gone, u-marked, "
+    L"u-system, u-pair-1, u-pair-2";
+
+}  // namespace
+
+TEST_CASE("arrays of records: sizes and shapes") {
+  Suite s;
+  {
+    InspectorControl inspector(s.dll);
+    VARIANT early = s.scene.Records(L"u-rock");
+    CHECK(inspector->AddInfo(early) == OLE_E_BLANK);  // no window, no tree
+    CHECK(inspector->SetInfo(early) == OLE_E_BLANK);
+    VariantClear(&early);
+    inspector.Host();
+
+    const std::vector<unsigned char> two = s.scene.RecordBytes(L"u-rock, u-light");
+    REQUIRE(two.size() == 2 * sizeof(GEO_OBJECT_RECORD));
+    REQUIRE(sizeof(GEO_OBJECT_RECORD) == 24);
+    struct Row {
+      std::size_t bytes;
+      std::size_t items;  // with the header item
+    };
+    for (const Row& row : {Row{48, 3}, Row{52, 3}, Row{40, 2}, Row{30, 0}, Row{24, 2}, Row{20, 0}}) {
+      INFO("bytes ", row.bytes);
+      std::vector<unsigned char> bytes = two;
+      bytes.resize(row.bytes, 0);
+      VARIANT v = Bytes(bytes);
+      CHECK(inspector->SetInfo(v) == S_OK);
+      CHECK(inspector.Items().size() == row.items);
+      VariantClear(&v);
+    }
+
+    SUBCASE("by reference, inside a VARIANT by reference, and refused shapes") {
+      VARIANT v = Bytes(two);
+      VARIANT byRef;
+      byRef.vt = VT_BYREF | VT_ARRAY | VT_UI1;
+      byRef.pparray = &v.parray;
+      CHECK(inspector->SetInfo(byRef) == S_OK);
+      CHECK(inspector.Items().size() == 3);
+      VARIANT inVariant;
+      inVariant.vt = VT_BYREF | VT_VARIANT;
+      inVariant.pvarVal = &v;
+      CHECK(inspector->SetInfo(inVariant) == S_OK);
+      CHECK(inspector.Items().size() == 3);
+      // Two levels of reference are not followed.
+      VARIANT twice;
+      twice.vt = VT_BYREF | VT_VARIANT;
+      twice.pvarVal = &inVariant;
+      CHECK(inspector->SetInfo(twice) == S_OK);
+      CHECK(inspector.Items().empty());
+
+      // Two dimensions of the same bytes.
+      SAFEARRAYBOUND bounds[2] = {{24, 0}, {2, 0}};
+      VARIANT square;
+      square.vt = VT_ARRAY | VT_UI1;
+      square.parray = SafeArrayCreate(VT_UI1, 2, bounds);
+      std::memcpy(square.parray->pvData, two.data(), two.size());
+      CHECK(inspector->SetInfo(square) == S_OK);
+      CHECK(inspector.Items().empty());
+      VariantClear(&square);
+
+      // VARIANT elements are 24 bytes too, and never records.
+      VARIANT variants;
+      variants.vt = VT_ARRAY | VT_VARIANT;
+      variants.parray = SafeArrayCreateVector(VT_VARIANT, 0, 2);
+      CHECK(inspector->SetInfo(variants) == S_OK);
+      CHECK(inspector.Items().empty());
+      VariantClear(&variants);
+
+      // Whole records of a plain element type.
+      VARIANT records;
+      records.vt = VT_ARRAY | VT_UI1;
+      SAFEARRAY* array = nullptr;
+      REQUIRE(SafeArrayAllocDescriptor(1, &array) == S_OK);
+      array->cbElements = sizeof(GEO_OBJECT_RECORD);
+      array->rgsabound[0].cElements = 2;
+      REQUIRE(SafeArrayAllocData(array) == S_OK);
+      std::memcpy(array->pvData, two.data(), two.size());
+      records.parray = array;
+      CHECK(inspector->SetInfo(records) == S_OK);
+      CHECK(inspector.Items().size() == 3);
+      SafeArrayDestroy(array);
+
+      VARIANT empty;
+      empty.vt = VT_EMPTY;
+      CHECK(inspector->SetInfo(empty) == S_OK);
+      CHECK(inspector.Items().empty());
+      VariantClear(&v);
+    }
+  }
+}
+
+TEST_CASE("the tree: groups in their order, labels, icons and data words") {
+  Suite s;
+  InspectorControl inspector(s.dll);
+  inspector.Host();
+  REQUIRE(SetRecords(inspector, s.scene, kUserObjects) == S_OK);
+  const std::vector<TreeItem> items = inspector.Items();
+  struct Expected {
+    const wchar_t* text;
+    int icon;
+    LPARAM data;
+  };
+  // Harbours, class 13, aids, dangers, areas, routeing, aggregations, associations, others;
+  // technical, hidden, hidden-class objects dropped, the pair listed once as its collection.
+  const Expected expected[] = {{L"DataSet GROUPS1   USERDB", 5, -2},
+                               {L"Harbour Port", 1, 1},
+                               {L"Built-up area Town", 3, 2},
+                               {L"Light Lamp", 1, 3},
+                               {L"Underwater rock / awash rock Rock", 1, 4},
+                               {L"Underwater rock / awash rock Marked", 7, 5},
+                               {L"Administration area (Named) Admin", 3, 6},
+                               {L"Navigation line Track", 2, 7},
+                               {L"Aggregation Pair", 4, 8},
+                               {L"Depth area Deep", 3, 9}};
+  REQUIRE(items.size() == std::size(expected));
+  for (std::size_t i = 0; i < items.size(); ++i) {
+    INFO("item ", i);
+    CHECK(Narrow(items[i].text) == Narrow(expected[i].text));
+    CHECK(items[i].icon == expected[i].icon);
+    CHECK(items[i].selectedIcon == expected[i].icon);
+    CHECK(items[i].data == expected[i].data);
+    CHECK(items[i].depth == 0);
+  }
+  // The first item is selected and announced.
+  CHECK(inspector.SelectedData() == -2);
+  REQUIRE(inspector.sink.events.size() == 1);
+  CHECK(inspector.sink.events[0].guid == DataSetIdText(s.scene.ObjectId(L"u-other")));
+
+  SUBCASE("AddInfo appends after the records there") {
+    REQUIRE(SetRecords(inspector, s.scene, L"u-light", true) == S_OK);
+    const std::vector<TreeItem> more = inspector.Items();
+    REQUIRE(more.size() == items.size() + 1);
+    CHECK(more.back().text == L"Light Lamp");
+    CHECK(more.back().data == 10);
+  }
+  SUBCASE("the mariner's dataset") {
+    REQUIRE(SetRecords(inspector, s.scene, L"m-note") == S_OK);
+    CHECK(inspector.RootTexts() == std::vector<std::wstring>{L"Mariner Objects   MARINER", L"Light Note"});
+  }
+}
+
+TEST_CASE("chart databases: relations, collections and harbours by tree mode") {
+  Suite s;
+  InspectorControl inspector(s.dll);
+  inspector.Host();
+
+  SUBCASE("a collection shows its members below it, expanded; the marked member marks the light") {
+    REQUIRE(SetRecords(inspector, s.scene, L"c-group, c-tech") == S_OK);
+    const std::vector<TreeItem> items = inspector.Items();
+    REQUIRE(items.size() == 4);
+    CHECK(items[0].text == L"DataSet CHART001   CHARTDB");
+    CHECK(items[1].text == L"Aggregation Group");
+    CHECK(items[1].icon == 4 + 6);  // a member is marked
+    CHECK(items[2].text == L"Light Alpha");
+    CHECK(items[2].depth == 1);
+    CHECK(items[2].icon == 1);
+    CHECK(items[3].text == L"Beacon, lateral Beacon");
+    CHECK(items[3].icon == 1 + 6);  // flag bit 9
+    CHECK(items[3].data == 3);
+    CHECK((TreeView_GetItemState(inspector.Tree(), inspector.ItemWithData(1), TVIS_EXPANDED) & TVIS_EXPANDED) != 0);
+  }
+  SUBCASE("a light below the root leaves its collection out") {
+    REQUIRE(SetRecords(inspector, s.scene, L"c-light") == S_OK);
+    CHECK(inspector.RootTexts() == std::vector<std::wstring>{L"DataSet CHART001   CHARTDB", L"Light Alpha"});
+    CHECK(inspector.Items().size() == 2);
+  }
+  SUBCASE("tree mode 0: the harbour through its entry point") {
+    s.treeMode.SetDword(0);
+    REQUIRE(SetRecords(inspector, s.scene, L"c-harbour") == S_OK);
+    const std::vector<TreeItem> items = inspector.Items();
+    REQUIRE(items.size() == 3);
+    CHECK(items[1].text == L"Harbour entry point Entry");
+    CHECK(items[1].depth == 0);
+    CHECK(items[2].text == L"Harbour Port");
+    CHECK(items[2].depth == 1);
+    CHECK(items[2].icon == 30);
+    CHECK(items[2].selectedIcon == 30);
+  }
+  SUBCASE("tree mode 1: the harbour itself, services and entry left out") {
+    s.treeMode.SetDword(1);
+    REQUIRE(SetRecords(inspector, s.scene, L"c-harbour") == S_OK);
+    const std::vector<TreeItem> items = inspector.Items();
+    REQUIRE(items.size() == 2);
+    CHECK(items[1].text == L"Harbour Port");
+    CHECK(items[1].icon == 1);
+  }
+  SUBCASE("a tree mode written as text counts as 0") {
+    s.treeMode.SetString("1");
+    REQUIRE(SetRecords(inspector, s.scene, L"c-harbour") == S_OK);
+    CHECK(inspector.RootTexts().at(1) == L"Harbour entry point Entry");
+  }
+}
+
+TEST_CASE("selection: events, GetSelectedObject and the remembered entry") {
+  Suite s;
+  InspectorControl inspector(s.dll);
+  inspector.Host();
+  REQUIRE(SetRecords(inspector, s.scene, L"u-light, u-rock") == S_OK);
+  inspector.sink.events.clear();
+
+  const std::wstring rock = s.scene.ObjectId(L"u-rock");
+  inspector.Select(inspector.ItemWithData(2));
+  REQUIRE(inspector.sink.events.size() == 1);
+  CHECK(inspector.sink.events[0].guid == rock);
+  CHECK(inspector.sink.events[0].ownerType == VT_UNKNOWN);
+  CHECK(NameOfOwner(inspector.sink.events[0].owner.Get()) == L"USERDB");
+  CHECK(inspector.sink.events[0].doubleClick == 0);
+
+  inspector.DoubleClick();
+  REQUIRE(inspector.sink.events.size() == 2);
+  CHECK(inspector.sink.events[1].guid == rock);
+  CHECK(inspector.sink.events[1].doubleClick == 1);
+
+  BSTR guid = nullptr;
+  ComRef<IUnknown> owner;
+  CHECK(inspector->GetSelectedObject(&guid, owner.Out()) == S_OK);
+  CHECK(Take(guid) == rock);
+  CHECK(NameOfOwner(owner.Get()) == L"USERDB");
+  CHECK(inspector->GetSelectedObject(nullptr, owner.Out()) == E_INVALIDARG);
+  CHECK(inspector->GetSelectedObject(&guid, nullptr) == E_INVALIDARG);
+
+  SUBCASE("the header reports its dataset") {
+    inspector.Select(inspector.ItemWithData(-2));
+    CHECK(inspector.sink.events.back().guid == DataSetIdText(rock));
+    CHECK(inspector->GetSelectedObject(&guid, owner.Out()) == S_OK);
+    CHECK(Take(guid) == DataSetIdText(rock));
+  }
+  SUBCASE("AddInfo keeps the selected object, not the first one") {
+    // The rock is record 2 and, being selected, also record 0.
+    REQUIRE(SetRecords(inspector, s.scene, L"u-area", true) == S_OK);
+    CHECK(inspector.SelectedData() == 2);
+    REQUIRE(SetRecords(inspector, s.scene, L"u-light, u-rock") == S_OK);  // rebuilt: found again
+    CHECK(inspector.SelectedData() == 2);
+    CHECK(inspector.sink.events.back().guid == rock);
+  }
+  SUBCASE("nothing selected") {
+    VARIANT none;
+    none.vt = VT_EMPTY;
+    REQUIRE(inspector->SetInfo(none) == S_OK);
+    CHECK(inspector->GetSelectedObject(&guid, owner.Out()) == S_FALSE);
+    CHECK(Take(guid) == L"{00000000-0000-0000-0000-000000000000}");
+    CHECK(!owner);
+  }
+}
+
+TEST_CASE("sinks that call back inside SelectObject") {
+  Suite s;
+  auto inspector = std::make_unique<InspectorControl>(s.dll);
+  inspector->Host();
+  REQUIRE(SetRecords(*inspector, s.scene, L"u-light, u-rock, u-area") == S_OK);
+
+  SUBCASE("SetInfo from the sink") {
+    int calls = 0;
+    inspector->sink.onCall = [&] {
+      if (++calls > 1) return;
+      CHECK(SetRecords(*inspector, s.scene, L"u-track") == S_OK);
+    };
+    inspector->Select(inspector->ItemWithData(3));
+    CHECK(inspector->RootTexts() == std::vector<std::wstring>{L"DataSet GROUPS1   USERDB", L"Navigation line Track"});
+    CHECK(inspector->sink.events.back().guid == DataSetIdText(s.scene.ObjectId(L"u-track")));
+  }
+  SUBCASE("the last reference released from the sink") {
+    IXObjectInspector* raw = inspector->Get();
+    raw->AddRef();
+    inspector->sink.onCall = [&] {
+      inspector->sink.onCall = nullptr;
+      inspector->Close();  // the host window and the test's reference go
+      raw->Release();
+    };
+    inspector->Select(inspector->ItemWithData(2));
+    CHECK(inspector->sink.events.size() >= 2);
+  }
+  inspector.reset();
+}
+
+TEST_CASE("DataSet, FormatAttributes, HOCode2Name and IUnitsOption") {
+  Suite s;
+  InspectorControl inspector(s.dll);
+  inspector.Host();
+
+  ComRef<IUnknown> dataSet;
+  CHECK(inspector->get_DataSet(nullptr) == E_POINTER);
+  CHECK(inspector->get_DataSet(dataSet.Out()) == S_FALSE);
+  CHECK(!dataSet);
+  REQUIRE(SetRecords(inspector, s.scene, L"u-rock") == S_OK);
+  REQUIRE(inspector->get_DataSet(dataSet.Out()) == S_OK);
+  ComRef<IGeoDatabase> database;
+  REQUIRE(Query<IGeoDataSet>(dataSet.Get())->GetDatabase(database.Out()) == S_OK);
+  CHECK(NameOfOwner(database.Get()) == L"USERDB");
+
+  const ComRef<IUnknown> userDb = s.scene.Database(L"USERDB");
+  BSTR text = nullptr;
+  BSTR rock = SysAllocString(s.scene.ObjectId(L"u-rock").c_str());
+  CHECK(inspector->FormatAttributes(userDb.Get(), rock, &text) == S_OK);
+  CHECK(Take(text) == L"Object name\rRock");
+  for (const wchar_t* bad : {L"BR_Info.XObjectInspector", L"", L"{12345678-0000-0000-0000-000000000000}",
+                             L"{2C3A2B7E-0000-0000-5553-45524442AAAAA}"}) {
+    INFO(std::string(bad, bad + wcslen(bad)));
+    BSTR guid = SysAllocString(bad);
+    text = reinterpret_cast<BSTR>(1);
+    CHECK(inspector->FormatAttributes(userDb.Get(), guid, &text) == E_INVALIDARG);
+    CHECK(text == nullptr);
+    SysFreeString(guid);
+  }
+  CHECK(inspector->FormatAttributes(userDb.Get(), nullptr, &text) == E_INVALIDARG);
+  CHECK(inspector->FormatAttributes(nullptr, rock, &text) == E_INVALIDARG);
+  CHECK(inspector->FormatAttributes(s.scene.Object(L"u-rock").Get(), rock, &text) == E_INVALIDARG);
+  CHECK(inspector->FormatAttributes(userDb.Get(), rock, nullptr) == E_INVALIDARG);
+  SysFreeString(rock);
+
+  BSTR name = nullptr;
+  BSTR abbreviation = reinterpret_cast<BSTR>(static_cast<uintptr_t>(0xBAD));
+  CHECK(inspector->HOCode2Name(550, &name, &abbreviation) == S_FALSE);
+  CHECK(Take(name) == L"550");
+  CHECK(abbreviation == nullptr);
+  CHECK(inspector->HOCode2Name(550, nullptr, nullptr) == S_FALSE);
+
+  ComRef<IUnitsOption> units = Query<IUnitsOption>(inspector.Get());
+  CHECK(units->SetOption(1) == S_OK);
+  CHECK(units->SetOption(0) == S_OK);
+  VARIANT value;
+  value.vt = VT_BSTR;
+  value.bstrVal = SysAllocString(L"metric");
+  CHECK(units->SetUnits(value) == S_OK);
+  VariantClear(&value);
+  value.vt = VT_R8;
+  value.dblVal = 2.0;
+  CHECK(units->SetUnits(value) == S_OK);
+  value.vt = VT_UNKNOWN;
+  value.punkVal = nullptr;
+  CHECK(units->SetUnits(value) == E_INVALIDARG);
+}
+
+TEST_CASE("a failing fill and a fill too deep are logged; no geo failure stops the fill") {
+  char temp[MAX_PATH];
+  GetTempPathA(MAX_PATH, temp);
+  const std::string log = std::string(temp) + "inspector_fill_" + std::to_string(GetCurrentProcessId()) + ".log";
+  DeleteFileA(log.c_str());
+  SavedRegistryValue mask{HKEY_LOCAL_MACHINE, br::cRegSettings::BASE_PATH, br::SETTING_LOG_MASK};
+  SavedRegistryValue file{HKEY_LOCAL_MACHINE, br::cRegSettings::BASE_PATH, br::SETTING_LOG_FILE};
+  mask.SetDword(1);
+  file.SetString(log);
+  {
+    Suite s;  // the library reads its log switches when it is loaded
+    SceneProbe probe;
+    InspectorControl inspector(s.dll);
+    inspector.Host();
+
+    REQUIRE(SetRecords(inspector, s.scene, L"deep-0") == S_OK);
+    const std::vector<TreeItem> items = inspector.Items();
+    CHECK(items.size() == 1 + 32);  // the header and 32 levels
+    CHECK(items.back().depth == 31);
+
+    probe.SetFault("IGeoObject.GetKindId", E_FAIL);
+    REQUIRE(SetRecords(inspector, s.scene, L"c-light") == S_OK);
+    probe.ClearFaults();
+    CHECK(inspector.RootTexts() == std::vector<std::wstring>{L"DataSet CHART001   CHARTDB"});
+  }
+  std::ifstream in(log);
+  std::stringstream text;
+  text << in.rdbuf();
+  const std::string lines = text.str();
+  CHECK(lines.find("CXObjectInspector::_FillGeoObjTree") != std::string::npos);
+  CHECK(lines.find("related objects cut at depth 32") != std::string::npos);
+  CHECK(lines.find("hres:0x80004005") != std::string::npos);
+  in.close();
+  DeleteFileA(log.c_str());
+}
