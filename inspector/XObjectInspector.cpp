@@ -271,11 +271,11 @@ STDMETHODIMP XObjectInspector::get_DataSet(IUnknown** dataSet) {
 }
 
 STDMETHODIMP XObjectInspector::HOCode2Name(LONG code, BSTR* name, BSTR* abbreviation) {
-  // Without an agency table every code answers as itself. An out-string not filled is
-  // set to null: an untouched one would be garbage to a marshaller.
+  // The table leaves an abbreviation it has not found untouched; an untouched out-string
+  // is garbage to a marshaller, so it starts out null.
   if (abbreviation) *abbreviation = nullptr;
-  if (name) *name = br::com::BstrFromAnsi(std::to_string(code));
-  return S_FALSE;
+  if (name) *name = nullptr;
+  return Guard([&] { return agencies_.Lookup(static_cast<std::int32_t>(code), name, abbreviation); });
 }
 
 STDMETHODIMP XObjectInspector::FormatAttributes(IUnknown* database, BSTR guid, BSTR* attributes) {

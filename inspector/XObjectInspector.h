@@ -7,6 +7,7 @@
 #include "frame/com/ComRef.h"
 #include "frame/control/ToolkitControl.h"
 #include "frame/errors/cErrReporter.h"
+#include "frame/geo/AgencyTable.h"
 #include "inspector/InspectorPanel.h"
 #include "inspector/InspectorUnitsFace.h"
 #include "inspector/object_records.h"
@@ -68,6 +69,7 @@ private:
   std::vector<ObjectRecord> records_;
   br::com::ComRef<IObjectFormatter> formatter_;
   br::cErrReporter reporter_;
+  br::geo::AgencyTable agencies_;  // loaded once, with the control
   UnitsOptions units_;
   InspectorUnitsFace unitsFace_{*static_cast<IXObjectInspector*>(this), *this};
   ChoiceRelay relay_{*this};

@@ -428,13 +428,6 @@ TEST_CASE("DataSet, FormatAttributes, HOCode2Name and IUnitsOption") {
   CHECK(inspector->FormatAttributes(userDb.Get(), rock, nullptr) == E_INVALIDARG);
   SysFreeString(rock);
 
-  BSTR name = nullptr;
-  BSTR abbreviation = reinterpret_cast<BSTR>(static_cast<uintptr_t>(0xBAD));
-  CHECK(inspector->HOCode2Name(550, &name, &abbreviation) == S_FALSE);
-  CHECK(Take(name) == L"550");
-  CHECK(abbreviation == nullptr);
-  CHECK(inspector->HOCode2Name(550, nullptr, nullptr) == S_FALSE);
-
   ComRef<IUnitsOption> units = Query<IUnitsOption>(inspector.Get());
   CHECK(units->SetOption(1) == S_OK);
   CHECK(units->SetOption(0) == S_OK);
@@ -449,6 +442,40 @@ TEST_CASE("DataSet, FormatAttributes, HOCode2Name and IUnitsOption") {
   value.vt = VT_UNKNOWN;
   value.punkVal = nullptr;
   CHECK(units->SetUnits(value) == E_INVALIDARG);
+}
+
+TEST_CASE("HOCode2Name answers from the installation's agency table") {
+  ScratchFolder folder;
+  CreateDirectoryA((folder.Path() + "\\SYSTEM").c_str(), nullptr);
+  CreateDirectoryA((folder.Path() + "\\SYSTEM\\HTML").c_str(), nullptr);
+  {
+    std::ofstream table(folder.Path() + "\\SYSTEM\\HTML\\hosource.txt", std::ios::binary);
+    table << "540;FR;Service Hydrographique\r\n541;GB;UK Hydrographic Office\r\n540;XX;Second of a code\r\n";
+  }
+  SavedRegistryValue keyPath{HKEY_LOCAL_MACHINE, std::string(br::cRegSettings::BASE_PATH) + "\\" + br::SETTINGS_ENUM_KEY,
+                             br::SETTING_KEY_PATH};
+  keyPath.SetString(folder.Path() + "\\");
+  Suite s;
+  InspectorControl inspector(s.dll);  // loads the table when it is made
+
+  BSTR name = nullptr;
+  BSTR abbreviation = reinterpret_cast<BSTR>(static_cast<uintptr_t>(0xBAD));
+  CHECK(inspector->HOCode2Name(540, &name, &abbreviation) == S_OK);
+  CHECK(Take(name) == L"Service Hydrographique");  // the first row of a code
+  CHECK(Take(abbreviation) == L"FR");
+  CHECK(inspector->HOCode2Name(541, &name, nullptr) == S_OK);
+  CHECK(Take(name) == L"UK Hydrographic Office");
+  CHECK(inspector->HOCode2Name(541, nullptr, &abbreviation) == S_OK);
+  CHECK(Take(abbreviation) == L"GB");
+
+  // Not found: the code as its name, and an abbreviation that is null, not left as it was.
+  abbreviation = reinterpret_cast<BSTR>(static_cast<uintptr_t>(0xBAD));
+  CHECK(inspector->HOCode2Name(550, &name, &abbreviation) == S_FALSE);
+  CHECK(Take(name) == L"550");
+  CHECK(abbreviation == nullptr);
+  CHECK(inspector->HOCode2Name(-7, &name, nullptr) == S_FALSE);
+  CHECK(Take(name) == L"-7");
+  CHECK(inspector->HOCode2Name(550, nullptr, nullptr) == S_FALSE);
 }
 
 TEST_CASE("a failing fill and a fill too deep are logged; no geo failure stops the fill") {
