@@ -1,0 +1,189 @@
+// Times SetInfo of a hosted XObjectInspector with 1,000 object records. The scene it writes
+// holds, in a chart database, 1,000 beacons with a light and a topmark each (the fill adds
+// both below every beacon: 3,000 items), and in a user database 1,000 objects of mixed
+// classes (grouped, no relations). Each round replaces the whole tree; the figures are the
+// best and the median of the rounds. Usage: inspector_bench [ROUNDS]
+#include "BR_Info.h"
+#include "GeoData.h"
+
+#include <windows.h>
+#include <commctrl.h>
+
+#include <algorithm>
+#include <chrono>
+#include <cstdio>
+#include <cstdlib>
+#include <string>
+#include <vector>
+
+namespace {
+
+using Clock = std::chrono::steady_clock;
+
+int Fail(const char* message) {
+  std::fprintf(stderr, "inspector_bench: %s\n", message);
+  return 1;
+}
+
+std::string SceneJson() {
+  std::string chart, user;
+  const char* classes[] = {"LIGHTS", "UWTROC", "ADMARE", "NAVLNE", "BUAARE", "DEPARE", "WRECKS", "BOYLAT"};
+  for (int i = 0; i < 1000; ++i) {
+    const std::string n = std::to_string(i);
+    if (i) chart += ",", user += ",";
+    chart += "{\"name\":\"b" + n + "\",\"class\":\"BCNLAT\",\"point\":[48.3,-4.5],\"attributes\":{\"OBJNAM\":\"Beacon " +
+             n + "\",\"COLOUR\":[3]},\"members\":[\"l" + n + "\",\"t" + n + "\"]}";
+    chart += ",{\"name\":\"l" + n + "\",\"class\":\"LIGHTS\",\"point\":[48.3,-4.5],\"attributes\":{\"OBJNAM\":\"Light " +
+             n + "\",\"SIGPER\":4.0}}";
+    chart += ",{\"name\":\"t" + n + "\",\"class\":\"TOPMAR\",\"point\":[48.3,-4.5],\"attributes\":{\"TOPSHP\":3}}";
+    const char* cls = classes[i % 8];
+    const bool area = std::string(cls) == "ADMARE" || std::string(cls) == "BUAARE" || std::string(cls) == "DEPARE";
+    const bool line = std::string(cls) == "NAVLNE";
+    user += "{\"name\":\"u" + n + "\",\"class\":\"" + cls + "\"," +
+            (area ? "\"area\":[[48,-4],[48,-4.1],[48.1,-4.1]]" : line ? "\"line\":[[48,-4],[48.1,-4.1]]" : "\"point\":[48,-4]") +
+            ",\"attributes\":{\"OBJNAM\":\"Object " + n + "\"}}";
+  }
+  return "{\"format\":\"chartscene 1\",\"databases\":["
+         "{\"name\":\"BENCH\",\"kind\":\"chart\",\"datasets\":[{\"id\":\"BENCH001\",\"objects\":[" + chart + "]}]},"
+         "{\"name\":\"USERS\",\"kind\":\"user\",\"datasets\":[{\"id\":\"USER0001\",\"objects\":[" + user + "]}]}]}";
+}
+
+class Scene {
+public:
+  bool Load(const std::wstring& path) {
+    CLSID clsid{};
+    if (FAILED(CLSIDFromProgID(L"ChartScene.Scene", &clsid)) ||
+        FAILED(CoCreateInstance(clsid, nullptr, CLSCTX_INPROC_SERVER, IID_IDispatch, reinterpret_cast<void**>(&scene_))))
+      return false;
+    VARIANT result = Call(L"Load", path);
+    const bool ok = result.vt != VT_ERROR;
+    VariantClear(&result);
+    return ok;
+  }
+  ~Scene() {
+    if (scene_) scene_->Release();
+  }
+  VARIANT Call(const wchar_t* method, const std::wstring& text) {
+    VARIANT result;
+    VariantInit(&result);
+    DISPID id = 0;
+    LPOLESTR names[] = {const_cast<LPOLESTR>(method)};
+    if (FAILED(scene_->GetIDsOfNames(IID_NULL, names, 1, LOCALE_USER_DEFAULT, &id))) {
+      result.vt = VT_ERROR;
+      return result;
+    }
+    VARIANT argument;
+    argument.vt = VT_BSTR;
+    argument.bstrVal = SysAllocString(text.c_str());
+    DISPPARAMS parameters{&argument, nullptr, 1, 0};
+    if (FAILED(scene_->Invoke(id, IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_METHOD, &parameters, &result, nullptr,
+                              nullptr)))
+      result.vt = VT_ERROR;
+    VariantClear(&argument);
+    return result;
+  }
+
+private:
+  IDispatch* scene_ = nullptr;
+};
+
+struct Figures {
+  double best = 0;
+  double median = 0;
+  int items = 0;
+};
+
+Figures Time(IXObjectInspector* inspector, VARIANT& records, HWND tree, int rounds) {
+  std::vector<double> ms;
+  for (int r = 0; r < rounds; ++r) {
+    const Clock::time_point start = Clock::now();
+    inspector->SetInfo(records);
+    ms.push_back(std::chrono::duration<double, std::milli>(Clock::now() - start).count());
+  }
+  std::sort(ms.begin(), ms.end());
+  Figures figures;
+  figures.best = ms.front();
+  figures.median = ms[ms.size() / 2];
+  figures.items = tree ? static_cast<int>(SendMessageW(tree, TVM_GETCOUNT, 0, 0)) : -1;
+  return figures;
+}
+
+HWND FindTree(HWND parent) {
+  for (HWND child = GetWindow(parent, GW_CHILD); child; child = GetWindow(child, GW_HWNDNEXT)) {
+    wchar_t name[64] = {};
+    GetClassNameW(child, name, 64);
+    if (lstrcmpiW(name, WC_TREEVIEWW) == 0) return child;
+    if (HWND deeper = FindTree(child)) return deeper;
+  }
+  return nullptr;
+}
+
+int Run(int rounds) {
+  HMODULE atl = LoadLibraryW(L"atl.dll");
+  using InitFn = BOOL(WINAPI*)();
+  using GetControlFn = HRESULT(WINAPI*)(HWND, IUnknown**);
+  auto init = atl ? reinterpret_cast<InitFn>(reinterpret_cast<void*>(GetProcAddress(atl, "AtlAxWinInit"))) : nullptr;
+  auto getControl =
+      atl ? reinterpret_cast<GetControlFn>(reinterpret_cast<void*>(GetProcAddress(atl, "AtlAxGetControl"))) : nullptr;
+  if (!init || !getControl || !init()) return Fail("atl.dll is not available");
+
+  wchar_t folder[MAX_PATH] = {};
+  GetTempPathW(MAX_PATH, folder);
+  const std::wstring path = std::wstring(folder) + L"inspector_bench_" + std::to_wstring(GetCurrentProcessId()) + L".json";
+  const std::string json = SceneJson();
+  HANDLE file = CreateFileW(path.c_str(), GENERIC_WRITE, 0, nullptr, CREATE_ALWAYS, FILE_ATTRIBUTE_NORMAL, nullptr);
+  if (file == INVALID_HANDLE_VALUE) return Fail("the scene file cannot be written");
+  DWORD written = 0;
+  WriteFile(file, json.data(), static_cast<DWORD>(json.size()), &written, nullptr);
+  CloseHandle(file);
+
+  int status = 0;
+  {
+    Scene scene;
+    const bool loaded = scene.Load(path);
+    DeleteFileW(path.c_str());
+    if (!loaded) return Fail("ChartScene.Scene cannot load the scene (is chartscene.dll registered?)");
+    std::wstring beacons, users;
+    for (int i = 0; i < 1000; ++i) {
+      beacons += (i ? L",b" : L"b") + std::to_wstring(i);
+      users += (i ? L",u" : L"u") + std::to_wstring(i);
+    }
+    VARIANT chartRecords = scene.Call(L"ObjectRecords", beacons);
+    VARIANT userRecords = scene.Call(L"ObjectRecords", users);
+    if (chartRecords.vt != (VT_ARRAY | VT_UI1) || userRecords.vt != (VT_ARRAY | VT_UI1)) return Fail("no records");
+
+    HWND host = CreateWindowExW(0, L"AtlAxWin", L"BR_Info.XObjectInspector", WS_POPUP | WS_VISIBLE, 0, 0, 600, 400,
+                                nullptr, nullptr, GetModuleHandleW(nullptr), nullptr);
+    IUnknown* control = nullptr;
+    IXObjectInspector* inspector = nullptr;
+    if (!host || FAILED(getControl(host, &control)) ||
+        FAILED(control->QueryInterface(IID_IXObjectInspector, reinterpret_cast<void**>(&inspector)))) {
+      status = Fail("BR_Info.XObjectInspector cannot be hosted");
+    } else {
+      HWND tree = FindTree(host);
+      const Figures chart = Time(inspector, chartRecords, tree, rounds);
+      const Figures user = Time(inspector, userRecords, tree, rounds);
+      std::printf("records: 1000, rounds: %d\n", rounds);
+      std::printf("SetInfo, chart beacons with a light and a topmark each: best %.1f ms, median %.1f ms (%d items)\n",
+                  chart.best, chart.median, chart.items);
+      std::printf("SetInfo, grouped user objects: best %.1f ms, median %.1f ms (%d items)\n", user.best, user.median,
+                  user.items);
+      inspector->Release();
+    }
+    if (control) control->Release();
+    if (host) DestroyWindow(host);
+    VariantClear(&chartRecords);
+    VariantClear(&userRecords);
+  }
+  return status;
+}
+
+}  // namespace
+
+int wmain(int argc, wchar_t** argv) {
+  const int rounds = argc > 1 ? std::max(1, _wtoi(argv[1])) : 5;
+  if (FAILED(OleInitialize(nullptr))) return Fail("OLE cannot start");
+  const int status = Run(rounds);
+  OleUninitialize();
+  return status;
+}
