@@ -15,6 +15,7 @@
 
 #include <cstring>
 #include <fstream>
+#include <functional>
 #include <memory>
 #include <sstream>
 #include <string>
@@ -37,7 +38,8 @@ std::string SceneJson() {
  "catalogue":{"classes":[{"code":55001,"acronym":"harbr_","name":"Harbour"},
    {"code":55500,"acronym":"hrbent","name":"Harbour entry point"},
    {"code":55059,"acronym":"srvint","name":"Internal service"},
-   {"code":53355,"acronym":"tecobj","name":"Technical object"}],
+   {"code":53355,"acronym":"tecobj","name":"Technical object"},
+   {"code":57004,"acronym":"csinod","name":"Supplementary information node"}],
    "hidden":["M_NSYS"]},
  "databases":[
   {"name":"USERDB","kind":"user","datasets":[{"id":"GROUPS1","objects":[
@@ -67,6 +69,10 @@ std::string SceneJson() {
    {"name":"c-tech","class":"tecobj","primitive":"none"})" +
          chain + R"(
   ]}]},
+  {"name":"ENTRIES","kind":"chart","datasets":[{"id":"RAST0001","type":"raster"},
+   {"id":"LIB00001","type":"library","header":{"fileName":"Marks of the harbour"}}]},
+  {"name":"CSI","kind":"hierarchy","datasets":[{"id":"CSI0001","objects":[
+   {"name":"h-node","class":"csinod","primitive":"none","text":"CHART SUPPLEMENTARY INFORMATION"}]}]},
   {"name":"MARINER","kind":"user","datasets":[{"id":"1","objects":[
    {"name":"m-note","class":"LIGHTS","point":[0,0],"attributes":{"OBJNAM":"Note"}}]}]}
  ]})";
@@ -442,6 +448,74 @@ TEST_CASE("DataSet, FormatAttributes, HOCode2Name and IUnitsOption") {
   value.vt = VT_UNKNOWN;
   value.punkVal = nullptr;
   CHECK(units->SetUnits(value) == E_INVALIDARG);
+}
+
+TEST_CASE("dataset entries, hierarchy objects, an unreadable header and stray notifications") {
+  Suite s;
+  SceneProbe probe;
+  InspectorControl inspector(s.dll);
+  inspector.Host();
+
+  SUBCASE("a raster chart entry heads the tree and is the dataset") {
+    REQUIRE(SetRecords(inspector, s.scene, L"dataset:RAST0001") == S_OK);
+    CHECK(inspector.RootTexts() == std::vector<std::wstring>{L"Raster chart RAST0001"});
+    ComRef<IUnknown> dataSet;
+    REQUIRE(inspector->get_DataSet(dataSet.Out()) == S_OK);
+    ComRef<IGeoRasterDataSet> raster;
+    CHECK(dataSet->QueryInterface(IID_IGeoRasterDataSet, raster.OutVoid()) == S_OK);
+  }
+  SUBCASE("a library is named from its header; entries after the first follow the objects") {
+    REQUIRE(SetRecords(inspector, s.scene, L"dataset:LIB00001, c-light, dataset:RAST0001") == S_OK);
+    const std::vector<TreeItem> items = inspector.Items();
+    REQUIRE(items.size() == 4);
+    CHECK(Narrow(items[0].text) == "DataSet CHART001   CHARTDB");
+    CHECK(Narrow(items[2].text) == "Library Marks of the harbour   ENTRIES");
+    CHECK(items[2].icon == 5);
+    CHECK(items[2].data == 2);
+    CHECK(Narrow(items[3].text) == "Raster chart RAST0001");
+  }
+  SUBCASE("without a header the identity names the dataset, all eight characters of it") {
+    probe.SetFault("IGeoDatabase.GetDataSetHeader", E_FAIL);
+    REQUIRE(SetRecords(inspector, s.scene, L"c-light") == S_OK);
+    probe.ClearFaults();
+    CHECK(Narrow(inspector.RootTexts().at(0)) == "DataSet CHART001   CHARTDB");
+  }
+  SUBCASE("a hierarchy object shows the hierarchy card instead of the tabs") {
+    REQUIRE(SetRecords(inspector, s.scene, L"h-node, c-light") == S_OK);
+    std::function<HWND(HWND)> strip = [&](HWND parent) -> HWND {
+      for (HWND child = GetWindow(parent, GW_CHILD); child; child = GetWindow(child, GW_HWNDNEXT)) {
+        wchar_t name[64] = {};
+        GetClassNameW(child, name, 64);
+        if (lstrcmpiW(name, WC_TABCONTROLW) == 0) return child;
+        if (HWND deeper = strip(child)) return deeper;
+      }
+      return nullptr;
+    };
+    HWND tabStrip = strip(inspector.Window());
+    REQUIRE(tabStrip != nullptr);
+    CHECK(IsWindowVisible(tabStrip));
+    inspector.Select(inspector.ItemWithData(1));
+    CHECK(inspector.sink.events.back().guid == s.scene.ObjectId(L"h-node"));
+    CHECK_FALSE(IsWindowVisible(tabStrip));
+    inspector.Select(inspector.ItemWithData(2));
+    CHECK(IsWindowVisible(tabStrip));
+  }
+  SUBCASE("notifications naming no record are no choice") {
+    REQUIRE(SetRecords(inspector, s.scene, L"u-light, u-rock") == S_OK);
+    const std::size_t before = inspector.sink.events.size();
+    auto notify = [&](LPARAM word) {
+      NMTREEVIEWW change{};
+      change.hdr.hwndFrom = inspector.Tree();
+      change.hdr.code = TVN_SELCHANGEDW;
+      change.itemNew.lParam = word;
+      SendMessageW(GetParent(inspector.Tree()), WM_NOTIFY, 0, reinterpret_cast<LPARAM>(&change));
+    };
+    for (LPARAM word : {LPARAM{0}, LPARAM{3}, LPARAM{-1}, LPARAM{99}}) notify(word);
+    CHECK(inspector.sink.events.size() == before);
+    notify(2);  // the same path with a word that names the rock
+    REQUIRE(inspector.sink.events.size() == before + 1);
+    CHECK(inspector.sink.events.back().guid == s.scene.ObjectId(L"u-rock"));
+  }
 }
 
 TEST_CASE("HOCode2Name answers from the installation's agency table") {
