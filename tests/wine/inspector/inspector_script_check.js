@@ -42,4 +42,5 @@ try {
 } catch (e) {
   check(false, "script error " + e.number + ": " + e.description);
 }
+if (failures == 0) WScript.Echo("script completed");
 WScript.Quit(failures == 0 ? 0 : 1);

@@ -2,7 +2,8 @@
 // icons, data words and order read through the tree view's messages), tree modes, the
 // chart rules, selection events, GetSelectedObject, DataSet, FormatAttributes,
 // HOCode2Name, IUnitsOption, the log of a failing fill and re-entrant sinks.
-#include "tests/wine/inspector/InspectorFixture.h"
+#include "tests/wine/inspector/InspectorControl.h"
+#include "tests/wine/inspector/TestScene.h"
 
 #include "tests/wine/common/SceneProbe.h"
 #include "tests/wine/common/registry_test_support.h"
