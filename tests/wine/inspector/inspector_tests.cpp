@@ -268,8 +268,21 @@ TEST_CASE("the tree: groups in their order, labels, icons and data words") {
 
 TEST_CASE("chart databases: relations, collections and harbours by tree mode") {
   Suite s;
+  SceneProbe probe;
   InspectorControl inspector(s.dll);
   inspector.Host();
+  // Every object, attribute and enumerator of the host the fill received is released.
+  const long objects = probe.Counter("live.Object"), enums = probe.Counter("live.ObjectEnum"),
+             attributes = probe.Counter("live.Attribute");
+  struct Released {
+    SceneProbe& probe;
+    long objects, enums, attributes;
+    ~Released() {
+      CHECK(probe.Counter("live.Object") == objects);
+      CHECK(probe.Counter("live.ObjectEnum") == enums);
+      CHECK(probe.Counter("live.Attribute") == attributes);
+    }
+  } released{probe, objects, enums, attributes};
 
   SUBCASE("a collection shows its members below it, expanded; the marked member marks the light") {
     REQUIRE(SetRecords(inspector, s.scene, L"c-group, c-tech") == S_OK);
@@ -495,6 +508,14 @@ TEST_CASE("dataset entries, hierarchy objects, an unreadable header and stray no
     HWND tabStrip = strip(inspector.Window());
     REQUIRE(tabStrip != nullptr);
     CHECK(IsWindowVisible(tabStrip));
+    REQUIRE(TabCtrl_GetItemCount(tabStrip) == 1);
+    wchar_t title[64] = {};
+    TCITEMW tab{};
+    tab.mask = TCIF_TEXT;
+    tab.pszText = title;
+    tab.cchTextMax = 64;
+    REQUIRE(SendMessageW(tabStrip, TCM_GETITEMW, 0, reinterpret_cast<LPARAM>(&tab)));
+    CHECK(std::wstring(title) == L"Attributes");
     inspector.Select(inspector.ItemWithData(1));
     CHECK(inspector.sink.events.back().guid == s.scene.ObjectId(L"h-node"));
     CHECK_FALSE(IsWindowVisible(tabStrip));
