@@ -47,56 +47,31 @@ TEST_CASE("tree data words name the header or an object's record") {
   CHECK_FALSE(IsRecordWord(1, 0));
 }
 
-TEST_CASE("classes fall into the tree's groups") {
-  const AidFacts none;
-  CHECK(GroupOfClass(55001, none) == kGroupHarbours);
-  CHECK(GroupOfClass(13, none) == kGroupClass13);
-  for (long aid : {5L, 17L, 39L, 75L, 113L, 144L, 306L}) CHECK(GroupOfClass(aid, none) == kGroupAidsToNavigation);
-  for (long danger : {86L, 153L, 156L, 159L}) CHECK(GroupOfClass(danger, none) == kGroupDangers);
-  for (long area : {1L, 20L, 27L, 60L, 112L, 135L}) CHECK(GroupOfClass(area, none) == kGroupAreas);
-  for (long route : {40L, 85L, 109L, 150L}) CHECK(GroupOfClass(route, none) == kGroupRouteing);
-  for (long other : {2L, 42L, 75000L, 0L, -1L}) CHECK(GroupOfClass(other, none) == kGroupOthers);
-
-  SUBCASE("the conditional aids") {
-    CHECK(NeedsAidFacts(84));
-    CHECK(NeedsAidFacts(12));
-    CHECK(NeedsAidFacts(74));
-    CHECK_FALSE(NeedsAidFacts(75));
-    AidFacts facts;
-    facts.attribute40 = 7;
-    CHECK(GroupOfClass(84, facts) == kGroupAidsToNavigation);
-    facts.attribute40 = 6;
-    CHECK(GroupOfClass(84, facts) == kGroupOthers);
-    facts.list94Has33 = true;
-    CHECK(GroupOfClass(12, facts) == kGroupAidsToNavigation);
-    CHECK(GroupOfClass(74, facts) == kGroupOthers);  // also needs 17 in list 35
-    facts.list35Has17 = true;
-    CHECK(GroupOfClass(74, facts) == kGroupAidsToNavigation);
-  }
+TEST_CASE("conditional aids to navigation, and the order of the groups") {
+  AidFacts facts;
+  CHECK(GroupOfClass(84, facts) == kGroupOthers);
+  facts.attribute40 = 7;
+  CHECK(GroupOfClass(84, facts) == kGroupAidsToNavigation);
+  facts.list94Has33 = true;
+  CHECK(GroupOfClass(12, facts) == kGroupAidsToNavigation);
+  CHECK(GroupOfClass(74, facts) == kGroupOthers);  // also needs 17 in list 35
+  facts.list35Has17 = true;
+  CHECK(GroupOfClass(74, facts) == kGroupAidsToNavigation);
+  CHECK(GroupOfClass(75000, facts) == kGroupOthers);
   CHECK(kInsertionOrder[6] == kGroupAggregations);
   CHECK(kInsertionOrder[8] == kGroupOthers);
 }
 
-TEST_CASE("icons by primitive and their marked forms") {
-  CHECK(IconOfPrimitive(1) == 1);
-  CHECK(IconOfPrimitive(2) == 2);
-  CHECK(IconOfPrimitive(3) == 3);
-  CHECK(IconOfPrimitive(6) == 4);
-  CHECK(IconOfPrimitive(4) == 0);
-  CHECK(MarkedIcon(0) == 6);
+TEST_CASE("marked icons and flag bits") {
   CHECK(MarkedIcon(5) == 11);
   CHECK(MarkedIcon(30) == 30);
   CHECK(MarkedIcon(31) == 78);
   CHECK(MarkedIcon(77) == kIconCount - 1);
   CHECK(MarkedIcon(78) == 78);
-  CHECK(IsMarkedFlags(1u << 8));
   CHECK(IsMarkedFlags(1u << 9));
   CHECK_FALSE(IsMarkedFlags(1u << 10));
-  CHECK(IsHiddenFlags(1u));
   CHECK(IsHiddenFlags(1u << 25));
   CHECK_FALSE(IsHiddenFlags(1u << 24));
-  CHECK(IsHiddenClassFlags(0x8000));
-  CHECK_FALSE(IsHiddenClassFlags(0x4000));
 }
 
 TEST_CASE("identity texts are read strictly") {
