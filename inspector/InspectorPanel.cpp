@@ -20,10 +20,13 @@ std::unique_ptr<toolkit::Layout> CardLayout() {
 
 }  // namespace
 
-InspectorPanel::InspectorPanel(Owner& owner)
+InspectorPanel::InspectorPanel(Owner& owner, const PanelSettings& settings)
     : toolkit::Panel(std::make_unique<toolkit::GridLayout>(1, 2, 3, 0, "35,65")),
       owner_(owner),
-      cards_(CardLayout()) {
+      cards_(CardLayout()),
+      attributes_(settings),
+      internal_(settings),
+      external_(settings) {
   insertNamed(nullptr, &tree_, "tree");
   insertNamed(nullptr, &cards_, "details");
   cards_.insertNamed(nullptr, &tabs_, "tabs");
@@ -33,6 +36,29 @@ InspectorPanel::InspectorPanel(Owner& owner)
 }
 
 InspectorPanel::~InspectorPanel() = default;
+
+void InspectorPanel::clearDetails() {
+  attributes_.Clear();
+  internal_.Clear();
+  external_.Clear();
+}
+
+void InspectorPanel::showFilledTabs() {
+  showTab(internal_, 8, "Internal services/shops");
+  showTab(external_, 9, "External services/shops");
+  if (tabs_.isValid()) tabs_.doLayout();
+}
+
+void InspectorPanel::showTab(cP_SHPanel& panel, long textId, const char* title) {
+  const bool shown = panel.getParent() == &tabs_;
+  if (panel.HasContent() && !shown) {
+    const std::string text = br::GetText("ObjInspector", textId, title);
+    tabs_.insertNamed(nullptr, &panel, text.c_str());
+  } else if (!panel.HasContent() && shown) {
+    if (tabs_.getSelectedPage() > 0) tabs_.selectPage(0, false);
+    tabs_.removeComponent(&panel, false);
+  }
+}
 
 void InspectorPanel::showCard(int card) {
   auto* cards = static_cast<toolkit::TabLayout*>(cards_.getLayout());

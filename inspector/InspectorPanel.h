@@ -1,9 +1,12 @@
 #pragma once
 // The inspector's content: the object tree on the left (35 %), and on the right a card
 // panel whose card 0 holds the detail tabs and card 1 the hierarchy view. The tab
-// "Attributes" is there from the start; its card is where the attribute table goes.
+// "Attributes" holds the attribute table from the start; the services tabs are shown only
+// while their panels have rows.
 
 #include "inspector/ObjectTree.h"
+#include "inspector/panels/cAttrViewPanel_Tbl.h"
+#include "inspector/panels/cP_SHPanel.h"
 #include "toolkit/core/Panel.h"
 #include "toolkit/widgets/TabContainer.h"
 
@@ -23,12 +26,18 @@ public:
   static constexpr int kCardDetails = 0;
   static constexpr int kCardHierarchy = 1;
 
-  explicit InspectorPanel(Owner& owner);
+  InspectorPanel(Owner& owner, const PanelSettings& settings);
   ~InspectorPanel() override;
 
   ObjectTree& tree() { return tree_; }
   toolkit::TabContainer& tabs() { return tabs_; }
-  toolkit::Panel& attributesCard() { return attributes_; }
+  cAttrViewPanel_Tbl& attributes() { return attributes_; }
+  cP_SHPanel& internalServices() { return internal_; }
+  cP_SHPanel& externalServices() { return external_; }
+  // Empties the attribute and services panels.
+  void clearDetails();
+  // Puts the services tabs in or takes them out by their content, after a fill.
+  void showFilledTabs();
   // Card 0 (details) or 1 (hierarchy), laid out again when it changes.
   void showCard(int card);
   int shownCard() const;
@@ -41,7 +50,10 @@ private:
   toolkit::Panel cards_;
   toolkit::TabContainer tabs_;
   toolkit::Panel hierarchy_;
-  toolkit::Panel attributes_;
+  cAttrViewPanel_Tbl attributes_;
+  cP_SHPanel internal_;
+  cP_SHPanel external_;
+  void showTab(cP_SHPanel& panel, long textId, const char* title);
 };
 
 }  // namespace br::inspector

@@ -25,8 +25,13 @@ struct IdLess {
 }  // namespace
 
 TreeBuilder::TreeBuilder(ObjectTree& tree, std::vector<ObjectRecord>& records, IObjectFormatter* formatter,
-                         long treeMode, br::cErrHandler& reporter)
-    : tree_(tree), records_(records), formatter_(formatter), treeMode_(treeMode), reporter_(reporter) {}
+                         long labelFlags, long treeMode, br::cErrHandler& reporter)
+    : tree_(tree),
+      records_(records),
+      formatter_(formatter),
+      labelFlags_(labelFlags),
+      treeMode_(treeMode),
+      reporter_(reporter) {}
 
 void TreeBuilder::Add(std::vector<ObjectRecord> incoming) {
   for (ObjectRecord& record : incoming) Classify(std::move(record));
@@ -151,7 +156,7 @@ bool TreeBuilder::IsRecord(const GUID& id) const {
 
 std::wstring TreeBuilder::LabelOf(IGeoObject* object) {
   br::com::BstrHolder label;
-  if (!formatter_ || FAILED(formatter_->FormatObject(0, kLabelFlags, object, 0, 0, label.Out())) || !label.Get())
+  if (!formatter_ || FAILED(formatter_->FormatObject(0, kLabelFlags | labelFlags_, object, 0, 0, label.Out())) || !label.Get())
     return L"";
   return std::wstring(label.Get(), SysStringLen(label.Get()));
 }

@@ -22,8 +22,9 @@ namespace br::inspector {
 class TreeBuilder {
 public:
   // treeMode 0 shows a harbour through its entry point.
-  TreeBuilder(ObjectTree& tree, std::vector<ObjectRecord>& records, IObjectFormatter* formatter, long treeMode,
-              br::cErrHandler& reporter);
+  // labelFlags are ORed into the formatter's tree label flags.
+  TreeBuilder(ObjectTree& tree, std::vector<ObjectRecord>& records, IObjectFormatter* formatter, long labelFlags,
+              long treeMode, br::cErrHandler& reporter);
 
   // Sorts and inserts; records with a null owner are passed over.
   void Add(std::vector<ObjectRecord> incoming);
@@ -51,6 +52,7 @@ private:
   ObjectTree& tree_;
   std::vector<ObjectRecord>& records_;
   IObjectFormatter* formatter_;
+  long labelFlags_;
   long treeMode_;
   br::cErrHandler& reporter_;
   std::array<Group, kGroupCount> groups_;

@@ -2,11 +2,13 @@
 
 #include "frame/com/bstr_text.h"
 #include "frame/control/OwnerHold.h"
+#include "frame/errors/guarded_operation.h"
 #include "frame/settings/localised_texts.h"
 #include "frame/settings/settings.h"
 #include "inspector/TreeBuilder.h"
 #include "inspector/dataset_label.h"
 #include "inspector/object_access.h"
+#include "inspector/panels/dataset_metadata.h"
 #include "inspector/rules/attribute_text.h"
 #include "inspector/rules/guid_text.h"
 #include "inspector/rules/record_layout.h"
@@ -21,8 +23,6 @@ namespace {
 
 constexpr DISPID kSelectObjectEvent = 1;
 constexpr long kAttributeFlags = 4;
-constexpr long kOptionLanguage = 61;
-constexpr long kOptionMissingValue = 64;
 
 bool SameId(const GUID& a, const GUID& b) { return std::memcmp(&a, &b, sizeof(GUID)) == 0; }
 
@@ -66,34 +66,15 @@ const XObjectInspector::Entry XObjectInspector::kInterfaces[] = {
 
 XObjectInspector::XObjectInspector() {
   br::RegisterTextClient(this);
-  CreateFormatter();
+  settings_.SetErrorHandler(&reporter_);
+  settings_.Create();  // without a formatter the tree has no labels and the panels no rows
 }
 
 XObjectInspector::~XObjectInspector() {
   std::vector<ObjectRecord> old;
   old.swap(records_);
   old.clear();
-  formatter_.Reset();
   br::UnregisterTextClient(this);
-}
-
-void XObjectInspector::CreateFormatter() {
-  if (FAILED(CoCreateInstance(CLSID_ObjectFormatter, nullptr, CLSCTX_ALL, IID_IObjectFormatter, formatter_.OutVoid())))
-    formatter_.Reset();
-  if (!formatter_) return;
-  const std::string unknown = br::GetText("ObjInspector", 55, "unknown");  // makes the localiser too
-  long language = 0;
-  VARIANT option;
-  VariantInit(&option);
-  if (SUCCEEDED(br::GetLanguage(&language))) {
-    option.vt = VT_I4;
-    option.lVal = language;
-    formatter_->SetOption(kOptionLanguage, option);
-  }
-  option.vt = VT_BSTR;
-  option.bstrVal = br::com::BstrFromAnsi(unknown);
-  formatter_->SetOption(kOptionMissingValue, option);
-  VariantClear(&option);
 }
 
 // ---- SetInfo and AddInfo
@@ -135,11 +116,13 @@ HRESULT XObjectInspector::Take(const VARIANT& value, bool replace) {
 
     if (replace) {
       tree.DeleteAll();
+      Panel()->clearDetails();
+      Panel()->showFilledTabs();
       std::vector<ObjectRecord> old;
       old.swap(records_);  // an owner's release may call back: the list is already empty
     }
 
-    TreeBuilder builder(tree, records_, formatter_.Get(), treeMode, reporter_);
+    TreeBuilder builder(tree, records_, settings_.Formatter(), settings_.objectFlags, treeMode, reporter_);
     builder.Add(ReadRecordArray(value));
 
     HTREEITEM chosen = nullptr;
@@ -192,15 +175,41 @@ void XObjectInspector::ItemChosen(LPARAM data, bool doubleClick) {
 void XObjectInspector::ShowDetails(const ObjectRecord& record, bool header) {
   InspectorPanel* panel = Panel();
   if (!panel) return;
+  panel->clearDetails();
   int card = InspectorPanel::kCardDetails;
-  if (!header) {
+  if (header) {
+    panel->attributes().FillDataSetMetadata(record.owner.Get(), record.id);
+  } else {
     const ComRef<IGeoObject> object = ObjectOf(DatabaseOf(record.owner.Get()).Get(), record.id);
     const auto facts = FactsOf(object.Get());
-    if (facts && IsHierarchyClass(facts->classCode) && facts->haveKind && KindNotBelow(facts->kind, kHierarchyKind))
-      card = InspectorPanel::kCardHierarchy;
+    if (facts) {
+      const bool chart = facts->haveKind && SameId(facts->kind, kChartDatabaseKind);
+      if (IsHierarchyClass(facts->classCode) && facts->haveKind && KindNotBelow(facts->kind, kHierarchyKind))
+        card = InspectorPanel::kCardHierarchy;
+      else
+        FillObjectDetails(*panel, object.Get(), facts->classCode, chart);
+    }
   }
+  panel->showFilledTabs();
   panel->showCard(card);
-  // The attribute and metadata panels fill panel->attributesCard() here.
+}
+
+// The attribute table, and for a harbour its services; a failure is logged and leaves
+// what was filled.
+void XObjectInspector::FillObjectDetails(InspectorPanel& panel, IGeoObject* object, long classCode, bool chart) {
+  br::ErrRecord failure;
+  br::RunGuarded(reporter_, "CXObjectInspector", BR_ERR_PLACE("_fillGeoObjectAttr"), failure, [&] {
+    const bool collection = classCode == kClassAggregation || classCode == kClassAssociation;
+    panel.attributes().FillObject(object, true, !(chart && collection));
+    if (classCode != kClassHarbour) return;
+    ForEachRelated(object, Relation::kAll, [&](IGeoObject* related) {
+      long code = 0;
+      if (FAILED(related->GetClassCode(&code))) return true;
+      if (code == kClassInternalService) panel.internalServices().FillObject(related, false, true);
+      if (code == kClassExternalService) panel.externalServices().FillObject(related, false, true);
+      return true;
+    });
+  });
 }
 
 void XObjectInspector::FireSelectObject(const std::wstring& guidText, IUnknown* owner, bool doubleClick) {
@@ -287,12 +296,19 @@ STDMETHODIMP XObjectInspector::FormatAttributes(IUnknown* database, BSTR guid, B
     if (!geo) return E_INVALIDARG;
     const auto id = ParseIdText(std::u16string_view(reinterpret_cast<const char16_t*>(guid), SysStringLen(guid)));
     if (!id) return E_INVALIDARG;
-    if (IsDataSetId(*id)) return E_NOTIMPL;  // the dataset's metadata text comes with the metadata panels
+    if (IsDataSetId(*id)) {
+      std::string text;
+      const HRESULT hr = FormatDataSetMetadata(database, GuidOf(*id), &agencies_, text);
+      if (FAILED(hr)) return hr;
+      *attributes = br::com::BstrFromAnsi(text);
+      return S_OK;
+    }
     const ComRef<IGeoObject> object = ObjectOf(geo.Get(), GuidOf(*id));
     if (!object) return E_INVALIDARG;
-    if (!formatter_) return E_FAIL;
+    IObjectFormatter* formatter = settings_.Formatter();
+    if (!formatter) return E_FAIL;
     br::com::BstrHolder text;
-    if (FAILED(formatter_->FormatObject(0, kAttributeFlags, object.Get(), 0, 0, text.Out())) || !text.Get())
+    if (FAILED(formatter->FormatObject(0, kAttributeFlags | settings_.objectFlags, object.Get(), 0, 0, text.Out())) || !text.Get())
       return E_INVALIDARG;
     const auto lines =
         AttributeLines(std::u16string_view(reinterpret_cast<const char16_t*>(text.Get()), SysStringLen(text.Get())));
@@ -304,7 +320,7 @@ STDMETHODIMP XObjectInspector::FormatAttributes(IUnknown* database, BSTR guid, B
 
 // ---- content
 
-std::unique_ptr<toolkit::Container> XObjectInspector::MakeContent() { return std::make_unique<InspectorPanel>(relay_); }
+std::unique_ptr<toolkit::Container> XObjectInspector::MakeContent() { return std::make_unique<InspectorPanel>(relay_, settings_); }
 
 void XObjectInspector::ContentGoing() {
   rebuilding_ = true;  // the items going send selection notifications

@@ -11,6 +11,7 @@
 #include "inspector/InspectorPanel.h"
 #include "inspector/InspectorUnitsFace.h"
 #include "inspector/object_records.h"
+#include "inspector/panels/PanelSettings.h"
 #include "inspector/units_options.h"
 
 #include "BR_Info.h"
@@ -64,11 +65,11 @@ private:
   void ItemChosen(LPARAM data, bool doubleClick);
   void ShowDetails(const ObjectRecord& record, bool header);
   void FireSelectObject(const std::wstring& guidText, IUnknown* owner, bool doubleClick);
-  void CreateFormatter();
+  void FillObjectDetails(InspectorPanel& panel, IGeoObject* object, long classCode, bool chart);
 
   std::vector<ObjectRecord> records_;
-  br::com::ComRef<IObjectFormatter> formatter_;
   br::cErrReporter reporter_;
+  PanelSettings settings_;  // the formatter and flag words the tree and the panels share
   br::geo::AgencyTable agencies_;  // loaded once, with the control
   UnitsOptions units_;
   InspectorUnitsFace unitsFace_{*static_cast<IXObjectInspector*>(this), *this};

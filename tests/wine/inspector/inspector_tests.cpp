@@ -5,6 +5,7 @@
 #include "tests/wine/inspector/InspectorControl.h"
 #include "tests/wine/inspector/TestScene.h"
 
+#include "tests/wine/common/AccessibleReader.h"
 #include "tests/wine/common/SceneProbe.h"
 #include "tests/wine/common/registry_test_support.h"
 
@@ -60,7 +61,7 @@ std::string SceneJson() {
    {"name":"u-pair-2","class":"LIGHTS","point":[0,0],"attributes":{"OBJNAM":"Pair two"}},
    {"name":"u-pair","class":"C_AGGR","primitive":"none","attributes":{"OBJNAM":"Pair"},"members":["u-pair-1","u-pair-2"]}
   ]}]},
-  {"name":"CHARTDB","kind":"chart","datasets":[{"id":"CHART001","objects":[
+  {"name":"CHARTDB","kind":"chart","datasets":[{"id":"CHART001","header":{"edition":3,"scale":22000},"objects":[
    {"name":"c-light","class":"LIGHTS","point":[0,0],"attributes":{"OBJNAM":"Alpha"}},
    {"name":"c-beacon","class":"BCNLAT","point":[0,0],"flags":512,"attributes":{"OBJNAM":"Beacon"}},
    {"name":"c-group","class":"C_AGGR","primitive":"none","attributes":{"OBJNAM":"Group"},"members":["c-light","c-beacon"]},
@@ -538,6 +539,79 @@ TEST_CASE("dataset entries, hierarchy objects, an unreadable header and stray no
     REQUIRE(inspector.sink.events.size() == before + 1);
     CHECK(inspector.sink.events.back().guid == s.scene.ObjectId(L"u-rock"));
   }
+}
+
+namespace {
+
+HWND FindClass(HWND parent, const wchar_t* name) {
+  for (HWND child = GetWindow(parent, GW_CHILD); child; child = GetWindow(child, GW_HWNDNEXT)) {
+    wchar_t found[64] = {};
+    GetClassNameW(child, found, 64);
+    if (lstrcmpiW(found, name) == 0) return child;
+    if (HWND deeper = FindClass(child, name)) return deeper;
+  }
+  return nullptr;
+}
+
+std::vector<std::wstring> TabTitles(HWND strip) {
+  std::vector<std::wstring> titles;
+  for (int i = 0; i < TabCtrl_GetItemCount(strip); ++i) {
+    wchar_t title[64] = {};
+    TCITEMW tab{};
+    tab.mask = TCIF_TEXT;
+    tab.pszText = title;
+    tab.cchTextMax = 64;
+    SendMessageW(strip, TCM_GETITEMW, i, reinterpret_cast<LPARAM>(&tab));
+    titles.push_back(title);
+  }
+  return titles;
+}
+
+// The rows of the attribute table as an accessibility client reads them.
+std::vector<std::wstring> AttributeRows(const InspectorControl& inspector) {
+  HWND strip = FindClass(inspector.Window(), WC_TABCONTROLW);
+  REQUIRE(strip != nullptr);
+  HWND table = FindClass(GetParent(strip), L"Brine_AWTATL44");
+  REQUIRE(table != nullptr);
+  AccessibleReader reader(table);
+  return reader.ChildNames();
+}
+
+}  // namespace
+
+TEST_CASE("the details of the chosen entry: attributes, metadata and services tabs") {
+  Suite s;
+  InspectorControl inspector(s.dll);
+  inspector.Host();
+  REQUIRE(SetRecords(inspector, s.scene, L"u-light, u-rock") == S_OK);
+  // The header is selected first: the dataset's metadata.
+  std::vector<std::wstring> rows = AttributeRows(inspector);
+  REQUIRE(rows.size() >= 5);
+  CHECK(rows[0] == L"DataSet filename\tGROUPS1.000");
+
+  inspector.Select(inspector.ItemWithData(2));
+  CHECK(AttributeRows(inspector) == std::vector<std::wstring>{L"Underwater rock / awash rock Rock\t", L"Object name\tRock"});
+
+  // A harbour's services get their tab while it is chosen.
+  s.treeMode.SetDword(1);
+  REQUIRE(SetRecords(inspector, s.scene, L"c-harbour") == S_OK);
+  HWND strip = FindClass(inspector.Window(), WC_TABCONTROLW);
+  CHECK(TabTitles(strip) == std::vector<std::wstring>{L"Attributes"});
+  inspector.Select(inspector.ItemWithData(1));
+  CHECK(TabTitles(strip) == std::vector<std::wstring>{L"Attributes", L"Internal services/shops"});
+  inspector.Select(inspector.ItemWithData(-2));
+  CHECK(TabTitles(strip) == std::vector<std::wstring>{L"Attributes"});
+
+  // FormatAttributes of a dataset identity: the metadata's text form.
+  const ComRef<IUnknown> chartDb = s.scene.Database(L"CHARTDB");
+  BSTR text = nullptr;
+  BSTR id = SysAllocString(DataSetIdText(s.scene.ObjectId(L"c-light")).c_str());
+  CHECK(inspector->FormatAttributes(chartDb.Get(), id, &text) == S_OK);
+  const std::wstring metadata = Take(text);
+  CHECK(metadata.rfind(L"DataSet filename\rCHART001.000\rSource identification code\r \r", 0) == 0);
+  CHECK(metadata.find(L"\rScale\r22000\r") != std::wstring::npos);
+  CHECK(metadata.find(L"\rEdition number\r3\r") != std::wstring::npos);
+  SysFreeString(id);
 }
 
 TEST_CASE("HOCode2Name answers from the installation's agency table") {
