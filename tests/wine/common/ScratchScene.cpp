@@ -50,7 +50,7 @@ ScratchScene::~ScratchScene() {
   if (!file_.empty()) DeleteFileW(file_.c_str());
 }
 
-ComPtr<IUnknown> ScratchScene::Call(const wchar_t* method, const wchar_t* argument) const {
+VARIANT ScratchScene::CallValue(const wchar_t* method, const wchar_t* argument) const {
   DISPID id = 0;
   LPOLESTR name = const_cast<LPOLESTR>(method);
   REQUIRE(scene_->GetIDsOfNames(IID_NULL, &name, 1, LOCALE_USER_DEFAULT, &id) == S_OK);
@@ -64,10 +64,22 @@ ComPtr<IUnknown> ScratchScene::Call(const wchar_t* method, const wchar_t* argume
   const HRESULT hr = scene_->Invoke(id, IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_METHOD, &params, &out, nullptr,
                                     nullptr);
   VariantClear(&in);
+  if (hr != S_OK) VariantClear(&out);
+  return out;
+}
+
+ComPtr<IUnknown> ScratchScene::Call(const wchar_t* method, const wchar_t* argument) const {
+  VARIANT out = CallValue(method, argument);
   ComPtr<IUnknown> result;
-  if (hr == S_OK && (out.vt == VT_UNKNOWN || out.vt == VT_DISPATCH) && out.punkVal) result = out.punkVal;
+  if ((out.vt == VT_UNKNOWN || out.vt == VT_DISPATCH) && out.punkVal) result = out.punkVal;
   VariantClear(&out);
   return result;
+}
+
+VARIANT ScratchScene::Records(const wchar_t* names) const {
+  VARIANT records = CallValue(L"ObjectRecords", names);
+  REQUIRE(records.vt == (VT_ARRAY | VT_UI1));
+  return records;
 }
 
 ComPtr<IGeoObject> ScratchScene::Object(const wchar_t* name) const {

@@ -31,9 +31,14 @@ public:
   static GUID DataSetIdentity(const char* id);
   // The object's identity (GetId).
   static GUID IdOf(IGeoObject* object);
+  // Object records of the named objects ("a, b, dataset:ID") as SetInfo takes them:
+  // VT_ARRAY|VT_UI1 (REQUIREd); the caller clears it.
+  VARIANT Records(const wchar_t* names) const;
 
 private:
   Microsoft::WRL::ComPtr<IUnknown> Call(const wchar_t* method, const wchar_t* argument) const;
+  // The method's answer as it is (VT_EMPTY when the call fails); the caller clears it.
+  VARIANT CallValue(const wchar_t* method, const wchar_t* argument) const;
 
   Microsoft::WRL::ComPtr<IDispatch> scene_;
   std::wstring file_;

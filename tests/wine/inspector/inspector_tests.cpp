@@ -3,10 +3,10 @@
 // chart rules, selection events, GetSelectedObject, DataSet, FormatAttributes,
 // HOCode2Name, IUnitsOption, the log of a failing fill and re-entrant sinks.
 #include "tests/wine/inspector/InspectorControl.h"
-#include "tests/wine/inspector/TestScene.h"
 
 #include "tests/wine/common/AccessibleReader.h"
 #include "tests/wine/common/SceneProbe.h"
+#include "tests/wine/common/ScratchScene.h"
 #include "tests/wine/common/registry_test_support.h"
 
 #include "BR_Private.h"
@@ -80,6 +80,29 @@ std::string SceneJson() {
  ]})";
 }
 
+// The registry form of a scene object's identity.
+std::wstring ObjectId(const ScratchScene& scene, const wchar_t* name) {
+  wchar_t text[40] = {};
+  REQUIRE(StringFromGUID2(ScratchScene::IdOf(scene.Object(name).Get()), text, 40) == 39);
+  return text;
+}
+
+// The identity text with its first 8 bytes zero: "{XXXXXXXX-XXXX-XXXX-" are those bytes.
+std::wstring DataSetIdText(const std::wstring& objectId) {
+  std::wstring text = objectId;
+  for (std::size_t i = 1; i < 19 && i < text.size(); ++i)
+    if (text[i] != L'-') text[i] = L'0';
+  return text;
+}
+
+std::vector<unsigned char> RecordBytes(const ScratchScene& scene, const wchar_t* names) {
+  VARIANT records = scene.Records(names);
+  std::vector<unsigned char> bytes(records.parray->rgsabound[0].cElements);
+  std::memcpy(bytes.data(), records.parray->pvData, bytes.size());
+  VariantClear(&records);
+  return bytes;
+}
+
 std::string Narrow(const std::wstring& text) {
   std::string narrow;
   for (wchar_t c : text) narrow += c < 128 ? static_cast<char>(c) : '?';
@@ -111,13 +134,13 @@ std::wstring NameOfOwner(IUnknown* owner) {
 
 struct Suite {
   DllUnderTest dll;
-  TestScene scene{SceneJson()};
+  ScratchScene scene{SceneJson()};
   SavedRegistryValue treeMode{HKEY_LOCAL_MACHINE, std::string(br::cRegSettings::BASE_PATH) + "\\" + br::SETTINGS_ENUM_KEY,
                               br::SETTING_TREE_MODE};
   ~Suite() { CHECK(dll.CanUnloadNow() == S_OK); }
 };
 
-HRESULT SetRecords(InspectorControl& inspector, TestScene& scene, const wchar_t* names, bool add = false) {
+HRESULT SetRecords(InspectorControl& inspector, ScratchScene& scene, const wchar_t* names, bool add = false) {
   VARIANT records = scene.Records(names);
   const HRESULT hr = add ? inspector->AddInfo(records) : inspector->SetInfo(records);
   VariantClear(&records);
@@ -140,7 +163,7 @@ TEST_CASE("arrays of records: sizes and shapes") {
     VariantClear(&early);
     inspector.Host();
 
-    const std::vector<unsigned char> two = s.scene.RecordBytes(L"u-rock, u-light");
+    const std::vector<unsigned char> two = RecordBytes(s.scene, L"u-rock, u-light");
     REQUIRE(two.size() == 2 * sizeof(GEO_OBJECT_RECORD));
     REQUIRE(sizeof(GEO_OBJECT_RECORD) == 24);
     struct Row {
@@ -252,7 +275,7 @@ TEST_CASE("the tree: groups in their order, labels, icons and data words") {
   // The first item is selected and announced.
   CHECK(inspector.SelectedData() == -2);
   REQUIRE(inspector.sink.events.size() == 1);
-  CHECK(inspector.sink.events[0].guid == DataSetIdText(s.scene.ObjectId(L"u-other")));
+  CHECK(inspector.sink.events[0].guid == DataSetIdText(ObjectId(s.scene, L"u-other")));
 
   SUBCASE("AddInfo appends after the records there") {
     REQUIRE(SetRecords(inspector, s.scene, L"u-light", true) == S_OK);
@@ -339,7 +362,7 @@ TEST_CASE("selection: events, GetSelectedObject and the remembered entry") {
   REQUIRE(SetRecords(inspector, s.scene, L"u-light, u-rock") == S_OK);
   inspector.sink.events.clear();
 
-  const std::wstring rock = s.scene.ObjectId(L"u-rock");
+  const std::wstring rock = ObjectId(s.scene, L"u-rock");
   inspector.Select(inspector.ItemWithData(2));
   REQUIRE(inspector.sink.events.size() == 1);
   CHECK(inspector.sink.events[0].guid == rock);
@@ -398,7 +421,7 @@ TEST_CASE("sinks that call back inside SelectObject") {
     };
     inspector->Select(inspector->ItemWithData(3));
     CHECK(inspector->RootTexts() == std::vector<std::wstring>{L"DataSet GROUPS1   USERDB", L"Navigation line Track"});
-    CHECK(inspector->sink.events.back().guid == DataSetIdText(s.scene.ObjectId(L"u-track")));
+    CHECK(inspector->sink.events.back().guid == DataSetIdText(ObjectId(s.scene, L"u-track")));
   }
   SUBCASE("the last reference released from the sink") {
     IXObjectInspector* raw = inspector->Get();
@@ -429,9 +452,9 @@ TEST_CASE("DataSet, FormatAttributes, HOCode2Name and IUnitsOption") {
   REQUIRE(Query<IGeoDataSet>(dataSet.Get())->GetDatabase(database.Out()) == S_OK);
   CHECK(NameOfOwner(database.Get()) == L"USERDB");
 
-  const ComRef<IUnknown> userDb = s.scene.Database(L"USERDB");
+  const auto userDb = s.scene.Database(L"USERDB");
   BSTR text = nullptr;
-  BSTR rock = SysAllocString(s.scene.ObjectId(L"u-rock").c_str());
+  BSTR rock = SysAllocString(ObjectId(s.scene, L"u-rock").c_str());
   CHECK(inspector->FormatAttributes(userDb.Get(), rock, &text) == S_OK);
   CHECK(Take(text) == L"Object name\rRock");
   for (const wchar_t* bad : {L"BR_Info.XObjectInspector", L"", L"{12345678-0000-0000-0000-000000000000}",
@@ -518,7 +541,7 @@ TEST_CASE("dataset entries, hierarchy objects, an unreadable header and stray no
     REQUIRE(SendMessageW(tabStrip, TCM_GETITEMW, 0, reinterpret_cast<LPARAM>(&tab)));
     CHECK(std::wstring(title) == L"Attributes");
     inspector.Select(inspector.ItemWithData(1));
-    CHECK(inspector.sink.events.back().guid == s.scene.ObjectId(L"h-node"));
+    CHECK(inspector.sink.events.back().guid == ObjectId(s.scene, L"h-node"));
     CHECK_FALSE(IsWindowVisible(tabStrip));
     inspector.Select(inspector.ItemWithData(2));
     CHECK(IsWindowVisible(tabStrip));
@@ -537,7 +560,7 @@ TEST_CASE("dataset entries, hierarchy objects, an unreadable header and stray no
     CHECK(inspector.sink.events.size() == before);
     notify(2);  // the same path with a word that names the rock
     REQUIRE(inspector.sink.events.size() == before + 1);
-    CHECK(inspector.sink.events.back().guid == s.scene.ObjectId(L"u-rock"));
+    CHECK(inspector.sink.events.back().guid == ObjectId(s.scene, L"u-rock"));
   }
 }
 
@@ -603,9 +626,9 @@ TEST_CASE("the details of the chosen entry: attributes, metadata and services ta
   CHECK(TabTitles(strip) == std::vector<std::wstring>{L"Attributes"});
 
   // FormatAttributes of a dataset identity: the metadata's text form.
-  const ComRef<IUnknown> chartDb = s.scene.Database(L"CHARTDB");
+  const auto chartDb = s.scene.Database(L"CHARTDB");
   BSTR text = nullptr;
-  BSTR id = SysAllocString(DataSetIdText(s.scene.ObjectId(L"c-light")).c_str());
+  BSTR id = SysAllocString(DataSetIdText(ObjectId(s.scene, L"c-light")).c_str());
   CHECK(inspector->FormatAttributes(chartDb.Get(), id, &text) == S_OK);
   const std::wstring metadata = Take(text);
   CHECK(metadata.rfind(L"DataSet filename\rCHART001.000\rSource identification code\r \r", 0) == 0);
