@@ -20,6 +20,7 @@ target_link_libraries(BR_Info PRIVATE
   br_contours
   br_inspector
   br_legend
+  br_picture
 )
 file(GLOB br_resource_images CONFIGURE_DEPENDS ${BR_ROOT}/resources/images/*)
 set_source_files_properties(${BR_ROOT}/resources/BR_Info.rc PROPERTIES

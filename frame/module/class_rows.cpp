@@ -6,6 +6,7 @@
 #include "contours/XContoursView.h"
 #include "inspector/XObjectInspector.h"
 #include "legend/XChartLegend.h"
+#include "picture/XPICREPView.h"
 #include "tides/controls/TidesPortList.h"
 #include "tides/controls/TidesWindow.h"
 #include "tides/objects/TidesDatabase.h"
@@ -22,6 +23,7 @@ ClassEntry gRows[] = {
     ControlRow<br::tides::TidesWindow>(L"TidesWindow", 109),
     PlainObjectRow<br::legend::XChartLegend>(L"XChartLegend"),
     ControlRow<br::contours::XContoursView>(L"XContoursView", 116),
+    ControlRow<br::picture::XPICREPView>(L"XPICREPView", 118),
 };
 
 }  // namespace
