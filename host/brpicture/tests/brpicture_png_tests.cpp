@@ -70,7 +70,7 @@ Png Read(const std::wstring& path) {
 }  // namespace
 
 TEST_CASE("brpicture --png writes the zoomed picture") {
-  ScratchFolder folder(L"brpicture_png");
+  PictureFolder folder(L"brpicture_png");
   REQUIRE(WriteBmp24(folder.File(L"p.bmp"), CornerPattern(60, 40)));
   const std::wstring out = folder.File(L"out.png");
   REQUIRE(Run(L"\"" + folder.File(L"p.bmp") + L"\" --zoom 50 --png \"" + out + L"\"") == 0);
@@ -97,7 +97,7 @@ TEST_CASE("brpicture --png writes the zoomed picture") {
 }
 
 TEST_CASE("brpicture on a file that is no picture: exit 2 and the failure text drawn") {
-  ScratchFolder folder(L"brpicture_broken");
+  PictureFolder folder(L"brpicture_broken");
   REQUIRE(WriteBroken(folder.File(L"x.png")));
   const std::wstring out = folder.File(L"out.png");
   CHECK(Run(L"\"" + folder.File(L"x.png") + L"\" --png \"" + out + L"\"") == 2);

@@ -202,14 +202,14 @@ bool WriteBroken(const std::wstring& path) {
   return Save(path, std::vector<unsigned char>(text.begin(), text.end()));
 }
 
-ScratchFolder::ScratchFolder(const wchar_t* name) {
+PictureFolder::PictureFolder(const wchar_t* name) {
   wchar_t temp[MAX_PATH] = {};
   GetTempPathW(MAX_PATH, temp);
   path_ = std::wstring(temp) + name + L"_" + std::to_wstring(GetCurrentProcessId()) + L"\\";
   CreateDirectoryW(path_.c_str(), nullptr);
 }
 
-ScratchFolder::~ScratchFolder() {
+PictureFolder::~PictureFolder() {
   WIN32_FIND_DATAW entry;
   const HANDLE find = FindFirstFileW((path_ + L"*").c_str(), &entry);
   if (find != INVALID_HANDLE_VALUE) {

@@ -43,13 +43,13 @@ bool WriteEncoded(const std::wstring& path, const Pixels& pixels, const wchar_t*
 // Bytes that no decoder takes for a picture.
 bool WriteBroken(const std::wstring& path);
 
-// A scratch folder under the temporary folder, removed with its files on destruction.
-class ScratchFolder {
+// A folder for picture files under the temporary folder, removed with its files on destruction.
+class PictureFolder {
 public:
-  explicit ScratchFolder(const wchar_t* name);
-  ~ScratchFolder();
-  ScratchFolder(const ScratchFolder&) = delete;
-  ScratchFolder& operator=(const ScratchFolder&) = delete;
+  explicit PictureFolder(const wchar_t* name);
+  ~PictureFolder();
+  PictureFolder(const PictureFolder&) = delete;
+  PictureFolder& operator=(const PictureFolder&) = delete;
   const std::wstring& Path() const { return path_; }
   std::wstring File(const std::wstring& name) const { return path_ + name; }
 

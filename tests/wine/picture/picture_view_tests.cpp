@@ -103,7 +103,7 @@ const COLORREF kCanvas = RGB(0x12, 0x34, 0x56);
 }  // namespace
 
 TEST_CASE("every picture format is drawn with its corner pixels in place") {
-  ScratchFolder folder(L"picview_formats");
+  PictureFolder folder(L"picview_formats");
   const Pixels pattern = CornerPattern(64, 48);
   struct Format {
     const wchar_t* name;
@@ -136,7 +136,7 @@ TEST_CASE("every picture format is drawn with its corner pixels in place") {
 }
 
 TEST_CASE("PNG alpha lets the background through") {
-  ScratchFolder folder(L"picview_alpha");
+  PictureFolder folder(L"picview_alpha");
   Pixels pixels = CornerPattern(20, 20);
   for (int y = 0; y < 20; ++y)
     for (int x = 10; x < 20; ++x) pixels.at(x, y) = Argb(0, 255, 0, 255);  // right half: clear
@@ -156,7 +156,7 @@ TEST_CASE("PNG alpha lets the background through") {
 }
 
 TEST_CASE("zoom: extent, preferred size and the picture") {
-  ScratchFolder folder(L"picview_zoom");
+  PictureFolder folder(L"picview_zoom");
   REQUIRE(WriteBmp24(folder.File(L"wide.bmp"), CornerPattern(1000, 600)));
   View v;
   CHECK(v.Preferred().cx == 0);  // nothing loaded yet
@@ -193,7 +193,7 @@ TEST_CASE("zoom: extent, preferred size and the picture") {
 }
 
 TEST_CASE("scroll bars and line steps in a hosted window") {
-  ScratchFolder folder(L"picview_scroll");
+  PictureFolder folder(L"picview_scroll");
   REQUIRE(WriteBmp24(folder.File(L"wide.bmp"), CornerPattern(1000, 600)));
   REQUIRE(WriteBmp24(folder.File(L"narrow.bmp"), CornerPattern(90, 400)));
   View v;
@@ -264,7 +264,7 @@ TEST_CASE("scroll bars and line steps in a hosted window") {
 }
 
 TEST_CASE("brightness follows the shading of the current display palette") {
-  ScratchFolder folder(L"picview_shade");
+  PictureFolder folder(L"picview_shade");
   Pixels grey{8, 8, std::vector<std::uint32_t>(64, Argb(255, 100, 100, 100))};
   REQUIRE(WriteBmp24(folder.File(L"grey.bmp"), grey));
   View v;
@@ -311,7 +311,7 @@ TEST_CASE("brightness follows the shading of the current display palette") {
 }
 
 TEST_CASE("drawing at bounds away from the corner keeps the picture inside them") {
-  ScratchFolder folder(L"picview_bounds");
+  PictureFolder folder(L"picview_bounds");
   REQUIRE(WriteBmp24(folder.File(L"p.bmp"), CornerPattern(40, 30)));
   View v;
   REQUIRE(v.Open(folder.File(L"p.bmp")) == S_OK);
@@ -329,7 +329,7 @@ TEST_CASE("drawing at bounds away from the corner keeps the picture inside them"
 }
 
 TEST_CASE("a file GDI+ cannot read: E_FAIL and the failure text with the name") {
-  ScratchFolder folder(L"picview_broken");
+  PictureFolder folder(L"picview_broken");
   const std::wstring path = folder.File(L"broken.png");
   REQUIRE(WriteBroken(path));
   View v;
@@ -358,7 +358,7 @@ TEST_CASE("a file GDI+ cannot read: E_FAIL and the failure text with the name") 
 }
 
 TEST_CASE("file names: UTF-16 kept whole, empty and wrongly typed names refused") {
-  ScratchFolder folder(L"picview_names");
+  PictureFolder folder(L"picview_names");
   const std::wstring path = folder.File(L"\u0645\u064A\u0646\u0627\u0621_\u03A9.bmp");  // Arabic and Greek
   REQUIRE(WriteBmp24(path, CornerPattern(16, 16)));
   View v;
@@ -444,7 +444,7 @@ TEST_CASE("PRV_BITMAP takes a real bitmap handle and owns it once GDI+ took it")
 }
 
 TEST_CASE("two views hold two GDI+ start-ups") {
-  ScratchFolder folder(L"picview_two");
+  PictureFolder folder(L"picview_two");
   REQUIRE(WriteBmp24(folder.File(L"p.bmp"), CornerPattern(16, 16)));
   DllUnderTest dll;
   ComRef<IXPICREPView> first, second;
