@@ -240,11 +240,14 @@ void XPICREPView::Scroll(HWND window, int bar, WPARAM request) {
   }
   long thumb = 0;
   if (kind == ScrollRequest::Thumb) {
-    // The message carries 16 bits only; the bar knows all 32.
+    // The message carries 16 bits only; the bar knows all 32 while its thumb is dragged.
+    // A request whose 16 bits differ from the bar's was not made by the bar: take those.
+    thumb = HIWORD(request);
     SCROLLINFO info{};
     info.cbSize = sizeof info;
     info.fMask = SIF_TRACKPOS;
-    thumb = GetScrollInfo(window, bar, &info) ? info.nTrackPos : HIWORD(request);
+    if (GetScrollInfo(window, bar, &info) && (info.nTrackPos & 0xFFFF) == static_cast<int>(HIWORD(request)))
+      thumb = info.nTrackPos;
   }
   const long next = ScrollTo(kind, position, horizontal ? extent_.lineX : extent_.lineY, axis, thumb);
   if (next == position) return;

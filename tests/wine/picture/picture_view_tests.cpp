@@ -254,6 +254,14 @@ TEST_CASE("scroll bars and line steps in a hosted window") {
     SendMessageW(window, WM_VSCROLL, SB_LINEDOWN, 0);
     CHECK(position(SB_VERT).nPos == 4);
   }
+  SUBCASE("thumb positions") {
+    SendMessageW(window, WM_HSCROLL, MAKEWPARAM(SB_THUMBPOSITION, 123), 0);
+    CHECK(position(SB_HORZ).nPos == 123);
+    SendMessageW(window, WM_VSCROLL, MAKEWPARAM(SB_THUMBTRACK, 1000), 0);
+    CHECK(position(SB_VERT).nPos == 300 - client.bottom);
+    SendMessageW(window, WM_HSCROLL, MAKEWPARAM(SB_ENDSCROLL, 0), 0);
+    CHECK(position(SB_HORZ).nPos == 123);
+  }
   SUBCASE("removing the picture puts both bars back to 0") {
     REQUIRE(v.Remove() == S_OK);
     CHECK(position(SB_HORZ).nPos == 0);
