@@ -335,14 +335,17 @@ void XPICREPView::PaintImage(HDC dc) {
                                                       : Gdiplus::InterpolationModeBilinear);
   gp::GdipSetPixelOffsetMode(graphics, Gdiplus::PixelOffsetModeHalf);
 
-  const ColourMatrix m = MatrixFor(BrightnessOf(shading_[palette_]));
-  Gdiplus::ColorMatrix matrix{};
-  for (int r = 0; r < 5; ++r)
-    for (int c = 0; c < 5; ++c) matrix.m[r][c] = m[r][c];
+  // The identity matrix changes nothing: without attributes GDI+ may draw through GDI.
+  const float factor = BrightnessOf(shading_[palette_]);
   Gdiplus::GpImageAttributes* attributes = nullptr;
-  if (gp::GdipCreateImageAttributes(&attributes) == Gdiplus::Ok && attributes)
+  if (factor != 1.0f && gp::GdipCreateImageAttributes(&attributes) == Gdiplus::Ok && attributes) {
+    const ColourMatrix m = MatrixFor(factor);
+    Gdiplus::ColorMatrix matrix{};
+    for (int r = 0; r < 5; ++r)
+      for (int c = 0; c < 5; ++c) matrix.m[r][c] = m[r][c];
     gp::GdipSetImageAttributesColorMatrix(attributes, Gdiplus::ColorAdjustTypeDefault, TRUE, &matrix, nullptr,
                                           Gdiplus::ColorMatrixFlagsDefault);
+  }
 
   const float scale = static_cast<float>(zoom_) * 0.01f;
   const float sw = static_cast<float>(source.right - source.left);

@@ -150,6 +150,9 @@ const Case kCases[] = {
     {"repaint after a zoom change", [](Bench& b) { return b.Load() == S_OK; },
      [](Bench& b) { return b.Zoom(kZooms[b.step++ % kZoomCount]) == S_OK && b.Draw() == S_OK; }},
     {"repaint at the same zoom", [](Bench&) { return true; }, [](Bench& b) { return b.Draw() == S_OK; }},
+    // Palette 0 shaded: every pixel goes through the colour matrix.
+    {"repaint at the same zoom, shaded", [](Bench& b) { return b.view->SetPalIdxShading(0, 10.0) == S_OK; },
+     [](Bench& b) { return b.Draw() == S_OK; }},
 };
 
 int Run(int count, const std::wstring& path) {

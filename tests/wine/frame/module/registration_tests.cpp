@@ -36,11 +36,12 @@ struct Row {
   bool control;
   const wchar_t* toolboxBitmap;
 };
-// One plain row and two control rows (one without events): the other rows take the same paths.
+// One plain row and three control rows (one without events): the other rows take the same paths.
 const Row kRows[] = {{L"TidesPort", &CLSID_TidesPort, false, nullptr},
                      {L"XObjectInspector", &CLSID_XObjectInspector, true, L", 103"},
                      {L"TidesWindow", &CLSID_TidesWindow, true, L", 109"},
-                     {L"XContoursView", &CLSID_XContoursView, true, L", 116"}};
+                     {L"XContoursView", &CLSID_XContoursView, true, L", 116"},
+                     {L"XPICREPView", &CLSID_XPICREPView, true, L", 118"}};
 
 }  // namespace
 
