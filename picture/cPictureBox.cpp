@@ -1,7 +1,6 @@
 #include "picture/cPictureBox.h"
 
 #include "frame/com/ComRef.h"
-#include "frame/settings/cRegSettings.h"
 #include "frame/settings/localised_texts.h"
 #include "frame/settings/settings.h"
 #include "picture/AXPictDescr.h"
@@ -24,7 +23,6 @@ namespace {
 
 constexpr wchar_t kWindowClass[] = L"BR_Info_PictureBox";
 constexpr DWORD kStyle = WS_POPUP | WS_CAPTION | WS_SYSMENU | WS_THICKFRAME | WS_CLIPCHILDREN;
-constexpr const char* kPlacement[] = {"left", "top", "right", "bottom"};
 
 // The hosted view, as large as its zoomed picture plus room for both scroll bars.
 class ViewHost final : public toolkit::AXComponent {
@@ -189,17 +187,14 @@ void cPictureBox::Place() {
   const int width = std::min<long>(frame.right - frame.left, work.right - work.left);
   const int height = std::min<long>(frame.bottom - frame.top, work.bottom - work.top);
 
-  const br::cRegSettings user = br::cRegSettings::User();
-  long stored[4];
-  for (int i = 0; i < 4; ++i)
-    stored[i] = static_cast<long>(user.ReadDword(br::SETTINGS_PICTURE_BOX_KEY, kPlacement[i], 0));
+  const RECT stored = br::ReadPictureBoxPlacement();
   int x = 0, y = 0;
-  if (stored[2] != stored[0] && stored[3] != stored[1]) {
+  if (stored.right != stored.left && stored.bottom != stored.top) {
     RECT own{};
     GetWindowRect(window_, &own);
     // The first time the stored client corner places it; later it stays where it is.
-    x = placed_ ? own.left : stored[0] + frame.left;
-    y = placed_ ? own.top : stored[1] + frame.top;
+    x = placed_ ? own.left : stored.left + frame.left;
+    y = placed_ ? own.top : stored.top + frame.top;
   } else {
     RECT around = work;
     const HWND active = GetActiveWindow();
@@ -223,10 +218,7 @@ void cPictureBox::StorePlacement() const {
   RECT client{};
   GetClientRect(window_, &client);
   MapWindowPoints(window_, nullptr, reinterpret_cast<POINT*>(&client), 2);
-  const br::cRegSettings user = br::cRegSettings::User();
-  const LONG values[4] = {client.left, client.top, client.right, client.bottom};
-  for (int i = 0; i < 4; ++i)
-    user.WriteDword(br::SETTINGS_PICTURE_BOX_KEY, kPlacement[i], static_cast<DWORD>(values[i]));
+  br::WritePictureBoxPlacement(client);
 }
 
 void cPictureBox::LayOut() {
