@@ -223,6 +223,9 @@ TEST_CASE("browsing and zooming the hosted view") {
   CHECK(toolkit::isKindOf(&panel, &toolkit::records::cXPictDescr));
   CHECK_FALSE(panel.previousButton().isEnabled());
   CHECK_FALSE(panel.nextButton().isEnabled());
+  // The tool bar's images: 16 pixels wide, from the module's strip.
+  REQUIRE(panel.nextButton().imageList() != nullptr);
+  CHECK(panel.nextButton().imageSize().cx == 16);
 
   SUBCASE("an empty list: next, previous and the window toggle do nothing") {
     REQUIRE(panel.Fill(harbour.Object(L"portzic-tower").Get()) == S_OK);
@@ -328,6 +331,10 @@ TEST_CASE("the picture window: shown centred, placement stored, kept, and never 
   CHECK(panel.boxButton().isChecked());
   const HWND box = panel.pictureBox()->Window();
   REQUIRE(IsWindowVisible(box));
+  // Made from the dialog template, with the Close button's default text.
+  wchar_t className[16] = {};
+  GetClassNameW(box, className, 16);
+  CHECK(std::wstring(className) == L"#32770");
   CHECK(toolkit::isKindOf(&panel, &toolkit::records::Container));
 
   // Centred on the active window (the host at 100, 100, 400 x 300), as large as it wants.
