@@ -17,7 +17,9 @@
 
 #include <doctest/doctest.h>
 
+#include <algorithm>
 #include <cstdlib>
+#include <cstring>
 #include <string>
 
 using namespace br::test;
@@ -120,6 +122,131 @@ struct MountedPanel {
   }
 };
 
+// A stored picture of `size` bytes whose reads fail once `failAt` bytes were read (never
+// when negative); Stat tells `statSize` (fails when negative).
+class FakeStream : public IStream {
+public:
+  long long size = 10000, failAt = -1, statSize = 10000, position = 0;
+  STDMETHODIMP QueryInterface(REFIID riid, void** out) override {
+    *out = IsEqualIID(riid, IID_IUnknown) || IsEqualIID(riid, IID_IStream) ? this : nullptr;
+    return *out ? S_OK : E_NOINTERFACE;
+  }
+  STDMETHODIMP_(ULONG) AddRef() override { return 2; }
+  STDMETHODIMP_(ULONG) Release() override { return 1; }
+  STDMETHODIMP Read(void* buffer, ULONG wanted, ULONG* read) override {
+    if (failAt >= 0 && position >= failAt) return STG_E_READFAULT;
+    const ULONG n = static_cast<ULONG>(std::min<long long>(wanted, size - position));
+    memset(buffer, 'p', n);
+    position += n;
+    *read = n;
+    return S_OK;
+  }
+  STDMETHODIMP Write(const void*, ULONG, ULONG*) override { return E_NOTIMPL; }
+  STDMETHODIMP Seek(LARGE_INTEGER, DWORD, ULARGE_INTEGER*) override { return E_NOTIMPL; }
+  STDMETHODIMP SetSize(ULARGE_INTEGER) override { return E_NOTIMPL; }
+  STDMETHODIMP CopyTo(IStream*, ULARGE_INTEGER, ULARGE_INTEGER*, ULARGE_INTEGER*) override { return E_NOTIMPL; }
+  STDMETHODIMP Commit(DWORD) override { return E_NOTIMPL; }
+  STDMETHODIMP Revert() override { return E_NOTIMPL; }
+  STDMETHODIMP LockRegion(ULARGE_INTEGER, ULARGE_INTEGER, DWORD) override { return E_NOTIMPL; }
+  STDMETHODIMP UnlockRegion(ULARGE_INTEGER, ULARGE_INTEGER, DWORD) override { return E_NOTIMPL; }
+  STDMETHODIMP Stat(STATSTG* status, DWORD) override {
+    if (statSize < 0) return E_NOTIMPL;
+    *status = STATSTG{};
+    status->cbSize.QuadPart = static_cast<ULONGLONG>(statSize);
+    return S_OK;
+  }
+  STDMETHODIMP Clone(IStream**) override { return E_NOTIMPL; }
+};
+
+// Holds one stream, "pic.bin", and opens it only as compound files do: read access with an
+// exclusive share mode.
+class FakeStorage : public IStorage {
+public:
+  FakeStream stream;
+  DWORD mode = 0;
+  STDMETHODIMP QueryInterface(REFIID riid, void** out) override {
+    *out = IsEqualIID(riid, IID_IUnknown) || IsEqualIID(riid, IID_IStorage) ? this : nullptr;
+    return *out ? S_OK : E_NOINTERFACE;
+  }
+  STDMETHODIMP_(ULONG) AddRef() override { return 2; }
+  STDMETHODIMP_(ULONG) Release() override { return 1; }
+  STDMETHODIMP CreateStream(LPCOLESTR, DWORD, DWORD, DWORD, IStream**) override { return E_NOTIMPL; }
+  STDMETHODIMP OpenStream(LPCOLESTR name, void*, DWORD grfMode, DWORD, IStream** out) override {
+    *out = nullptr;
+    mode = grfMode;
+    if (std::wstring(name) != L"pic.bin") return STG_E_FILENOTFOUND;
+    if (grfMode != (STGM_READ | STGM_SHARE_EXCLUSIVE)) return STG_E_INVALIDFLAG;
+    *out = &stream;
+    return S_OK;
+  }
+  STDMETHODIMP CreateStorage(LPCOLESTR, DWORD, DWORD, DWORD, IStorage**) override { return E_NOTIMPL; }
+  STDMETHODIMP OpenStorage(LPCOLESTR, IStorage*, DWORD, SNB, DWORD, IStorage**) override { return E_NOTIMPL; }
+  STDMETHODIMP CopyTo(DWORD, const IID*, SNB, IStorage*) override { return E_NOTIMPL; }
+  STDMETHODIMP MoveElementTo(LPCOLESTR, IStorage*, LPCOLESTR, DWORD) override { return E_NOTIMPL; }
+  STDMETHODIMP Commit(DWORD) override { return E_NOTIMPL; }
+  STDMETHODIMP Revert() override { return E_NOTIMPL; }
+  STDMETHODIMP EnumElements(DWORD, void*, DWORD, IEnumSTATSTG**) override { return E_NOTIMPL; }
+  STDMETHODIMP DestroyElement(LPCOLESTR) override { return E_NOTIMPL; }
+  STDMETHODIMP RenameElement(LPCOLESTR, LPCOLESTR) override { return E_NOTIMPL; }
+  STDMETHODIMP SetElementTimes(LPCOLESTR, const FILETIME*, const FILETIME*, const FILETIME*) override {
+    return E_NOTIMPL;
+  }
+  STDMETHODIMP SetClass(REFCLSID) override { return E_NOTIMPL; }
+  STDMETHODIMP SetStateBits(DWORD, DWORD) override { return E_NOTIMPL; }
+  STDMETHODIMP Stat(STATSTG*, DWORD) override { return E_NOTIMPL; }
+};
+
+// An object with nothing but its storage.
+class StoringObject : public IGeoObject {
+public:
+  FakeStorage storage;
+  STDMETHODIMP QueryInterface(REFIID riid, void** out) override {
+    *out = IsEqualIID(riid, IID_IUnknown) || IsEqualIID(riid, IID_IGeoObject) ? this : nullptr;
+    return *out ? S_OK : E_NOINTERFACE;
+  }
+  STDMETHODIMP_(ULONG) AddRef() override { return 2; }
+  STDMETHODIMP_(ULONG) Release() override { return 1; }
+  STDMETHODIMP GetDataSet(IGeoDataSet** out) override { return *out = nullptr, E_FAIL; }
+  STDMETHODIMP GetKindId(GUID*) override { return E_NOTIMPL; }
+  STDMETHODIMP GetId(GUID*) override { return E_NOTIMPL; }
+  STDMETHODIMP Reserved6() override { return E_NOTIMPL; }
+  STDMETHODIMP GetClassCode(LONG*) override { return E_NOTIMPL; }
+  STDMETHODIMP GetPrimitive(LONG*) override { return E_NOTIMPL; }
+  STDMETHODIMP Reserved9() override { return E_NOTIMPL; }
+  STDMETHODIMP GetAttribute(LONG, IGeoAttribute** out) override { return *out = nullptr, S_FALSE; }
+  STDMETHODIMP GetAttributes(IGeoObjectEnum**) override { return E_NOTIMPL; }
+  STDMETHODIMP GetRelated(IGeoObjectEnum**) override { return E_NOTIMPL; }
+  STDMETHODIMP GetMembers(IGeoObjectEnum**) override { return E_NOTIMPL; }
+  STDMETHODIMP Reserved14() override { return E_NOTIMPL; }
+  STDMETHODIMP HitTest(IGeoProjection*, const RECT*, GEO_MAP_METRICS*) override { return E_NOTIMPL; }
+  STDMETHODIMP Reserved16() override { return E_NOTIMPL; }
+  STDMETHODIMP GetText(BSTR*) override { return E_NOTIMPL; }
+  STDMETHODIMP Reserved18() override { return E_NOTIMPL; }
+  STDMETHODIMP GetProperty(LONG, VARIANT*) override { return E_NOTIMPL; }
+  STDMETHODIMP GetStorage(IStorage** out) override {
+    *out = &storage;
+    return S_OK;
+  }
+};
+
+// The TIF*.tmp files in a folder.
+int TemporaryFiles(const std::wstring& folder) {
+  int count = 0;
+  WIN32_FIND_DATAW entry;
+  const HANDLE find = FindFirstFileW((folder + L"TIF*").c_str(), &entry);
+  if (find == INVALID_HANDLE_VALUE) return 0;
+  do ++count;
+  while (FindNextFileW(find, &entry));
+  FindClose(find);
+  return count;
+}
+
+long long FileSize(const std::wstring& path) {
+  WIN32_FILE_ATTRIBUTE_DATA data{};
+  if (!GetFileAttributesExW(path.c_str(), GetFileExInfoStandard, &data)) return -1;
+  return (static_cast<long long>(data.nFileSizeHigh) << 32) | data.nFileSizeLow;
+}
+
 }  // namespace
 
 TEST_CASE("the list: stored pictures copied, volume pictures found, a missing one stops the fill") {
@@ -183,6 +310,37 @@ TEST_CASE("the list: stored pictures copied, volume pictures found, a missing on
     CHECK(pictures.Next() == E_NOTIMPL);
     CHECK(pictures.Previous() == E_NOTIMPL);
   }
+}
+
+TEST_CASE("copying a stored picture: exclusive read access, the stream's size, failed reads") {
+  REQUIRE(SUCCEEDED(CoInitializeEx(nullptr, COINIT_APARTMENTTHREADED)));
+  {
+    AXPictDescr pictures;
+    StoringObject object;
+    SUBCASE("the whole stream, opened the way compound files allow") {
+      REQUIRE(pictures.FillNames(&object, "pic.bin") == S_OK);
+      CHECK(object.storage.mode == (STGM_READ | STGM_SHARE_EXCLUSIVE));
+      REQUIRE(pictures.Count() == 1);
+      CHECK(FileSize(pictures.PathAt(0)) == 10000);
+    }
+    SUBCASE("the copy stops at the size the stream tells") {
+      object.storage.stream.statSize = 2500;
+      REQUIRE(pictures.FillNames(&object, "pic.bin") == S_OK);
+      CHECK(FileSize(pictures.PathAt(0)) == 2500);
+    }
+    SUBCASE("without a size, up to the first empty read") {
+      object.storage.stream.statSize = -1;
+      REQUIRE(pictures.FillNames(&object, "pic.bin") == S_OK);
+      CHECK(FileSize(pictures.PathAt(0)) == 10000);
+    }
+    SUBCASE("a read failing halfway: 0x80040322 and no partial file") {
+      object.storage.stream.failAt = 3072;
+      CHECK(pictures.FillNames(&object, "pic.bin") == br::picture::kPictureNotCopied);
+      CHECK(pictures.Count() == 0);
+      CHECK(TemporaryFiles(pictures.TemporaryFolder()) == 0);
+    }
+  }
+  CoUninitialize();
 }
 
 TEST_CASE("each panel has its own folder; one going leaves the other's files and links' targets alone") {
