@@ -323,10 +323,18 @@ void XPICREPView::PaintFailure(HDC dc, const RECT& client) {
 
 void XPICREPView::PaintImage(HDC dc) {
   // Only the part of the image under the clip box: a large picture costs what is visible.
-  RECT clip{};
-  if (GetClipBox(dc, &clip) == ERROR) return;
+  // A DC that cannot tell (some metafile DCs) gets the whole picture.
+  RECT clip{0, 0, extent_.width, extent_.height};
+  if (GetClipBox(dc, &clip) == NULLREGION) return;
   const SourceRect source = SourceFor(clip.left, clip.top, clip.right, clip.bottom, imageWidth_, imageHeight_, zoom_);
   if (source.right <= source.left) return;
+  // GDI+ takes floats: move the origin to the part's corner so that its coordinates stay
+  // small and exact however far the picture is scrolled.
+  const long cornerX = static_cast<long>(static_cast<long long>(source.left) * zoom_ / 100);
+  const long cornerY = static_cast<long>(static_cast<long long>(source.top) * zoom_ / 100);
+  POINT viewport{};
+  GetViewportOrgEx(dc, &viewport);
+  SetViewportOrgEx(dc, viewport.x + cornerX, viewport.y + cornerY, nullptr);
 
   Gdiplus::GpGraphics* graphics = nullptr;
   if (gp::GdipCreateFromHDC(dc, &graphics) != Gdiplus::Ok || !graphics) return;
@@ -335,10 +343,14 @@ void XPICREPView::PaintImage(HDC dc) {
                                                       : Gdiplus::InterpolationModeBilinear);
   gp::GdipSetPixelOffsetMode(graphics, Gdiplus::PixelOffsetModeHalf);
 
-  // The identity matrix changes nothing: without attributes GDI+ may draw through GDI.
-  const float factor = BrightnessOf(shading_[palette_]);
   Gdiplus::GpImageAttributes* attributes = nullptr;
-  if (factor != 1.0f && gp::GdipCreateImageAttributes(&attributes) == Gdiplus::Ok && attributes) {
+  gp::GdipCreateImageAttributes(&attributes);
+  // Filtering at the picture's edges samples mirrored pixels, not transparent ones, so the
+  // last row and column keep their colour when zoomed.
+  if (attributes) gp::GdipSetImageAttributesWrapMode(attributes, Gdiplus::WrapModeTileFlipXY, 0, FALSE);
+  // The identity matrix changes nothing.
+  const float factor = BrightnessOf(shading_[palette_]);
+  if (attributes && factor != 1.0f) {
     const ColourMatrix m = MatrixFor(factor);
     Gdiplus::ColorMatrix matrix{};
     for (int r = 0; r < 5; ++r)
@@ -347,14 +359,16 @@ void XPICREPView::PaintImage(HDC dc) {
                                           Gdiplus::ColorMatrixFlagsDefault);
   }
 
-  const float scale = static_cast<float>(zoom_) * 0.01f;
+  const double scale = zoom_ * 0.01;
   const float sw = static_cast<float>(source.right - source.left);
   const float sh = static_cast<float>(source.bottom - source.top);
-  gp::GdipDrawImageRectRect(graphics, BitmapOf(image_), source.left * scale, source.top * scale, sw * scale, sh * scale,
-                            static_cast<float>(source.left), static_cast<float>(source.top), sw, sh,
-                            Gdiplus::UnitPixel, attributes, nullptr, nullptr);
+  gp::GdipDrawImageRectRect(graphics, BitmapOf(image_), static_cast<float>(source.left * scale - cornerX),
+                            static_cast<float>(source.top * scale - cornerY), static_cast<float>(sw * scale),
+                            static_cast<float>(sh * scale), static_cast<float>(source.left),
+                            static_cast<float>(source.top), sw, sh, Gdiplus::UnitPixel, attributes, nullptr, nullptr);
   if (attributes) gp::GdipDisposeImageAttributes(attributes);
   gp::GdipDeleteGraphics(graphics);
+  SetViewportOrgEx(dc, viewport.x, viewport.y, nullptr);
 }
 
 }  // namespace br::picture

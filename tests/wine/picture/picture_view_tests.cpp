@@ -254,6 +254,21 @@ TEST_CASE("scroll bars and line steps in a hosted window") {
     SendMessageW(window, WM_VSCROLL, SB_LINEDOWN, 0);
     CHECK(position(SB_VERT).nPos == 4);
   }
+  SUBCASE("at 1000% the far corner is still drawn where it belongs") {
+    REQUIRE(v.Zoom(1000) == S_OK);  // 10000 x 6000
+    SendMessageW(window, WM_HSCROLL, MAKEWPARAM(SB_THUMBPOSITION, 10000 - client.right), 0);
+    SendMessageW(window, WM_VSCROLL, MAKEWPARAM(SB_THUMBPOSITION, 6000 - client.bottom), 0);
+    REQUIRE(position(SB_HORZ).nPos == 10000 - client.right);
+    Canvas canvas(client.right, client.bottom);
+    REQUIRE(DrawControl(v.view.Get(), canvas) == S_OK);
+    // The last 80 x 80 pixels are the white corner block (8 x 8 picture pixels; its inner
+    // edge blends over one picture pixel), the rest grey: the picture's own last row and
+    // column too, not blended with what lies beyond the picture.
+    CHECK(canvas.Count(AsColour(kCornerColours[3]), client.right - 70, client.bottom - 70, client.right,
+                       client.bottom) == 4900);
+    CHECK(canvas.At(client.right - 100, client.bottom - 100) == AsColour(kPatternGrey));
+    CHECK(canvas.At(client.right - 100, client.bottom - 1) == AsColour(kPatternGrey));
+  }
   SUBCASE("thumb positions") {
     SendMessageW(window, WM_HSCROLL, MAKEWPARAM(SB_THUMBPOSITION, 123), 0);
     CHECK(position(SB_HORZ).nPos == 123);
