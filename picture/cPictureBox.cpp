@@ -171,6 +171,14 @@ bool cPictureBox::ShowPicture(const std::wstring& path) {
   return true;
 }
 
+void cPictureBox::RemovePicture() {
+  const auto view = br::com::ComRef<IXPICREPView>::Adopt(View());
+  if (!view) return;
+  VARIANT empty;
+  VariantInit(&empty);
+  view->put_Property(PRV_PICFILENAME, empty);
+}
+
 void cPictureBox::Hide() {
   if (window_) ShowWindow(window_, SW_HIDE);
 }

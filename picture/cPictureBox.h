@@ -31,6 +31,8 @@ public:
   // nothing shown) when the view cannot be had.
   bool ShowPicture(const std::wstring& path);
   void Hide();
+  // Lets go of the picture (and of its file).
+  void RemovePicture();
   HWND Window() const { return window_; }
   // The hosted view (one reference for the caller), or null.
   IXPICREPView* View() const;

@@ -73,17 +73,30 @@ bool cXPictDescr::create(HWND parentHwnd) {
 
 HRESULT cXPictDescr::Fill(IGeoObject* object) {
   if (!object) return E_POINTER;
+  // The window lets go of the last object's picture first: its file is about to go.
+  if (pictureBox_) pictureBox_->RemovePicture();
   const HRESULT hr = pictures_.Fill(object);
-  StepsChanged();
-  if (pictures_.HasContent()) pictures_.Next();
+  Filled();
   return hr;
 }
 
 HRESULT cXPictDescr::FillNames(IGeoObject* object, const std::string& names) {
+  if (pictureBox_) pictureBox_->RemovePicture();
   const HRESULT hr = pictures_.FillNames(object, names);
+  Filled();
+  return hr;
+}
+
+void cXPictDescr::Filled() {
   StepsChanged();
   if (pictures_.HasContent()) pictures_.Next();
-  return hr;
+  // An open window shows the new first picture, or closes when there is none.
+  if (pictureBox_ && box_.isChecked()) {
+    if (pictures_.Current() >= 0)
+      GiveBoxCurrent();
+    else
+      TogglePictureBox(false);
+  }
 }
 
 void cXPictDescr::SetPaletteNumber(int palette) {

@@ -6,7 +6,8 @@
 //   HRESULT hr = panel.Fill(object);  // attribute 120 of the object; see AXPictDescr.h
 //   bool any = panel.HasContent();    // false: no pictures (hide or grey the tab)
 //   panel.SetPaletteNumber(n);        // 0..4, the display palette the picture is shaded for
-// Fill shows the first picture when there is one and enables previous and next.
+// Fill shows the first picture when there is one and enables previous and next; an open
+// picture window follows (it closes when the new object has no pictures).
 #pragma once
 
 #include "picture/AXPictDescr.h"
@@ -64,6 +65,7 @@ private:
     HIMAGELIST list = nullptr;
   };
 
+  void Filled();
   void ZoomChanged();
   void StepsChanged();
   void GiveBoxCurrent();

@@ -529,6 +529,21 @@ TEST_CASE("the picture window: shown centred, placement stored, kept, and never 
   CHECK(again.left == 37);
   CHECK(again.top == 41);
 
+  SUBCASE("a new fill: the window follows, and the last fill's copies can go") {
+    REQUIRE(panel.Fill(harbour.Object(L"fillettes-beacon").Get()) == S_OK);
+    const std::wstring copy = panel.pictures().PathAt(0);
+    CHECK(IsWindowVisible(box));
+    const auto view = ComRef<IXPICREPView>::Adopt(panel.pictureBox()->View());
+    VARIANT name;
+    VariantInit(&name);
+    REQUIRE(view->get_Property(PRV_PICFILENAME, &name) == S_OK);
+    CHECK(std::wstring(name.bstrVal) == copy);
+    VariantClear(&name);
+    REQUIRE(panel.Fill(harbour.Object(L"portzic-tower").Get()) == S_OK);
+    CHECK_FALSE(Exists(copy));
+    CHECK_FALSE(IsWindowVisible(box));
+    CHECK_FALSE(panel.boxButton().isChecked());
+  }
   SUBCASE("a picture larger than the screen: the window stays inside the work area") {
     PictureFolder folder(L"picpanel_large");
     REQUIRE(WriteBmp24(folder.File(L"large.bmp"), CornerPattern(3000, 2400)));
