@@ -6,7 +6,9 @@
 #include <wrl/client.h>
 
 #include "frame/geo/geo_enumeration.h"
+#include "frame/settings/localised_texts.h"
 #include "inspector/format/attribute_text.h"
+#include "inspector/format/tidal_stream_text.h"
 #include "inspector/panels/PanelSettings.h"
 #include "inspector/panels/geo_object_rules.h"
 #include "toolkit/base/class_records.h"
@@ -274,6 +276,17 @@ HRESULT cP_SHPanel::AddPrintableAttribute(IGeoAttribute* attribute, std::optiona
   if (pair->name.empty() || pair->value.empty()) return S_FALSE;
   AddRow(pair->name, pair->value);
   return S_OK;
+}
+
+std::string cP_SHPanel::TidalStreamValue(const std::string& raw) {
+  TidalStreamCaptions captions;
+  captions.highWater = GetText("ObjInspector", 59, "HighWater");
+  captions.lowWater = GetText("ObjInspector", 60, "LowWater");
+  captions.time = GetText("ObjInspector", 61, "Time");
+  captions.direction = GetText("ObjInspector", 62, "Direction");
+  captions.velocity = GetText("ObjInspector", 63, "Velocity");
+  captions.knots = GetText("ObjInspector", 64, "kn");
+  return TidalStreamText(raw, captions);
 }
 
 int cP_SHPanel::dispatchEvent(toolkit::ToolkitEvent& event) {

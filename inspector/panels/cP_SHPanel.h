@@ -75,9 +75,9 @@ protected:
   const PanelSettings& settings() const { return settings_; }
   // Appends a row of the given type; column -1 leaves the text cells empty.
   int AppendRow(int type, int column, const std::string& text);
-  // A tidal stream table handed over as the formatter wrote it; the panel that lays it
-  // out in lines replaces this.
-  virtual std::string TidalStreamValue(const std::string& raw) const { return raw; }
+  // A tidal stream attribute's value (the formatter's field list) laid out as its table
+  // of lines, with the localised captions (tidal_stream_text.h).
+  static std::string TidalStreamValue(const std::string& raw);
   // Draws a heading row across the whole width; other cells as the table draws them.
   virtual bool DrawCell(HDC dc, const RECT& rect, int column, int row);
 

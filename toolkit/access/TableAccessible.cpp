@@ -104,19 +104,33 @@ void TableAccessible::announceReorder(const Table& table) {
 LONG TableAccessible::childCount() const { return table().displayRowCount(); }
 
 // A row reads as it is shown: the visible columns in display order.
-std::string TableAccessible::nameOf(LONG child) const {
-  if (child == CHILDID_SELF) return ComponentAccessible::nameOf(child);
+std::string TableAccessible::cellsOf(int row) const {
   const Table& t = table();
-  const int row = rowOf(child);
-  std::string name;
+  std::string cells;
   bool first = true;
   for (int column : t.displayOrder()) {
     if (!t.isColumnVisible(column)) continue;
-    if (!first) name += '\t';
-    name += t.getCellText(row, column);
+    if (!first) cells += '\t';
+    cells += t.getCellText(row, column);
     first = false;
   }
-  return name;
+  return cells;
+}
+
+std::string TableAccessible::nameOf(LONG child) const {
+  if (child == CHILDID_SELF) return ComponentAccessible::nameOf(child);
+  const int row = rowOf(child);
+  std::string name = table().rowName(row);
+  return name.empty() ? cellsOf(row) : name;
+}
+
+bool TableAccessible::valueOf(LONG child, std::string& value) const {
+  if (child == CHILDID_SELF) return ComponentAccessible::valueOf(child, value);
+  const int row = rowOf(child);
+  // Only rows named by their owner: the others already read their cells as their name.
+  if (table().rowName(row).empty()) return ComponentAccessible::valueOf(child, value);
+  value = cellsOf(row);
+  return true;
 }
 
 LONG TableAccessible::roleOf(LONG child) const {

@@ -1,7 +1,8 @@
 #pragma once
 // The table as an accessibility client reads it: a list with one list item per
 // shown row, in the order the rows are shown (child n is the n-th shown row).
-// A row is named by its visible cells' texts joined by tabs, and its state says
+// A row is named by its visible cells' texts joined by tabs (or by the name its
+// owner gives it, the cells then being its value), and its state says
 // whether it is selected and whether it has the focus. Clients may also select
 // a row (accSelect), which the owner hears of as if the user had picked it.
 //
@@ -30,6 +31,7 @@ public:
 protected:
   LONG childCount() const override;
   std::string nameOf(LONG child) const override;
+  bool valueOf(LONG child, std::string& value) const override;
   LONG roleOf(LONG child) const override;
   LONG stateOf(LONG child) const override;
   RECT screenRectOf(LONG child) const override;
@@ -42,6 +44,7 @@ protected:
 private:
   Table& table() const;
   int rowOf(LONG child) const;  // stored row of a child id
+  std::string cellsOf(int row) const;  // the visible cells joined by tabs
 };
 
 }  // namespace toolkit

@@ -16,6 +16,7 @@
 // (15). A handler refuses a mouse-driven selection change by answering non-zero
 // with the code set to 0.
 
+#include <functional>
 #include <memory>
 #include <set>
 #include <string>
@@ -164,6 +165,11 @@ public:
   bool hitTest(int x, int y, int& row, int& column) const;
   // First row from `firstRow` (stored) whose cell text holds `text`; -1 if none.
   int findRow(int column, int firstRow, const char* text, bool anywhere, bool caseSensitive) const;
+  // Owners whose rows have a name of their own (a light's chart abbreviation) give the
+  // namer; accessibility clients then read that name, and the visible cells as the
+  // row's value. A namer answering an empty text leaves the row named by its cells.
+  void setRowNamer(std::function<std::string(int storedRow)> namer) { rowNamer_ = std::move(namer); }
+  std::string rowName(int storedRow) const { return rowNamer_ ? rowNamer_(storedRow) : std::string(); }
 
   // ---- editing
   bool beginEdit(int row, int column);
@@ -239,6 +245,7 @@ private:
   int editRow_ = -1;
   int editColumn_ = -1;
   std::string editStartText_;  // the editor's text when the edit began
+  std::function<std::string(int)> rowNamer_;
 };
 
 }  // namespace toolkit

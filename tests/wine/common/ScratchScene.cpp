@@ -2,6 +2,7 @@
 
 #include <doctest/doctest.h>
 
+#include <cstdlib>
 #include <cstring>
 
 using Microsoft::WRL::ComPtr;
@@ -20,7 +21,18 @@ ScratchScene::ScratchScene(const std::string& json) {
   WriteFile(handle, json.data(), static_cast<DWORD>(json.size()), &written, nullptr);
   CloseHandle(handle);
   REQUIRE(written == json.size());
+  Load(file_);
+}
 
+ScratchScene::ScratchScene(SampleHarbour) {
+  const char* root = getenv("BR_SOURCE_DIR");
+  REQUIRE(root != nullptr);
+  std::wstring path = L"Z:";
+  for (const char* c = root; *c; ++c) path += *c == '/' ? L'\\' : static_cast<wchar_t>(*c);
+  Load(path + L"\\data\\harbour\\harbour.json");
+}
+
+void ScratchScene::Load(const std::wstring& file) {
   CLSID clsid{};
   REQUIRE(CLSIDFromProgID(L"ChartScene.Scene", &clsid) == S_OK);
   REQUIRE(CoCreateInstance(clsid, nullptr, CLSCTX_INPROC_SERVER, IID_IDispatch,
@@ -31,7 +43,7 @@ ScratchScene::ScratchScene(const std::string& json) {
   VARIANT argument;
   VariantInit(&argument);
   argument.vt = VT_BSTR;
-  argument.bstrVal = SysAllocString(file);
+  argument.bstrVal = SysAllocString(file.c_str());
   DISPPARAMS params{&argument, nullptr, 1, 0};
   EXCEPINFO exception{};
   const HRESULT loaded = scene_->Invoke(id, IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_METHOD, &params, nullptr,

@@ -19,6 +19,10 @@ class ScratchScene {
 public:
   // Writes the JSON to a temporary file and loads it (REQUIREs both). COM must be set up.
   explicit ScratchScene(const std::string& json);
+  // The sample scene of the source tree (data/harbour/harbour.json, found through the
+  // BR_SOURCE_DIR environment variable), loaded in place and left as it is.
+  struct SampleHarbour {};
+  explicit ScratchScene(SampleHarbour);
   ~ScratchScene();
   ScratchScene(const ScratchScene&) = delete;
   ScratchScene& operator=(const ScratchScene&) = delete;
@@ -36,6 +40,7 @@ public:
   VARIANT Records(const wchar_t* names) const;
 
 private:
+  void Load(const std::wstring& file);
   Microsoft::WRL::ComPtr<IUnknown> Call(const wchar_t* method, const wchar_t* argument) const;
   // The method's answer as it is (VT_EMPTY when the call fails); the caller clears it.
   VARIANT CallValue(const wchar_t* method, const wchar_t* argument) const;
