@@ -261,7 +261,7 @@ HRESULT cLightsViewPanel::AddLight(IGeoObject* light) {
   const int row = rows_.appendRowInteger(rows_.rowCount());
   if (row < 0) return E_OUTOFMEMORY;
 
-  // Cell texts as the formatter writes the attributes, on one line.
+  // Cell texts as the formatter writes the attributes.
   IObjectFormatter* formatter = settings_.Formatter();
   const auto valueText = [&](long code) {
     ComPtr<IGeoAttribute> attribute;
@@ -273,8 +273,16 @@ HRESULT cLightsViewPanel::AddLight(IGeoObject* light) {
     SysFreeString(text);
     std::optional<AttributeText> pair = SplitAttributeText(formatted);
     if (!pair) return std::string();
-    std::string value = CleanAttributeValue(pair->value);
-    std::replace(value.begin(), value.end(), '\r', ' ');
+    // List items and lines of a text side by side: the list shows one line per light.
+    const std::string cleaned = CleanAttributeValue(pair->value);
+    std::string value;
+    for (char c : cleaned) {
+      if (c == '\r') {
+        value += ", ";
+      } else {
+        value += c;
+      }
+    }
     return value;
   };
   for (int column = kFirstShown; column <= kLastShown; ++column) {
