@@ -71,6 +71,21 @@ constexpr LONG kRowBase = STATE_SYSTEM_SELECTABLE | STATE_SYSTEM_FOCUSABLE;
 
 }  // namespace
 
+TEST_CASE("an owner's row names stand before the cells, which become the row's value") {
+  Stations s;
+  AccessibleReader list(s.table.getHandle());
+  REQUIRE(list.get());
+  CHECK(list.Value(1) == L"<failed>");  // rows named by their cells have no value
+  // Stored rows 0 (Le Havre) and 2 (Brest) get names; the others keep their cells.
+  s.table.setRowNamer([](int row) { return row == 0 ? std::string("LH") : row == 2 ? std::string("BR") : ""; });
+  CHECK(list.ChildNames() == Names{L"Anvers\t5.2 m", L"BR", L"LH", L"Zeebrugge\t4.3 m"});
+  CHECK(list.Value(2) == L"Brest\t6.4 m");
+  CHECK(list.Value(3) == L"Le Havre\t7.1 m");
+  CHECK(list.Value(1) == L"<failed>");
+  s.table.setRowNamer(nullptr);
+  CHECK(list.ChildNames()[1] == L"Brest\t6.4 m");
+}
+
 TEST_CASE("rows are list items named by their visible cells, in the order shown") {
   Stations s;
   AccessibleReader list(s.table.getHandle());
