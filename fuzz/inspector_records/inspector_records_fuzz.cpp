@@ -1,20 +1,26 @@
 // What the inspector's panels take from a host as bytes or text: a raster chart header
-// record, a dataset header record and a formatter's attribute text.
+// record, a dataset header record, a formatter's attribute text, a tidal stream value and
+// a light's signal group.
 //
 // One input: u8 choice, then the rest as the record or text. Checked beyond "no crash":
 // texts never grow past their fields, at most 64 panels are read, every row has a caption
-// and a value, a cleaned value holds no bar and no break tag, and a split text gives back
-// its own parts.
+// and a value, a cleaned value holds no bar and no break tag, a split text gives back
+// its own parts, a tidal stream table has its 15 lines whatever the fields, and a signal
+// group gives no more groups than it opens brackets.
 #include <cctype>
 #include <cstddef>
+#include <algorithm>
 #include <cstdint>
 #include <string>
+#include <vector>
 
 #include "fuzz/common/fuzz_check.h"
 #include "frame/geo/dataset_header.h"
 #include "inspector/format/attribute_text.h"
+#include "inspector/format/light_abbreviation.h"
 #include "inspector/format/metadata_rows.h"
 #include "inspector/format/raster_chart_rows.h"
+#include "inspector/format/tidal_stream_text.h"
 
 using namespace br::inspector;
 
@@ -45,7 +51,7 @@ MetadataSources Sources() {
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   if (size == 0) return 0;
-  const unsigned choice = data[0] % 3;
+  const unsigned choice = data[0] % 5;
   const unsigned char* rest = data + 1;
   const std::size_t restSize = size - 1;
 
@@ -63,6 +69,27 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     const br::geo::DataSetHeader header = br::geo::ParseDataSetHeader(rest, restSize);
     CheckRows(ChartDataSetTextRows(header, std::nullopt, Sources()));
     CheckRows(ChartDataSetRows({}, header, std::uint16_t{1}, Sources()));
+  } else if (choice == 3) {
+    const std::string value(reinterpret_cast<const char*>(rest), restSize);
+    const std::string table = TidalStreamText(value, TidalStreamCaptions{});
+    std::size_t lines = 0;
+    for (char c : table) lines += c == '\r';
+    std::size_t inputBreaks = 0;
+    for (char c : value) inputBreaks += c == '\r';
+    // Fields are copied once (the reference once per hour line too), captions are fixed.
+    FUZZ_CHECK(lines >= 15 && lines <= 15 + 14 * inputBreaks);
+    FUZZ_CHECK(table.size() <= 500 + 15 * value.size());
+    FUZZ_CHECK(!table.empty() && table.back() == '\r');
+  } else if (choice == 4) {
+    LightValues light;
+    light.signalGroup.assign(reinterpret_cast<const char*>(rest), restSize);
+    light.characteristic = restSize > 0 ? rest[0] % 32 : 2;
+    light.colours.assign(rest, rest + std::min<std::size_t>(restSize, 8));
+    const std::vector<std::string> groups = SignalGroups(light.signalGroup);
+    std::size_t opened = 0;
+    for (char c : light.signalGroup) opened += c == '(';
+    FUZZ_CHECK(groups.size() <= opened);
+    FUZZ_CHECK(LightAbbreviation(light).size() <= 64 + 3 * restSize);
   } else {
     const std::string text(reinterpret_cast<const char*>(rest), restSize);
     if (const auto pair = SplitAttributeText(text)) {

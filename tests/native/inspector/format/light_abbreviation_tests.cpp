@@ -98,15 +98,9 @@ TEST_CASE("missing, unknown and bad values leave their part out") {
   CHECK(LightAbbreviation(onlySector) == "010" + kDeg + "-020" + kDeg);
 }
 
-TEST_CASE("signal groups and characteristic names") {
-  CHECK(SignalGroups("(2)") == std::vector<std::string>{"2"});
+TEST_CASE("signal groups: the bracketed texts, nothing outside or unclosed") {
   CHECK(SignalGroups("()") == std::vector<std::string>{""});
   CHECK(SignalGroups("(6)(1)") == std::vector<std::string>{"6", "1"});
   CHECK(SignalGroups("x(2)y(") == std::vector<std::string>{"2"});
   CHECK(SignalGroups("").empty());
-  CHECK(LightCharacteristicText(1) == "F");
-  CHECK(LightCharacteristicText(17) == "Al.Oc");
-  CHECK(LightCharacteristicText(29) == "Al.FFl");
-  CHECK(LightCharacteristicText(21).empty());
-  CHECK(LightCharacteristicText(0).empty());
 }
