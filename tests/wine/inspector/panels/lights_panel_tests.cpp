@@ -282,6 +282,10 @@ TEST_CASE("widths follow the list: a narrow list shares nothing, a wider one sha
 TEST_CASE("the sample harbour's lights and their chart abbreviations") {
   MountedPanel<cLightsViewPanel> m;
   ScratchScene harbour(ScratchScene::SampleHarbour{});
+  test::SceneProbe probe;
+  const long objects = probe.Counter("live.Object");
+  const long enumerators = probe.Counter("live.ObjectEnum");
+  const long attributes = probe.Counter("live.Attribute");
   struct Case {
     const wchar_t* object;
     Names names;
@@ -307,6 +311,10 @@ TEST_CASE("the sample harbour's lights and their chart abbreviations") {
   CHECK(m.panel.FillLights(harbour.Object(L"kerviniou-buoy").Get()) == S_FALSE);
   CHECK(m.panel.FillLights(harbour.Object(L"goulet-stream").Get()) == S_FALSE);
   CHECK_FALSE(m.panel.HasContent());
+  // Everything the panel took from the host was given back.
+  CHECK(probe.Counter("live.Object") == objects);
+  CHECK(probe.Counter("live.ObjectEnum") == enumerators);
+  CHECK(probe.Counter("live.Attribute") == attributes);
 }
 
 TEST_CASE("hovering a light's row shows its abbreviation") {
