@@ -26,7 +26,8 @@ InspectorPanel::InspectorPanel(Owner& owner, const PanelSettings& settings)
       cards_(CardLayout()),
       attributes_(settings),
       internal_(settings),
-      external_(settings) {
+      external_(settings),
+      lights_(settings) {
   insertNamed(nullptr, &tree_, "tree");
   insertNamed(nullptr, &cards_, "details");
   cards_.insertNamed(nullptr, &tabs_, "tabs");
@@ -41,20 +42,22 @@ void InspectorPanel::clearDetails() {
   attributes_.Clear();
   internal_.Clear();
   external_.Clear();
+  lights_.Clear();
 }
 
 void InspectorPanel::showFilledTabs() {
-  showTab(internal_, 8, "Internal services/shops");
-  showTab(external_, 9, "External services/shops");
+  showTab(internal_, internal_.HasContent(), 8, "Internal services/shops");
+  showTab(external_, external_.HasContent(), 9, "External services/shops");
+  showTab(lights_, lights_.HasContent(), 10, "Lights");
   if (tabs_.isValid()) tabs_.doLayout();
 }
 
-void InspectorPanel::showTab(cP_SHPanel& panel, long textId, const char* title) {
+void InspectorPanel::showTab(toolkit::Panel& panel, bool hasContent, long textId, const char* title) {
   const bool shown = panel.getParent() == &tabs_;
-  if (panel.HasContent() && !shown) {
+  if (hasContent && !shown) {
     const std::string text = br::GetText("ObjInspector", textId, title);
     tabs_.insertNamed(nullptr, &panel, text.c_str());
-  } else if (!panel.HasContent() && shown) {
+  } else if (!hasContent && shown) {
     if (tabs_.getSelectedPage() > 0) tabs_.selectPage(0, false);
     tabs_.removeComponent(&panel, false);
   }

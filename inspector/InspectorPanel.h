@@ -1,11 +1,12 @@
 #pragma once
 // The inspector's content: the object tree on the left (35 %), and on the right a card
 // panel whose card 0 holds the detail tabs and card 1 the hierarchy view. The tab
-// "Attributes" holds the attribute table from the start; the services tabs are shown only
-// while their panels have rows.
+// "Attributes" holds the attribute table from the start; the services and lights tabs are
+// shown only while their panels have rows.
 
 #include "inspector/ObjectTree.h"
 #include "inspector/panels/cAttrViewPanel_Tbl.h"
+#include "inspector/panels/cLightsViewPanel.h"
 #include "inspector/panels/cP_SHPanel.h"
 #include "toolkit/core/Panel.h"
 #include "toolkit/widgets/TabContainer.h"
@@ -34,9 +35,10 @@ public:
   cAttrViewPanel_Tbl& attributes() { return attributes_; }
   cP_SHPanel& internalServices() { return internal_; }
   cP_SHPanel& externalServices() { return external_; }
-  // Empties the attribute and services panels.
+  cLightsViewPanel& lights() { return lights_; }
+  // Empties the attribute, services and lights panels.
   void clearDetails();
-  // Puts the services tabs in or takes them out by their content, after a fill.
+  // Puts the services and lights tabs in or takes them out by their content, after a fill.
   void showFilledTabs();
   // Card 0 (details) or 1 (hierarchy), laid out again when it changes.
   void showCard(int card);
@@ -53,7 +55,8 @@ private:
   cAttrViewPanel_Tbl attributes_;
   cP_SHPanel internal_;
   cP_SHPanel external_;
-  void showTab(cP_SHPanel& panel, long textId, const char* title);
+  cLightsViewPanel lights_;
+  void showTab(toolkit::Panel& panel, bool hasContent, long textId, const char* title);
 };
 
 }  // namespace br::inspector

@@ -194,13 +194,14 @@ void XObjectInspector::ShowDetails(const ObjectRecord& record, bool header) {
   panel->showCard(card);
 }
 
-// The attribute table, and for a harbour its services; a failure is logged and leaves
-// what was filled.
+// The attribute table, the lights of the object, and for a harbour its services; a
+// failure is logged and leaves what was filled.
 void XObjectInspector::FillObjectDetails(InspectorPanel& panel, IGeoObject* object, long classCode, bool chart) {
   br::ErrRecord failure;
   br::RunGuarded(reporter_, "CXObjectInspector", BR_ERR_PLACE("_fillGeoObjectAttr"), failure, [&] {
     const bool collection = classCode == kClassAggregation || classCode == kClassAssociation;
     panel.attributes().FillObject(object, true, !(chart && collection));
+    if (chart) panel.lights().FillLights(object);
     if (classCode != kClassHarbour) return;
     ForEachRelated(object, Relation::kAll, [&](IGeoObject* related) {
       long code = 0;

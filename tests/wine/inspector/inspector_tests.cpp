@@ -637,6 +637,28 @@ TEST_CASE("the details of the chosen entry: attributes, metadata and services ta
   SysFreeString(id);
 }
 
+TEST_CASE("the Lights tab: shown while the chosen chart object has a light, hidden otherwise") {
+  Suite s;
+  InspectorControl inspector(s.dll);
+  inspector.Host();
+  // The chart light is listed as the aggregation that gathers it with its beacon.
+  REQUIRE(SetRecords(inspector, s.scene, L"c-light") == S_OK);
+  HWND strip = FindClass(inspector.Window(), WC_TABCONTROLW);
+  REQUIRE(strip != nullptr);
+  CHECK(TabTitles(strip) == std::vector<std::wstring>{L"Attributes"});  // the header
+  inspector.Select(inspector.ItemWithData(1));
+  CHECK(TabTitles(strip) == std::vector<std::wstring>{L"Attributes", L"Lights"});
+  inspector.Select(inspector.ItemWithData(-2));
+  CHECK(TabTitles(strip) == std::vector<std::wstring>{L"Attributes"});
+
+  // A light of the host's own kind is no chart light; a rock has none.
+  REQUIRE(SetRecords(inspector, s.scene, L"u-light, u-rock") == S_OK);
+  inspector.Select(inspector.ItemWithData(1));
+  CHECK(TabTitles(strip) == std::vector<std::wstring>{L"Attributes"});
+  inspector.Select(inspector.ItemWithData(2));
+  CHECK(TabTitles(strip) == std::vector<std::wstring>{L"Attributes"});
+}
+
 TEST_CASE("HOCode2Name answers from the installation's agency table") {
   ScratchFolder folder;
   CreateDirectoryA((folder.Path() + "\\SYSTEM").c_str(), nullptr);
