@@ -1,8 +1,9 @@
 #include "tests/wine/common/ScratchScene.h"
 
+#include "tests/wine/common/SceneClient.h"
+
 #include <doctest/doctest.h>
 
-#include <cstdlib>
 #include <cstring>
 
 using Microsoft::WRL::ComPtr;
@@ -24,13 +25,7 @@ ScratchScene::ScratchScene(const std::string& json) {
   Load(file_);
 }
 
-ScratchScene::ScratchScene(SampleHarbour) {
-  const char* root = getenv("BR_SOURCE_DIR");
-  REQUIRE(root != nullptr);
-  std::wstring path = L"Z:";
-  for (const char* c = root; *c; ++c) path += *c == '/' ? L'\\' : static_cast<wchar_t>(*c);
-  Load(path + L"\\data\\harbour\\harbour.json");
-}
+ScratchScene::ScratchScene(SampleHarbour) { Load(SceneClient::SamplePath()); }
 
 void ScratchScene::Load(const std::wstring& file) {
   CLSID clsid{};
