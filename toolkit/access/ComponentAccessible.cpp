@@ -4,6 +4,7 @@
 
 #include "toolkit/base/class_records.h"
 #include "toolkit/core/cXComponent.h"
+#include "toolkit/core/system_library.h"
 #include "toolkit/widgets/Button.h"
 
 namespace toolkit {
@@ -19,7 +20,7 @@ struct Oleacc {
 const Oleacc& oleacc() {
   static const Oleacc loaded = [] {
     Oleacc functions;
-    if (HMODULE module = LoadLibraryA("oleacc.dll")) {
+    if (HMODULE module = LoadSystemLibrary(L"oleacc.dll")) {
       functions.lresultFromObject = reinterpret_cast<decltype(functions.lresultFromObject)>(
           reinterpret_cast<void*>(GetProcAddress(module, "LresultFromObject")));
       functions.objectFromWindow = reinterpret_cast<decltype(functions.objectFromWindow)>(

@@ -2,6 +2,7 @@
 
 #include "toolkit/base/class_records.h"
 #include "toolkit/core/ToolkitWindows.h"
+#include "toolkit/core/system_library.h"
 
 namespace toolkit {
 
@@ -22,8 +23,8 @@ AtlLibrary& atl() {
   static bool tried = false;
   if (tried) return library;
   tried = true;
-  for (const char* name : {"atl.dll", "atl100.dll"}) {
-    library.module = LoadLibraryA(name);
+  for (const wchar_t* name : {L"atl.dll", L"atl100.dll"}) {
+    library.module = LoadSystemLibrary(name);
     if (library.module) break;
   }
   if (!library.module) return library;
