@@ -4,11 +4,11 @@
 
 #include <doctest/doctest.h>
 
+#include "tests/wine/common/planted_probe.h"
+
 namespace br::test {
 
 namespace {
-
-constexpr const wchar_t* kMark = L"planted_probe_ran.txt";
 
 // The probe as built: the nearest folder above the test program that holds it.
 std::wstring ProbePath() {
@@ -63,10 +63,10 @@ void PlantedFolder::Plant(const wchar_t* fileName) const {
 }
 
 bool PlantedFolder::ProbeRan() const {
-  return GetFileAttributesW((path_ + L"\\" + kMark).c_str()) != INVALID_FILE_ATTRIBUTES;
+  return GetFileAttributesW((path_ + L"\\" + kPlantedProbeMark).c_str()) != INVALID_FILE_ATTRIBUTES;
 }
 
-void PlantedFolder::ForgetProbeRan() const { DeleteFileW((path_ + L"\\" + kMark).c_str()); }
+void PlantedFolder::ForgetProbeRan() const { DeleteFileW((path_ + L"\\" + kPlantedProbeMark).c_str()); }
 
 std::vector<std::wstring> PlantedFolder::ModulesFromHere() const {
   std::vector<std::wstring> found;

@@ -8,6 +8,7 @@
 #include <string>
 
 #include "tests/wine/common/PlantedFolder.h"
+#include "tests/wine/common/planted_probe.h"
 #include "toolkit/core/system_library.h"
 
 using br::test::PlantedFolder;
@@ -31,7 +32,7 @@ TEST_CASE("a copy planted in the current folder: a bare-name load takes it, the 
   // The plant works: a plain load by name searches the current folder and runs it.
   HMODULE plain = LoadLibraryW(L"br_planted_only.dll");
   REQUIRE(plain != nullptr);
-  CHECK(reinterpret_cast<void*>(GetProcAddress(plain, "PlantedProbe")) != nullptr);
+  CHECK(reinterpret_cast<void*>(GetProcAddress(plain, br::test::kPlantedProbeExport)) != nullptr);
   CHECK(planted.ProbeRan());
   FreeLibrary(plain);
   planted.ForgetProbeRan();
@@ -52,7 +53,7 @@ TEST_CASE("system DLLs come from the system folder although planted copies lie i
     if (module == nullptr) continue;  // not installed here: then nothing at all is loaded
     ++loaded;
     CHECK(InFolder(PlantedFolder::ModulePath(module), system));
-    CHECK(reinterpret_cast<void*>(GetProcAddress(module, "PlantedProbe")) == nullptr);
+    CHECK(reinterpret_cast<void*>(GetProcAddress(module, br::test::kPlantedProbeExport)) == nullptr);
     FreeLibrary(module);
   }
   // oleacc, atl, usp10, riched20 and gdiplus are part of every Windows (and Wine prefix).
