@@ -29,6 +29,18 @@ TEST_CASE("units and datums carry the S-57 texts") {
   CHECK(VerticalDatumText(0) == nullptr);
   CHECK(VerticalDatumText(255) == nullptr);
   CHECK(S57CodeText(131, 1) == nullptr);  // an attribute outside the four
+  // Values the list reserves without a text have none: the legend keeps its default.
+  for (unsigned value = 61; value <= 98; ++value) {
+    INFO(value);
+    CHECK(HorizontalDatumText(static_cast<std::uint8_t>(value)) == nullptr);
+  }
+  for (unsigned value = 0; value < 256; ++value) {
+    for (const char* text : {DepthUnitText(static_cast<std::uint8_t>(value)), HeightUnitText(static_cast<std::uint8_t>(value)),
+                             VerticalDatumText(static_cast<std::uint8_t>(value)),
+                             HorizontalDatumText(static_cast<std::uint8_t>(value))}) {
+      CHECK((text == nullptr || *text != '\0'));
+    }
+  }
 }
 
 TEST_CASE("projection codes and kinds are unique and find each other") {
