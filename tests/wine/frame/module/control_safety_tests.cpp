@@ -49,8 +49,21 @@ TEST_CASE("no instance answers IObjectSafety") {
 TEST_CASE("registered classes carry no safety category") {
   DllUnderTest dll;
   REQUIRE(dll.RegisterServer() == S_OK);
+  int registered = 0;
   for (const auto& [name, clsid] : kClasses) {
     INFO(name);
+    // Every class the DLL makes is registered, so the absence of its categories counts.
+    IUnknown* object = nullptr;
+    if (dll.Create(*clsid, IID_IUnknown, reinterpret_cast<void**>(&object)) == S_OK) {
+      object->Release();
+      HKEY classKey = nullptr;
+      CHECK(RegOpenKeyExW(HKEY_CLASSES_ROOT, (L"CLSID\\" + Text(*clsid)).c_str(), 0, KEY_READ, &classKey) ==
+            ERROR_SUCCESS);
+      if (classKey) {
+        ++registered;
+        RegCloseKey(classKey);
+      }
+    }
     for (const wchar_t* kind : {L"Implemented Categories", L"Required Categories"}) {
       for (const CATID* category : {&CATID_SafeForScripting, &CATID_SafeForInitializing}) {
         const std::wstring path = L"CLSID\\" + Text(*clsid) + L"\\" + kind + L"\\" + Text(*category);
@@ -60,6 +73,7 @@ TEST_CASE("registered classes carry no safety category") {
       }
     }
   }
+  CHECK(registered >= 5);  // the tide classes, the legend and the contours view at least
   HKEY tidesWindow = nullptr;  // the probe reads where the registration wrote
   CHECK(RegOpenKeyExW(HKEY_CLASSES_ROOT, (L"CLSID\\" + Text(CLSID_TidesWindow)).c_str(), 0, KEY_READ, &tidesWindow) ==
         ERROR_SUCCESS);
