@@ -1,7 +1,8 @@
-// The text engine's portable breaking: break properties from the code units alone and the
-// arithmetic of filling lines, over random text of mixed scripts (Latin, marks, Hebrew,
-// Arabic, Devanagari, Thai, blanks and joiners, CJK punctuation, ideographs, Hangul,
-// surrogate halves, variation selectors, full-width forms, any unit).
+// The text engine's portable breaking over random text of mixed scripts: units drawn from
+// the blocks whose rules differ (Latin, marks, Hebrew, Arabic, Devanagari, Thai, blanks and
+// joiners, CJK punctuation, ideographs, Hangul, surrogate halves, variation selectors,
+// full-width forms, any unit), which raw units (line_breaking) seldom reach together; it
+// checks the break marks themselves and the visual offsets besides the line filling.
 //
 // One input: u8 room (times 4 pixels), u8 split limit, then three bytes per unit: script,
 // place in the script's block, width in pixels (0 to 63). Checked beyond "no crash":
