@@ -71,6 +71,14 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     return 0;
   }
   FUZZ_CHECK(!table.languages.empty());
+  // Language and id cells are whole numbers: none holds a zero byte.
+  const std::vector<CsvRecord> records = ReadCsv(content.compare(0, 3, "\xEF\xBB\xBF") == 0 ? content.substr(3) : content);
+  for (std::size_t r = 0; r < records.size(); ++r) {
+    const CsvRow& cells = records[r].cells;
+    for (std::size_t c = r == 0 ? 2 : 1; c < (r == 0 ? cells.size() : 2); ++c) {
+      FUZZ_CHECK(cells[c].text.find('\0') == std::string::npos);
+    }
+  }
   for (const auto& [key, cells] : table.texts) {
     FUZZ_CHECK(!key.first.empty());
     FUZZ_CHECK(cells.size() == table.languages.size());

@@ -14,7 +14,8 @@ bool ParseLong(const std::string& text, long& value) {
   errno = 0;
   char* end = nullptr;
   value = std::strtol(text.c_str(), &end, 10);
-  return errno == 0 && end != nullptr && *end == '\0';
+  // The whole cell: a zero byte inside it does not end the number.
+  return errno == 0 && end == text.c_str() + text.size();
 }
 
 }  // namespace

@@ -61,6 +61,9 @@ TEST_CASE("text table: languages by column, empty quoted cells are texts, missin
   CHECK_FALSE(ParseTextTable("section,id,english\n", table, error));
   CHECK_FALSE(ParseTextTable("section,id,1033\nObjInspector,one,Attributes\n", table, error));
   CHECK(error.find("line 2") != std::string::npos);
+  // A number cell is read whole: what follows a zero byte is not dropped.
+  CHECK_FALSE(ParseTextTable(std::string("section,id,1033\nObjInspector,12\0x,Attributes\n", 45), table, error));
+  CHECK_FALSE(ParseTextTable(std::string("section,id,1033\0\nObjInspector,12,Attributes\n", 44), table, error));
 }
 
 TEST_CASE("the shipped BRInfo.csv reads whole, with English and French for every row") {
