@@ -560,3 +560,27 @@ TEST_CASE("the picture window: shown centred, placement stored, kept, and never 
     CHECK_FALSE(IsWindowVisible(box));
   }
 }
+
+TEST_CASE("picture names that climb out, are absolute, shares, subfolder paths or patterns find nothing") {
+  Harbour harbour;
+  const std::string volume = SourceFolder() + "\\data\\harbour\\volume\\";
+  REQUIRE(Exists(Wide(volume + "lighthouse.tif")));
+  REQUIRE(Exists(Wide(volume + "PICS\\buoy.bmp")));
+  // Without its drive: a ":" parts names, so a drive path never arrives whole.
+  const std::string rooted = volume.substr(2) + "lighthouse.tif";
+  const std::string names[] = {"..\\volume\\lighthouse.tif", "../volume/lighthouse.tif", "PICS\\buoy.bmp",
+                               "PICS/buoy.bmp", ".\\lighthouse.tif", rooted, "\\\\localhost\\Z$" + rooted,
+                               "\\\\?\\UNC\\localhost\\Z$" + rooted, "..\\files\\beacon.png", "lighthouse.tif\\",
+                               "lighthouse.t?f", "*.tif", "..", "PICS"};
+  AXPictDescr pictures;
+  const ComRef<IGeoObject> object = harbour.Object(L"fillettes-beacon");
+  for (const std::string& name : names) {
+    INFO(name);
+    CHECK(pictures.FillNames(object.Get(), name) == br::picture::kPictureNotFound);
+    CHECK(pictures.Count() == 0);
+    CHECK(TemporaryFiles(pictures.TemporaryFolder()) == 0);
+  }
+  // The same files by their plain names: stored, in the volume folder, in its subfolder.
+  REQUIRE(pictures.FillNames(object.Get(), "beacon.png;lighthouse.tif;buoy.bmp") == S_OK);
+  CHECK(pictures.Count() == 3);
+}
