@@ -73,6 +73,19 @@ cXComponent* Container::findChild(const char* name) const {
   return nullptr;
 }
 
+cXComponent* Container::findNamed(const char* name) const {
+  const std::string wanted = name ? name : "";
+  for (int i = 0; i < children_.rowCount(); ++i) {
+    cXComponent* child = getChild(i);
+    if (!child) continue;
+    if (children_.text(kColumnName, i) == wanted) return child;
+    if (const Container* nested = asContainer(child); nested && nested != this) {
+      if (cXComponent* found = nested->findNamed(name)) return found;
+    }
+  }
+  return nullptr;
+}
+
 HWND Container::windowForChildren() const {
   if (HWND own = getHandle()) return own;
   return creationParent_ && IsWindow(creationParent_) ? creationParent_ : nullptr;

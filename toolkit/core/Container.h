@@ -78,6 +78,9 @@ public:
   std::string getChildPosition(int index) const;
   int indexOf(const cXComponent* component) const;  // -1 when not a child
   cXComponent* findChild(const char* name) const;   // first child of that name, or null
+  // The first component of that name in the subtree below this container, depth first:
+  // each child is looked at, then the subtree of a child container, before the next child.
+  cXComponent* findNamed(const char* name) const;
   const DataTable& childList() const { return children_; }
 
   Layout* getLayout() const { return layout_.get(); }

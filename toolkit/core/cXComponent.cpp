@@ -7,6 +7,7 @@
 #include "toolkit/core/Palette.h"
 #include "toolkit/core/toolkit_error.h"
 #include "toolkit/core/ToolkitWindows.h"
+#include "toolkit/dialogs/ModalDialog.h"
 #include "toolkit/widgets/Tooltip.h"
 
 namespace toolkit {
@@ -416,10 +417,12 @@ void cXComponent::setUserValue2(int value) { userValue2_ = value; }
 int cXComponent::getUserValue2() const { return userValue2_; }
 void cXComponent::setUserId(int id) { userId_ = id; }
 
-int cXComponent::messageBox(const char* text, UINT style, const char*) {
-  return MessageBoxA(getHandle(), text ? text : "", "", style);
+int cXComponent::messageBox(const char* text, UINT style, const char* buttonText) {
+  return ModalDialog::showMessage(*this, text, style, buttonText);
 }
 
-int cXComponent::inputBox(const char*, std::string&, UINT) { return -1; }
+int cXComponent::inputBox(const char* prompt, std::string& result, UINT style) {
+  return ModalDialog::showInput(*this, prompt, result, style);
+}
 
 }  // namespace toolkit

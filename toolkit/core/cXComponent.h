@@ -137,9 +137,10 @@ public:
   virtual void setUserValue2(int value);                           // 85
   virtual int getUserValue2() const;                               // 86
   virtual void setUserId(int id);                                  // 87
-  // The toolkit's own dialogs override these two. The base shows the platform's
-  // message box (the button text is not used) and has no input box: it answers
-  // -1, "could not be shown", and leaves `result` alone.
+  // Modal boxes lying exactly over this component's window (ModalDialog): IDOK, IDYES,
+  // IDNO or IDCANCEL, or -1 at once when this component has no window. Style 0 shows
+  // one button labelled `buttonText` ("OK" when none), 3 Yes/No/Cancel, 4 Yes/No; the
+  // input box also knows 1 (OK and Cancel) and copies the typed text to `result` on OK.
   virtual int messageBox(const char* text, UINT style, const char* buttonText);  // 88
   virtual int inputBox(const char* prompt, std::string& result, UINT style);     // 89
 
