@@ -39,6 +39,30 @@ TEST_CASE("insertion: positions kept, windows made under the container, null and
   for (Probe* p : {&a, &b, &c, &d, &e}) root.removeComponent(p, false);
 }
 
+TEST_CASE("findNamed searches the subtree depth first; findChild only the direct children") {
+  Panel root, first, second, inner;
+  Probe a, deep, shallow, late;
+  root.add(&first, "first");
+  first.add(&inner, "inner");
+  inner.add(&deep, "X");       // depth 3, but in the first branch
+  root.add(&second, "second");
+  second.add(&shallow, "X");   // depth 2, in a later branch
+  root.add(&a, "A");
+  second.add(&late, "late");
+
+  CHECK(root.findNamed("X") == &deep);  // the first branch is searched to its end first
+  CHECK(root.findChild("X") == nullptr);
+  CHECK(second.findNamed("X") == &shallow);
+  CHECK(root.findNamed("late") == &late);
+  CHECK(root.findNamed("inner") == &inner);  // a container is found by its own name too
+  CHECK(root.findNamed("A") == &a);
+  CHECK(root.findNamed("missing") == nullptr);
+  CHECK(root.findNamed(nullptr) == nullptr);  // no unnamed child here
+  // A child removed from the tree is no longer found.
+  inner.removeComponent(&deep, false);
+  CHECK(root.findNamed("X") == &shallow);
+}
+
 TEST_CASE("removal destroys the child when asked; a child deleted by its owner leaves the list") {
   HostWindow host;
   Panel root;
