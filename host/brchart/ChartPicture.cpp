@@ -1,0 +1,171 @@
+#include "host/brchart/ChartPicture.h"
+
+#include <cstdint>
+
+namespace br::brchart {
+
+namespace {
+
+COLORREF Ref(const Rgb& c) { return RGB(c.red, c.green, c.blue); }
+
+int PenStyle(Dash dash) {
+  switch (dash) {
+    case Dash::Dashed: return PS_DASH;
+    case Dash::Dotted: return PS_DOT;
+    default: return PS_SOLID;
+  }
+}
+
+std::vector<POINT> Points(const std::vector<chartscene::PixelPoint>& shape) {
+  std::vector<POINT> out;
+  out.reserve(shape.size());
+  for (const auto& p : shape) out.push_back(POINT{static_cast<LONG>(p.x), static_cast<LONG>(p.y)});
+  return out;
+}
+
+// Selects a GDI object for a scope and deletes the one it made.
+class Selected {
+public:
+  Selected(HDC dc, HGDIOBJ object) : dc_(dc), object_(object), old_(SelectObject(dc, object)) {}
+  ~Selected() {
+    SelectObject(dc_, old_);
+    DeleteObject(object_);
+  }
+  Selected(const Selected&) = delete;
+  Selected& operator=(const Selected&) = delete;
+
+private:
+  HDC dc_;
+  HGDIOBJ object_;
+  HGDIOBJ old_;
+};
+
+}  // namespace
+
+ChartPicture::ChartPicture(std::vector<br::brchart::DrawItem> items, Rgb background, long width, long height)
+    : items_(std::move(items)), background_(background), width_(width), height_(height) {}
+
+void ChartPicture::Draw(HDC dc) const {
+  const RECT all{0, 0, width_, height_};
+  HBRUSH sea = CreateSolidBrush(Ref(background_));
+  FillRect(dc, &all, sea);
+  DeleteObject(sea);
+  const int savedMode = SetBkMode(dc, TRANSPARENT);
+  for (const auto& item : items_) DrawItem(dc, item);
+  for (const auto& item : items_)
+    if (highlighted_.count(item.object)) DrawHighlight(dc, item);
+  SetBkMode(dc, savedMode);
+}
+
+void ChartPicture::DrawItem(HDC dc, const br::brchart::DrawItem& item) const {
+  const std::vector<POINT> points = Points(item.shape);
+  const COLORREF colour = Ref(item.colour);
+  switch (item.style.mark) {
+    case Mark::Fill: {
+      const Selected brush(dc, CreateSolidBrush(colour));
+      const Selected pen(dc, CreatePen(PS_NULL, 0, 0));
+      Polygon(dc, points.data(), static_cast<int>(points.size()));
+      break;
+    }
+    case Mark::Outline: {
+      // Dashed pens are one pixel wide in GDI.
+      const Selected pen(dc, CreatePen(PenStyle(item.style.dash), item.style.dash == Dash::Solid ? item.style.width : 1, colour));
+      const Selected hollow(dc, GetStockObject(NULL_BRUSH));
+      Polygon(dc, points.data(), static_cast<int>(points.size()));
+      break;
+    }
+    case Mark::Line: {
+      const Selected pen(dc, CreatePen(PenStyle(item.style.dash), item.style.dash == Dash::Solid ? item.style.width : 1, colour));
+      Polyline(dc, points.data(), static_cast<int>(points.size()));
+      break;
+    }
+    case Mark::Symbol: {
+      const POINT p = points.front();
+      const int r = item.style.width;
+      switch (item.style.symbol) {
+        case Symbol::Circle: {
+          const Selected brush(dc, CreateSolidBrush(colour));
+          const Selected pen(dc, CreatePen(PS_SOLID, 1, RGB(0, 0, 0)));
+          Ellipse(dc, p.x - r, p.y - r, p.x + r + 1, p.y + r + 1);
+          break;
+        }
+        case Symbol::Square: {
+          const Selected brush(dc, CreateSolidBrush(colour));
+          const Selected pen(dc, CreatePen(PS_SOLID, 1, colour));
+          Rectangle(dc, p.x - r, p.y - r, p.x + r + 1, p.y + r + 1);
+          break;
+        }
+        case Symbol::Cross: {
+          const Selected pen(dc, CreatePen(PS_SOLID, 1, colour));
+          MoveToEx(dc, p.x - r, p.y, nullptr);
+          LineTo(dc, p.x + r + 1, p.y);
+          MoveToEx(dc, p.x, p.y - r, nullptr);
+          LineTo(dc, p.x, p.y + r + 1);
+          break;
+        }
+        case Symbol::Flare: {
+          // A light's flare: a teardrop leaning away from its structure.
+          const Selected brush(dc, CreateSolidBrush(colour));
+          const Selected pen(dc, CreatePen(PS_SOLID, 1, colour));
+          const POINT flare[3] = {{p.x, p.y}, {p.x + r / 2, p.y - r * 2}, {p.x + r + r / 2, p.y - r * 2 + r / 2}};
+          Polygon(dc, flare, 3);
+          break;
+        }
+        case Symbol::Dot:
+        default: {
+          const Selected brush(dc, CreateSolidBrush(colour));
+          const Selected pen(dc, CreatePen(PS_SOLID, 1, colour));
+          Rectangle(dc, p.x - r, p.y - r, p.x + r + 1, p.y + r + 1);
+          break;
+        }
+      }
+      break;
+    }
+    case Mark::None:
+      break;
+  }
+}
+
+void ChartPicture::DrawHighlight(HDC dc, const br::brchart::DrawItem& item) const {
+  const Selected pen(dc, CreatePen(PS_SOLID, 3, RGB(255, 0, 0)));
+  const Selected hollow(dc, GetStockObject(NULL_BRUSH));
+  const std::vector<POINT> points = Points(item.shape);
+  if (item.style.mark == Mark::Symbol) {
+    const POINT p = points.front();
+    Ellipse(dc, p.x - 10, p.y - 10, p.x + 11, p.y + 11);
+  } else if (item.style.mark == Mark::Line) {
+    Polyline(dc, points.data(), static_cast<int>(points.size()));
+  } else {
+    Polygon(dc, points.data(), static_cast<int>(points.size()));
+  }
+}
+
+std::vector<std::uint32_t> ChartPicture::Pixels() const {
+  std::vector<std::uint32_t> pixels;
+  if (width_ <= 0 || height_ <= 0) return pixels;
+  BITMAPINFO info{};
+  info.bmiHeader.biSize = sizeof(info.bmiHeader);
+  info.bmiHeader.biWidth = width_;
+  info.bmiHeader.biHeight = -height_;  // top-down
+  info.bmiHeader.biPlanes = 1;
+  info.bmiHeader.biBitCount = 32;
+  info.bmiHeader.biCompression = BI_RGB;
+  void* bits = nullptr;
+  HDC screen = GetDC(nullptr);
+  HDC memory = CreateCompatibleDC(screen);
+  ReleaseDC(nullptr, screen);
+  HBITMAP bitmap = CreateDIBSection(memory, &info, DIB_RGB_COLORS, &bits, nullptr, 0);
+  if (memory && bitmap && bits) {
+    HGDIOBJ old = SelectObject(memory, bitmap);
+    Draw(memory);
+    GdiFlush();
+    const auto* from = static_cast<const std::uint32_t*>(bits);
+    pixels.assign(from, from + static_cast<std::size_t>(width_) * static_cast<std::size_t>(height_));
+    SelectObject(memory, old);
+  }
+  if (bitmap) DeleteObject(bitmap);
+  if (memory) DeleteDC(memory);
+  return pixels;
+}
+
+}  // namespace br::brchart

@@ -1,0 +1,221 @@
+// brchart run as a person runs it: its exit codes, what it prints for a click, and the
+// pixels of its picture at known places of the sample harbour.
+#include <doctest/doctest.h>
+
+#include <windows.h>
+#include <objidl.h>
+#include <gdiplus.h>
+
+#include <cstdio>
+#include <fstream>
+#include <iterator>
+#include <string>
+#include <vector>
+
+#include "host/brchart/chart_plan.h"
+#include "host/brchart/chart_scene_file.h"
+
+using namespace br::brchart;
+
+namespace {
+
+const std::string kProgram = "Z:" BRCHART_EXE;
+
+struct Run {
+  DWORD exit = 0xFFFF;
+  std::string out;
+  std::string err;
+};
+
+std::string ReadAll(const std::wstring& path) {
+  std::ifstream in(path.c_str(), std::ios::binary);
+  std::string text((std::istreambuf_iterator<char>(in)), std::istreambuf_iterator<char>());
+  // The program writes text-mode lines.
+  std::string lines;
+  for (char c : text)
+    if (c != '\r') lines += c;
+  return lines;
+}
+
+std::wstring Wide(const std::string& text) { return std::wstring(text.begin(), text.end()); }
+
+std::wstring TempPath(const wchar_t* name) {
+  wchar_t folder[MAX_PATH];
+  GetTempPathW(MAX_PATH, folder);
+  return std::wstring(folder) + name;
+}
+
+HANDLE Inheritable(const std::wstring& path) {
+  SECURITY_ATTRIBUTES sa{sizeof(sa), nullptr, TRUE};
+  return CreateFileW(path.c_str(), GENERIC_WRITE, FILE_SHARE_READ, &sa, CREATE_ALWAYS, FILE_ATTRIBUTE_NORMAL, nullptr);
+}
+
+Run Brchart(const std::string& arguments) {
+  const std::wstring outPath = TempPath(L"brchart_test_out.txt"), errPath = TempPath(L"brchart_test_err.txt");
+  HANDLE out = Inheritable(outPath), err = Inheritable(errPath);
+  REQUIRE(out != INVALID_HANDLE_VALUE);
+  REQUIRE(err != INVALID_HANDLE_VALUE);
+  STARTUPINFOW start{};
+  start.cb = sizeof(start);
+  start.dwFlags = STARTF_USESTDHANDLES;
+  start.hStdOutput = out;
+  start.hStdError = err;
+  start.hStdInput = GetStdHandle(STD_INPUT_HANDLE);
+  std::wstring line = L"\"" + Wide(kProgram) + L"\" " + Wide(arguments);
+  PROCESS_INFORMATION process{};
+  const BOOL made = CreateProcessW(nullptr, &line[0], nullptr, nullptr, TRUE, 0, nullptr, nullptr, &start, &process);
+  CloseHandle(out);
+  CloseHandle(err);
+  REQUIRE_MESSAGE(made, "cannot start " << kProgram);
+  REQUIRE(WaitForSingleObject(process.hProcess, 120000) == WAIT_OBJECT_0);
+  Run run;
+  GetExitCodeProcess(process.hProcess, &run.exit);
+  CloseHandle(process.hProcess);
+  CloseHandle(process.hThread);
+  run.out = ReadAll(outPath);
+  run.err = ReadAll(errPath);
+  DeleteFileW(outPath.c_str());
+  DeleteFileW(errPath.c_str());
+  return run;
+}
+
+std::string Folder() { return FolderOf(kProgram); }
+
+// The sample scene as brchart draws it, to find its features' pixels.
+struct Harbour {
+  br::chartscene::SceneModel scene;
+  ChartDisplay display;
+  std::vector<DrawItem> plan;
+  Harbour() {
+    std::string error;
+    REQUIRE_MESSAGE(LoadChartScene(Folder() + "/harbour/harbour.json", Folder() + "/s57", scene, error), error);
+    REQUIRE(ChooseDisplay(scene, ChartOptions{}, display, error));
+    plan = PlanChart(scene, display);
+  }
+  br::chartscene::PixelPoint At(const std::string& name) const {
+    for (const DrawItem& item : plan)
+      if (scene.objects[item.object].name == name) return item.shape.front();
+    FAIL("not drawn: " << name);
+    return {};
+  }
+};
+
+class Png {
+public:
+  explicit Png(const std::wstring& path) {
+    Gdiplus::GdiplusStartupInput input;
+    Gdiplus::GdiplusStartup(&token_, &input, nullptr);
+    bitmap_ = Gdiplus::Bitmap::FromFile(path.c_str());
+  }
+  ~Png() {
+    delete bitmap_;
+    Gdiplus::GdiplusShutdown(token_);
+  }
+  bool Ok() const { return bitmap_ && bitmap_->GetLastStatus() == Gdiplus::Ok; }
+  UINT Width() const { return bitmap_->GetWidth(); }
+  UINT Height() const { return bitmap_->GetHeight(); }
+  Rgb At(int x, int y) const {
+    Gdiplus::Color c;
+    bitmap_->GetPixel(x, y, &c);
+    return Rgb{c.GetR(), c.GetG(), c.GetB()};
+  }
+
+private:
+  ULONG_PTR token_ = 0;
+  Gdiplus::Bitmap* bitmap_ = nullptr;
+};
+
+std::string Text(const Rgb& c) {
+  char t[16];
+  std::snprintf(t, sizeof t, "#%02X%02X%02X", c.red, c.green, c.blue);
+  return t;
+}
+
+}  // namespace
+
+TEST_CASE("brchart's exit codes: usage, wrong command lines, scenes it cannot use") {
+  const Run help = Brchart("--help");
+  CHECK(help.exit == kExitOk);
+  CHECK(help.out.find("--screenshot FILE") != std::string::npos);
+
+  const Run unknown = Brchart("--select");
+  CHECK(unknown.exit == kExitUsage);
+  CHECK(unknown.err.find("unknown option --select") != std::string::npos);
+  CHECK(Brchart("--click 12").exit == kExitUsage);
+
+  const std::wstring picture = TempPath(L"brchart_never.png");
+  const Run missing = Brchart("--scene Z:/nonexistent/chart.json --screenshot \"" + std::string(picture.begin(), picture.end()) + "\"");
+  CHECK(missing.exit == kExitFailed);
+  CHECK(missing.err.find("cannot open the scene Z:/nonexistent/chart.json") != std::string::npos);
+  CHECK(GetFileAttributesW(picture.c_str()) == INVALID_FILE_ATTRIBUTES);
+
+  const Run projection = Brchart("--projection nowhere --screenshot x.png");
+  CHECK(projection.exit == kExitFailed);
+  CHECK(projection.err.find("the scene has no projection nowhere") != std::string::npos);
+
+  const Run unwritable = Brchart("--screenshot Z:/nonexistent/folder/chart.png");
+  CHECK(unwritable.exit == kExitFailed);
+  CHECK_FALSE(unwritable.err.empty());
+}
+
+TEST_CASE("a click picks through the host's hit test, what lies on top first") {
+  Harbour harbour;
+  const auto beacon = harbour.At("fillettes-beacon");
+  const Run run = Brchart("--screenshot Z:/tmp/brchart_pick.png --click " + std::to_string(beacon.x) + "," +
+                          std::to_string(beacon.y) + " --click 5,5");
+  REQUIRE(run.exit == kExitOk);
+  // The beacon and its light (symbols) first, then the track over it, the depth area and the meta objects.
+  const std::size_t first = run.out.find("  fillettes-beacon BCNLAT Fillettes\n");
+  const std::size_t light = run.out.find("  fillettes-light LIGHTS Fillettes light\n");
+  const std::size_t depth = run.out.find("  depth-area DEPARE");
+  const std::size_t quality = run.out.find("  quality M_QUAL");
+  REQUIRE(first != std::string::npos);
+  CHECK(first < light);
+  CHECK(light < depth);
+  CHECK(depth < quality);
+  CHECK(run.out.find("kerviniou-buoy") == std::string::npos);
+  CHECK(run.out.find(": 10 picked\n") != std::string::npos);
+  // The top-left corner lies outside every drawn object: only the chart-wide meta objects.
+  const std::size_t corner = run.out.find("click 5,5 ");
+  REQUIRE(corner != std::string::npos);
+  CHECK(run.out.find(": 6 picked\n", corner) != std::string::npos);
+  CHECK(run.out.find("depth-area", corner) == std::string::npos);
+  CHECK(run.out.find("wrote Z:/tmp/brchart_pick.png (1024x768)") != std::string::npos);
+  // The position of the pixel, from the projection's inverse.
+  CHECK(run.out.find("click 5,5 48\xC2\xB0" "22.559'N 004\xC2\xB0" "36.135'W") != std::string::npos);
+  DeleteFileW(L"Z:/tmp/brchart_pick.png");
+}
+
+TEST_CASE("the picture: the scene's colours at known features, the pick highlighted") {
+  Harbour harbour;
+  const auto beacon = harbour.At("fillettes-beacon");
+  const auto buoy = harbour.At("kerviniou-buoy");
+  const auto lighthouse = harbour.At("portzic-tower");
+  const std::wstring path = TempPath(L"brchart_picture.png");
+  const std::string file(path.begin(), path.end());
+  const Run run = Brchart("--screenshot \"" + file + "\" --click " + std::to_string(beacon.x) + "," +
+                          std::to_string(beacon.y));
+  REQUIRE(run.exit == kExitOk);
+  {
+    Png png(path);
+    REQUIRE(png.Ok());
+    CHECK(png.Width() == 1024);
+    CHECK(png.Height() == 768);
+    // North of the depth area: the sea (chart colour 28, palette "day" index 5).
+    CHECK(Text(png.At(0, 0)) == "#D4EAEE");
+    CHECK(Text(png.At(1023, 40)) == "#D4EAEE");
+    // Inside the 10-20 m depth area (colour 29, index 4).
+    CHECK(Text(png.At(512, 700)) == "#61B7FF");
+    CHECK(Text(png.At(900, 150)) == "#61B7FF");
+    // The buoy's first colour (green), the beacon's (red), a building square (black).
+    CHECK(Text(png.At(buoy.x, buoy.y)) == "#00A000");
+    // (Its light's flare stands on the beacon's centre and leans north-east.)
+    CHECK(Text(png.At(beacon.x - 2, beacon.y + 2)) == "#DC0000");
+    CHECK(Text(png.At(lighthouse.x, lighthouse.y)) == "#000000");
+    // The picked beacon has a red ring 10 pixels out.
+    CHECK(Text(png.At(beacon.x + 10, beacon.y)) == "#FF0000");
+    CHECK(Text(png.At(beacon.x - 10, beacon.y)) == "#FF0000");
+    CHECK(Text(png.At(buoy.x + 10, buoy.y)) != "#FF0000");
+  }
+  DeleteFileW(path.c_str());
+}
