@@ -1,6 +1,5 @@
 #include "host/brchart/ChartPicture.h"
 
-#include <cstdint>
 
 namespace br::brchart {
 
@@ -138,34 +137,6 @@ void ChartPicture::DrawHighlight(HDC dc, const br::brchart::DrawItem& item) cons
   } else {
     Polygon(dc, points.data(), static_cast<int>(points.size()));
   }
-}
-
-std::vector<std::uint32_t> ChartPicture::Pixels() const {
-  std::vector<std::uint32_t> pixels;
-  if (width_ <= 0 || height_ <= 0) return pixels;
-  BITMAPINFO info{};
-  info.bmiHeader.biSize = sizeof(info.bmiHeader);
-  info.bmiHeader.biWidth = width_;
-  info.bmiHeader.biHeight = -height_;  // top-down
-  info.bmiHeader.biPlanes = 1;
-  info.bmiHeader.biBitCount = 32;
-  info.bmiHeader.biCompression = BI_RGB;
-  void* bits = nullptr;
-  HDC screen = GetDC(nullptr);
-  HDC memory = CreateCompatibleDC(screen);
-  ReleaseDC(nullptr, screen);
-  HBITMAP bitmap = CreateDIBSection(memory, &info, DIB_RGB_COLORS, &bits, nullptr, 0);
-  if (memory && bitmap && bits) {
-    HGDIOBJ old = SelectObject(memory, bitmap);
-    Draw(memory);
-    GdiFlush();
-    const auto* from = static_cast<const std::uint32_t*>(bits);
-    pixels.assign(from, from + static_cast<std::size_t>(width_) * static_cast<std::size_t>(height_));
-    SelectObject(memory, old);
-  }
-  if (bitmap) DeleteObject(bitmap);
-  if (memory) DeleteDC(memory);
-  return pixels;
 }
 
 }  // namespace br::brchart

@@ -24,8 +24,6 @@ public:
 
   // Draws the whole chart with its top-left corner at the DC's origin.
   void Draw(HDC dc) const;
-  // The chart as 32-bit pixels (blue, green, red, unused), rows top-down.
-  std::vector<std::uint32_t> Pixels() const;
 
 private:
   void DrawItem(HDC dc, const br::brchart::DrawItem& item) const;

@@ -1,11 +1,16 @@
-// brchart's window: the chart at its projection's pixel size and a status line under it
-// with the position under the pointer and what the last click picked.
+// brchart's window: the chart at its projection's pixel size, the depth-shading panel
+// beside it (BR_Info's XContoursView with the scene's presentation parameters, colour map
+// and palette, hosted by ATL's control host window), and a status line under both with
+// the position under the pointer and what the last click picked.
 #pragma once
 
 #include <windows.h>
 
+#include <cstdint>
 #include <string>
+#include <vector>
 
+#include "BR_Info.h"
 #include "host/brchart/ChartSession.h"
 
 namespace br::brchart {
@@ -13,13 +18,22 @@ namespace br::brchart {
 class ChartWindow {
 public:
   static constexpr int kStatusHeight = 22;
+  static constexpr int kPanelWidth = 110;
+  static constexpr int kPanelTitleHeight = 20;
 
   explicit ChartWindow(ChartSession& session);
   ~ChartWindow();
   ChartWindow(const ChartWindow&) = delete;
   ChartWindow& operator=(const ChartWindow&) = delete;
 
+  // Makes the window (hidden) and its panel. A depth panel that cannot be made is noted
+  // in the status line, not a failure: the chart is still drawn.
   bool Create(std::string& error);
+  // Draws the whole client area (chart, panel, status line) into a DC, as it looks.
+  void DrawInto(HDC dc);
+  // The client area as 32-bit pixels (blue, green, red, unused), rows top-down.
+  std::vector<std::uint32_t> Pixels(int& width, int& height);
+  bool HasDepthPanel() const { return contours_ != nullptr; }
   HWND Handle() const { return window_; }
   // Picks at a chart pixel, as a click there does.
   void PickAt(long x, long y);
@@ -34,10 +48,15 @@ private:
   void Paint();
   void ShowStatus(const std::string& position);
   void LayOut();
+  SIZE ContentSize() const;  // chart and panel, status line under them
+  bool MakeDepthPanel(std::string& error);
 
   ChartSession& session_;
   HWND window_ = nullptr;
   HWND statusLine_ = nullptr;
+  HWND panelTitle_ = nullptr;
+  HWND contoursHost_ = nullptr;
+  IXContoursView* contours_ = nullptr;
   HFONT font_ = nullptr;
   std::string status_;
   std::string picked_;

@@ -7,7 +7,8 @@ namespace br::brchart {
 namespace {
 
 // Dispatch ids of IChartScene.
-constexpr DISPID kLoad = 1, kLastError = 2, kObject = 5, kProjection = 6;
+constexpr DISPID kLoad = 1, kLastError = 2, kObject = 5, kProjection = 6, kPresParams = 7, kColorMap = 8,
+                 kPalette = 9;
 
 std::wstring Wide(const std::string& text) {
   const int n = MultiByteToWideChar(CP_ACP, 0, text.c_str(), -1, nullptr, 0);
@@ -113,6 +114,26 @@ IGeoObject* SceneClient::Object(const std::string& name) {
   found->QueryInterface(IID_IGeoObject, reinterpret_cast<void**>(&object));
   found->Release();
   return object;
+}
+
+IUnknown* SceneClient::PresParams(const std::string& name) { return scene_ ? Named(kPresParams, name) : nullptr; }
+
+IUnknown* SceneClient::ColorMap(const std::string& name) { return scene_ ? Named(kColorMap, name) : nullptr; }
+
+long SceneClient::Palette(const std::string& name) {
+  if (!scene_) return 0;
+  VARIANT argument;
+  VariantInit(&argument);
+  argument.vt = VT_BSTR;
+  argument.bstrVal = SysAllocString(Wide(name).c_str());
+  VARIANT result;
+  VariantInit(&result);
+  const HRESULT hr = Call(kPalette, DISPATCH_METHOD, &argument, 1, &result);
+  VariantClear(&argument);
+  long handle = 0;
+  if (SUCCEEDED(hr) && SUCCEEDED(VariantChangeType(&result, &result, 0, VT_I4))) handle = result.lVal;
+  VariantClear(&result);
+  return handle;
 }
 
 std::vector<std::string> SceneClient::HitTest(const std::vector<std::string>& candidates, const RECT& pixels) {

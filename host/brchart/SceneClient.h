@@ -30,6 +30,11 @@ public:
   std::vector<std::string> HitTest(const std::vector<std::string>& candidates, const RECT& pixels);
   // The host's object of that scene name (one reference for the caller), or null.
   IGeoObject* Object(const std::string& name);
+  // Display components by scene name (one reference for the caller), or null.
+  IUnknown* PresParams(const std::string& name);
+  IUnknown* ColorMap(const std::string& name);
+  // The logical palette handle the host keeps for that palette, or 0.
+  long Palette(const std::string& name);
 
 private:
   HRESULT Call(DISPID id, WORD flags, VARIANT* arguments, UINT count, VARIANT* result);

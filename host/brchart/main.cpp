@@ -68,25 +68,28 @@ int Run(const ChartOptions& options) {
   const bool hostOpen = session.Host().Open(scenePath, session.Display().projection->name, error);
   if (!hostOpen && !options.clicks.empty()) return Fail(error);
 
+  ChartWindow window(session);
+  if (!window.Create(error)) return Fail(error);
+  if (!hostOpen) window.SetNote("no picking: " + error);
+  for (const ChartClick& click : options.clicks) {
+    if (options.screenshot.empty()) window.PickAt(click.x, click.y);
+    else PrintPicks(session, click);
+  }
   if (!options.screenshot.empty()) {
-    for (const ChartClick& click : options.clicks) PrintPicks(session, click);
-    const std::vector<std::uint32_t> pixels = session.Picture().Pixels();
+    // The window as it would look, never shown: chart, depth panel and status line.
+    if (!options.clicks.empty()) window.PickAt(options.clicks.back().x, options.clicks.back().y);
+    int width = 0, height = 0;
+    const std::vector<std::uint32_t> pixels = window.Pixels(width, height);
     if (pixels.empty()) return Fail("the chart cannot be drawn");
-    const int width = static_cast<int>(session.Picture().Width());
-    const int height = static_cast<int>(session.Picture().Height());
     std::wstring path(options.screenshot.size(), L'\0');
     path.resize(static_cast<std::size_t>(MultiByteToWideChar(CP_ACP, 0, options.screenshot.c_str(),
                                                             static_cast<int>(options.screenshot.size()), &path[0],
                                                             static_cast<int>(path.size()))));
     if (!br::brtide::WritePngFile(path, pixels.data(), width, height, error)) return Fail(error);
     std::printf("wrote %s (%dx%d)\n", options.screenshot.c_str(), width, height);
+    std::printf("status: %s\n", window.Status().c_str());
     return kExitOk;
   }
-
-  ChartWindow window(session);
-  if (!window.Create(error)) return Fail(error);
-  if (!hostOpen) window.SetNote("no picking: " + error);
-  for (const ChartClick& click : options.clicks) window.PickAt(click.x, click.y);
   ShowWindow(window.Handle(), SW_SHOWDEFAULT);
   UpdateWindow(window.Handle());
   MSG message;

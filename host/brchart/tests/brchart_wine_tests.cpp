@@ -180,7 +180,7 @@ TEST_CASE("a click picks through the host's hit test, what lies on top first") {
   REQUIRE(corner != std::string::npos);
   CHECK(run.out.find(": 6 picked\n", corner) != std::string::npos);
   CHECK(run.out.find("depth-area", corner) == std::string::npos);
-  CHECK(run.out.find("wrote Z:/tmp/brchart_pick.png (1024x768)") != std::string::npos);
+  CHECK(run.out.find("wrote Z:/tmp/brchart_pick.png (1134x790)") != std::string::npos);
   // The position of the pixel, from the projection's inverse.
   CHECK(run.out.find("click 5,5 48\xC2\xB0" "22.559'N 004\xC2\xB0" "36.135'W") != std::string::npos);
   DeleteFileW(L"Z:/tmp/brchart_pick.png");
@@ -199,8 +199,9 @@ TEST_CASE("the picture: the scene's colours at known features, the pick highligh
   {
     Png png(path);
     REQUIRE(png.Ok());
-    CHECK(png.Width() == 1024);
-    CHECK(png.Height() == 768);
+    // The chart at its projection's size, the depth panel beside it, the status line under both.
+    CHECK(png.Width() == 1024 + 110);
+    CHECK(png.Height() == 768 + 22);
     // North of the depth area: the sea (chart colour 28, palette "day" index 5).
     CHECK(Text(png.At(0, 0)) == "#D4EAEE");
     CHECK(Text(png.At(1023, 40)) == "#D4EAEE");
@@ -216,6 +217,14 @@ TEST_CASE("the picture: the scene's colours at known features, the pick highligh
     CHECK(Text(png.At(beacon.x + 10, beacon.y)) == "#FF0000");
     CHECK(Text(png.At(beacon.x - 10, beacon.y)) == "#FF0000");
     CHECK(Text(png.At(buoy.x + 10, buoy.y)) != "#FF0000");
+    // The depth panel (BR_Info's contours view) in the same palette: the shallowest band
+    // (colour 21, index 1) at the top, the deep water (28, index 5) at the bottom.
+    CHECK(Text(png.At(1024 + 55, 60)) == "#C9EDFC");
+    CHECK(Text(png.At(1024 + 55, 700)) == "#D4EAEE");
   }
+  // The status line names the position of the click and what it picked; no panel note.
+  CHECK(run.out.find("status: 48\xC2\xB0") != std::string::npos);
+  CHECK(run.out.find("10 objects: Fillettes (BCNLAT), Fillettes light (LIGHTS)") != std::string::npos);
+  CHECK(run.out.find("no depth panel") == std::string::npos);
   DeleteFileW(path.c_str());
 }
