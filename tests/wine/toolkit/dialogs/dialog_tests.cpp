@@ -8,14 +8,14 @@
 #include <vector>
 
 #include "tests/wine/common/widget_test_support.h"
-#include "tests/wine/toolkit/dialogs/dialog_driver.h"
+#include "tests/wine/toolkit/dialogs/DialogDriver.h"
 #include "toolkit/core/Panel.h"
 #include "toolkit/dialogs/ModalDialog.h"
 #include "toolkit/widgets/Label.h"
 
 using namespace toolkit;
-using dtest::DialogDriver;
-using dtest::ShownDialog;
+using br::test::DialogDriver;
+using br::test::ShownDialog;
 using Labels = std::vector<std::string>;
 
 namespace {

@@ -12,7 +12,7 @@
 #include "toolkit/core/Container.h"
 #include "toolkit/widgets/Button.h"
 
-namespace dtest {
+namespace br::test {
 
 // What a step sees of a box on the screen.
 struct ShownDialog {
@@ -55,4 +55,4 @@ private:
   DialogDriver* previous_ = nullptr;
 };
 
-}  // namespace dtest
+}  // namespace br::test

@@ -1,4 +1,4 @@
-#include "tests/wine/toolkit/dialogs/dialog_driver.h"
+#include "tests/wine/toolkit/dialogs/DialogDriver.h"
 
 #include <algorithm>
 
@@ -7,7 +7,7 @@
 #include "toolkit/core/ToolkitWindows.h"
 #include "toolkit/dialogs/ModalDialog.h"
 
-namespace dtest {
+namespace br::test {
 
 namespace {
 
@@ -118,4 +118,4 @@ void DialogDriver::look() {
   }
 }
 
-}  // namespace dtest
+}  // namespace br::test
