@@ -55,6 +55,16 @@ std::vector<std::size_t> ChartSession::Pick(long x, long y) {
   return picked_;
 }
 
+bool ChartSession::Select(const std::string& name) {
+  for (std::size_t i = 0; i < scene_.objects.size(); ++i) {
+    if (scene_.objects[i].name != name) continue;
+    picked_.assign(1, i);
+    picture_.SetHighlighted({i});
+    return true;
+  }
+  return false;
+}
+
 std::string ChartSession::PositionAt(long x, long y) const {
   chartscene::GeoPosition at;
   if (!display_.projection || !PixelToPosition(*display_.projection, x + 0.0, y + 0.0, at)) return "";

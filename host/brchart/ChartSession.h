@@ -31,6 +31,9 @@ public:
   // lines, then areas and the objects the chart does not draw); they become the highlighted ones.
   std::vector<std::size_t> Pick(long x, long y);
   const std::vector<std::size_t>& Picked() const { return picked_; }
+  // Selects the object of that scene name alone, as a pick of it would; false when the
+  // scene has no such object.
+  bool Select(const std::string& name);
   // "48°20.418'N 004°36.990'W" of a chart pixel (UTF-8), "" outside the projection's scale.
   std::string PositionAt(long x, long y) const;
   // "3 objects: Fillettes (BCNLAT), ..." of the last pick (UTF-8).

@@ -2,6 +2,8 @@
 
 #include <windowsx.h>
 
+#include "host/brchart/chart_position.h"
+
 namespace br::brchart {
 
 namespace {
@@ -219,6 +221,16 @@ void ChartWindow::PickAt(long x, long y) {
   picked_ = session_.PickedText();
   ShowStatus(session_.PositionAt(x, y));
   InvalidateRect(window_, nullptr, FALSE);
+}
+
+bool ChartWindow::SelectNamed(const std::string& name) {
+  if (!session_.Select(name)) return false;
+  picked_ = "selected: " + session_.PickedText().substr(session_.PickedText().find(": ") + 2);
+  const auto& shape = session_.Scene().objects[session_.Picked().front()].geometry;
+  chartscene::GeoPosition at = shape.empty() ? chartscene::GeoPosition{} : shape.front();
+  ShowStatus(shape.empty() ? std::string() : PositionText(at));
+  InvalidateRect(window_, nullptr, FALSE);
+  return true;
 }
 
 void ChartWindow::Paint() {

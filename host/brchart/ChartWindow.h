@@ -37,6 +37,8 @@ public:
   HWND Handle() const { return window_; }
   // Picks at a chart pixel, as a click there does.
   void PickAt(long x, long y);
+  // Selects one object by scene name; false when there is none.
+  bool SelectNamed(const std::string& name);
   // The status line's text (UTF-8).
   const std::string& Status() const { return status_; }
   // A note shown at the end of the status line (e.g. why picking is unavailable).

@@ -54,6 +54,8 @@ bool ParseChartOptions(const std::vector<std::string>& arguments, ChartOptions& 
       if (!value(options.colorMap)) return false;
     } else if (name == "--presparams") {
       if (!value(options.presParams)) return false;
+    } else if (name == "--select") {
+      if (!value(options.select)) return false;
     } else if (name == "--catalogue") {
       if (!value(options.catalogue)) return false;
     } else if (name == "--click") {
@@ -86,6 +88,7 @@ void WriteChartUsage(std::ostream& out) {
          "  --presparams NAME   the presentation parameters: depth contours (default: the first)\n"
          "  --catalogue DIR     the folder of gdal-data's S-57 files (default: s57 beside the program)\n"
          "  --click X,Y         pick the objects at that pixel, as a click does; repeatable\n"
+         "  --select NAME       select the object of that scene name (after any clicks)\n"
          "  --screenshot FILE   write the chart as PNG and exit, without showing a window;\n"
          "                      the picked objects are printed, one line each\n"
          "  --help              this text\n"

@@ -21,6 +21,7 @@ struct ChartOptions {
   std::string presParams;  // "" = the scene's first
   std::string catalogue;   // folder of the S-57 files ("" = looked for)
   std::vector<ChartClick> clicks;  // --click X,Y: pick there, as a click does
+  std::string select;      // an object (by its scene name) to select, as after a pick
   std::string screenshot;  // "" = interactive
   bool help = false;
 };

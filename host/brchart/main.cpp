@@ -75,9 +75,17 @@ int Run(const ChartOptions& options) {
     if (options.screenshot.empty()) window.PickAt(click.x, click.y);
     else PrintPicks(session, click);
   }
+  if (!options.screenshot.empty() && !options.clicks.empty())
+    window.PickAt(options.clicks.back().x, options.clicks.back().y);
+  if (!options.select.empty()) {
+    if (!window.SelectNamed(options.select)) return Fail("the scene has no object " + options.select);
+    if (!options.screenshot.empty())
+      std::printf("selected %s %s %s\n", options.select.c_str(),
+                  AcronymOf(session.Scene(), session.Picked().front()).c_str(),
+                  LabelOf(session.Scene(), session.Picked().front()).c_str());
+  }
   if (!options.screenshot.empty()) {
     // The window as it would look, never shown: chart, depth panel and status line.
-    if (!options.clicks.empty()) window.PickAt(options.clicks.back().x, options.clicks.back().y);
     int width = 0, height = 0;
     const std::vector<std::uint32_t> pixels = window.Pixels(width, height);
     if (pixels.empty()) return Fail("the chart cannot be drawn");

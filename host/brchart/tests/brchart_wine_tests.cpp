@@ -138,9 +138,15 @@ TEST_CASE("brchart's exit codes: usage, wrong command lines, scenes it cannot us
   CHECK(help.exit == kExitOk);
   CHECK(help.out.find("--screenshot FILE") != std::string::npos);
 
-  const Run unknown = Brchart("--select");
+  const Run unknown = Brchart("--selected x");
   CHECK(unknown.exit == kExitUsage);
-  CHECK(unknown.err.find("unknown option --select") != std::string::npos);
+  CHECK(unknown.err.find("unknown option --selected") != std::string::npos);
+  CHECK(Brchart("--select").exit == kExitUsage);
+
+  const Run nobody = Brchart("--select nobody --screenshot Z:/tmp/brchart_nobody.png");
+  CHECK(nobody.exit == kExitFailed);
+  CHECK(nobody.err.find("the scene has no object nobody") != std::string::npos);
+  CHECK(GetFileAttributesW(L"Z:/tmp/brchart_nobody.png") == INVALID_FILE_ATTRIBUTES);
   CHECK(Brchart("--click 12").exit == kExitUsage);
 
   const std::wstring picture = TempPath(L"brchart_never.png");
@@ -226,5 +232,28 @@ TEST_CASE("the picture: the scene's colours at known features, the pick highligh
   CHECK(run.out.find("status: 48\xC2\xB0") != std::string::npos);
   CHECK(run.out.find("10 objects: Fillettes (BCNLAT), Fillettes light (LIGHTS)") != std::string::npos);
   CHECK(run.out.find("no depth panel") == std::string::npos);
+  DeleteFileW(path.c_str());
+}
+
+TEST_CASE("--select rings one object by name and names it in the status line") {
+  Harbour harbour;
+  const auto buoy = harbour.At("kerviniou-buoy");
+  const auto beacon = harbour.At("fillettes-beacon");
+  const std::wstring path = TempPath(L"brchart_select.png");
+  const std::string file(path.begin(), path.end());
+  // A click first, then the selection: the selection wins.
+  const Run run = Brchart("--click " + std::to_string(beacon.x) + "," + std::to_string(beacon.y) +
+                          " --select kerviniou-buoy --screenshot \"" + file + "\"");
+  REQUIRE(run.exit == kExitOk);
+  CHECK(run.out.find("selected kerviniou-buoy BOYLAT Kerviniou\n") != std::string::npos);
+  CHECK(run.out.find("status: 48\xC2\xB0" "20.520'N 004\xC2\xB0" "35.880'W   selected: Kerviniou (BOYLAT)") !=
+        std::string::npos);
+  {
+    Png png(path);
+    REQUIRE(png.Ok());
+    CHECK(Text(png.At(buoy.x + 10, buoy.y)) == "#FF0000");
+    CHECK(Text(png.At(buoy.x, buoy.y)) == "#00A000");
+    CHECK(Text(png.At(beacon.x + 10, beacon.y)) != "#FF0000");  // the click's pick is replaced
+  }
   DeleteFileW(path.c_str());
 }
