@@ -11,6 +11,7 @@
 #include "tests/wine/toolkit/dialogs/DialogDriver.h"
 #include "toolkit/core/Panel.h"
 #include "toolkit/dialogs/ModalDialog.h"
+#include "toolkit/widgets/Button.h"
 #include "toolkit/widgets/Label.h"
 
 using namespace toolkit;
@@ -319,4 +320,53 @@ TEST_CASE("a component without a window answers -1 at once") {
   CHECK(result == "kept");
   wtest::pump(30);
   CHECK(driver.shown() == 0);
+}
+
+namespace {
+
+// A control's panel that asks from its own button's action, inside the toolkit's window
+// procedure: the box's components are let go while toolkit calls are still on the stack.
+class AskingPanel : public Panel {
+public:
+  Button ask{"Rename"};
+  std::string name = "Le Minou";
+  int answer = 0;
+  AskingPanel() { add(&ask, "ASK"); }
+  int onAction(ToolkitEvent& event) override {
+    if (event.source != &ask) return 0;
+    answer = inputBox("New name", name, 1);
+    return 1;
+  }
+};
+
+}  // namespace
+
+TEST_CASE("a box asked from a button's action, inside the toolkit's window procedure") {
+  wtest::HostWindow host;
+  AskingPanel panel;
+  REQUIRE(panel.create(host.hwnd()));
+  panel.setBounds(0, 0, 300, 200, true, true);
+  panel.doLayout();
+  panel.ask.setBounds(10, 10, 80, 24, true, true);
+  int boxes = 0;
+  DialogDriver driver({[&](ShownDialog& d) {
+                         ++boxes;
+                         SetWindowTextA(d.edit, "Phare du Minou");
+                         d.click("OK");
+                       },
+                       [&](ShownDialog& d) {
+                         ++boxes;
+                         d.click("CANCEL");
+                       }});
+  wtest::press(panel.ask.getHandle(), WM_LBUTTONDOWN, 3, 3, MK_LBUTTON);
+  wtest::press(panel.ask.getHandle(), WM_LBUTTONUP, 3, 3, 0);
+  CHECK(panel.answer == IDYES);
+  CHECK(panel.name == "Phare du Minou");
+  // Again, once the first box's parts have gone: a fresh box, and Cancel keeps the name.
+  wtest::press(panel.ask.getHandle(), WM_LBUTTONDOWN, 3, 3, MK_LBUTTON);
+  wtest::press(panel.ask.getHandle(), WM_LBUTTONUP, 3, 3, 0);
+  CHECK(panel.answer == IDCANCEL);
+  CHECK(panel.name == "Phare du Minou");
+  CHECK(boxes == 2);
+  CHECK(IsWindowEnabled(host.hwnd()));  // the owner has its input back
 }
