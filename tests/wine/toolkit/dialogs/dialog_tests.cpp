@@ -231,6 +231,10 @@ TEST_CASE("the input box: prompt, padded labels, typed text copied on OK") {
     CHECK(prompt == "Station name?");
     CHECK(result == (c.copies ? "Pilot station" : "before"));
   }
+}
+
+TEST_CASE("the input box reads its field whole, or empty") {
+  Owner owner;
   SUBCASE("an empty field gives an empty text") {
     std::string result = "before";
     DialogDriver driver({[](ShownDialog& d) { d.click("OK"); }});
