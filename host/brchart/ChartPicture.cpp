@@ -1,5 +1,9 @@
 #include "host/brchart/ChartPicture.h"
 
+#include <map>
+#include <string>
+#include <utility>
+
 
 namespace br::brchart {
 
@@ -51,6 +55,7 @@ void ChartPicture::Draw(HDC dc) const {
   DeleteObject(sea);
   const int savedMode = SetBkMode(dc, TRANSPARENT);
   for (const auto& item : items_) DrawItem(dc, item);
+  DrawLabels(dc);
   for (const auto& item : items_)
     if (highlighted_.count(item.object)) DrawHighlight(dc, item);
   SetBkMode(dc, savedMode);
@@ -123,6 +128,30 @@ void ChartPicture::DrawItem(HDC dc, const br::brchart::DrawItem& item) const {
     case Mark::None:
       break;
   }
+}
+
+void ChartPicture::DrawLabels(HDC dc) const {
+  HFONT font = CreateFontW(-11, 0, 0, 0, FW_NORMAL, FALSE, FALSE, FALSE, DEFAULT_CHARSET, OUT_DEFAULT_PRECIS,
+                           CLIP_DEFAULT_PRECIS, DEFAULT_QUALITY, VARIABLE_PITCH | FF_SWISS, L"Arial");
+  const HGDIOBJ old = font ? SelectObject(dc, font) : nullptr;
+  const COLORREF oldColour = SetTextColor(dc, RGB(0, 0, 0));
+  std::map<std::pair<long, long>, int> placed;
+  for (const auto& item : items_) {
+    if (item.label.empty() || item.shape.empty()) continue;
+    // Names are UTF-8: a harbour named in any script is written as it is.
+    const int n = MultiByteToWideChar(CP_UTF8, 0, item.label.data(), static_cast<int>(item.label.size()), nullptr, 0);
+    std::wstring text(static_cast<std::size_t>(n > 0 ? n : 0), L'\0');
+    if (n > 0)
+      MultiByteToWideChar(CP_UTF8, 0, item.label.data(), static_cast<int>(item.label.size()), &text[0], n);
+    const auto& p = item.shape.front();
+    // Objects on one spot (a beacon and its light) write their names one under the other.
+    const int line = placed[{p.x, p.y}]++;
+    TextOutW(dc, static_cast<int>(p.x) + item.style.width + 4, static_cast<int>(p.y) + 2 + line * 12, text.c_str(),
+             static_cast<int>(text.size()));
+  }
+  SetTextColor(dc, oldColour);
+  if (old) SelectObject(dc, old);
+  if (font) DeleteObject(font);
 }
 
 void ChartPicture::DrawHighlight(HDC dc, const br::brchart::DrawItem& item) const {

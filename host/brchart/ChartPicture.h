@@ -1,5 +1,5 @@
 // Strokes and fills a chart plan into a device context: the sea, depth and land fills,
-// outlines, lines and point symbols, and a red ring around the objects picked.
+// outlines, lines and point symbols with their names, and a red ring around the objects picked.
 #pragma once
 
 #include <windows.h>
@@ -28,6 +28,7 @@ public:
 private:
   void DrawItem(HDC dc, const br::brchart::DrawItem& item) const;
   void DrawHighlight(HDC dc, const br::brchart::DrawItem& item) const;
+  void DrawLabels(HDC dc) const;
 
   std::vector<br::brchart::DrawItem> items_;
   Rgb background_;

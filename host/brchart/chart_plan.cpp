@@ -87,6 +87,10 @@ std::vector<DrawItem> PlanChart(const SceneModel& scene, const ChartDisplay& dis
           item.style.symbol == Symbol::Circle)
         item.colour = S57Colour(colour->list.front());
     }
+    if (item.style.mark == Mark::Symbol) {
+      const chartscene::TypedValue* name = AttributeValue(scene, i, "OBJNAM");
+      if (name && name->type == chartscene::TypedValue::Type::Text) item.label = name->text;
+    }
     for (const auto& p : object.geometry) item.shape.push_back(chartscene::ProjectToPixel(*display.projection, p.lat, p.lon));
     items.push_back(std::move(item));
   }

@@ -34,6 +34,7 @@ struct DrawItem {
   ClassStyle style;
   Rgb colour;
   std::vector<chartscene::PixelPoint> shape;
+  std::string label;  // a point symbol's name (OBJNAM, UTF-8) written beside it; "" for none
 };
 
 // Every drawable object, fills first, then outlines, lines and symbols; within a layer in

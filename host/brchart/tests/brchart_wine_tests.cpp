@@ -51,7 +51,11 @@ HANDLE Inheritable(const std::wstring& path) {
 }
 
 Run Brchart(const std::string& arguments) {
-  const std::wstring outPath = TempPath(L"brchart_test_out.txt"), errPath = TempPath(L"brchart_test_err.txt");
+  // Files of their own per run: a child that is slow to let go of its handles never
+  // stands in the next run's way.
+  static int runs = 0;
+  const std::wstring stem = L"brchart_test_" + std::to_wstring(GetCurrentProcessId()) + L"_" + std::to_wstring(++runs);
+  const std::wstring outPath = TempPath((stem + L"_out.txt").c_str()), errPath = TempPath((stem + L"_err.txt").c_str());
   HANDLE out = Inheritable(outPath), err = Inheritable(errPath);
   REQUIRE(out != INVALID_HANDLE_VALUE);
   REQUIRE(err != INVALID_HANDLE_VALUE);

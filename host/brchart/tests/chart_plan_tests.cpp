@@ -178,6 +178,11 @@ TEST_CASE("the chart plan: what is drawn, how, and in which order") {
   CHECK(beacon->colour == Rgb{220, 0, 0});     // COLOUR [3, 1, 3]: red
   CHECK(ItemOf(items, scene, "kerviniou-buoy")->colour == Rgb{0, 160, 0});  // [4]: green
   CHECK(ItemOf(items, scene, "minou-light-white")->style.symbol == Symbol::Flare);
+  // Named symbols carry their names to be written beside them; areas and unnamed points do not.
+  CHECK(beacon->label == "Fillettes");
+  CHECK(ItemOf(items, scene, "harbour-entry")->label == "Entr\xC3\xA9" "e du port");
+  CHECK(ItemOf(items, scene, "dolphin")->label.empty());
+  CHECK(ItemOf(items, scene, "anchorage")->label.empty());
   CHECK(beacon->shape[0].x == 378);  // (-4.5712 + 4.56) * 12000 + 512, rounded
   CHECK(beacon->shape[0].y > 384);   // south of the centre
 }
