@@ -48,6 +48,11 @@ std::wstring FromUtf8(const std::string& text) {
 
 ChartWindow::ChartWindow(ChartSession& session) : session_(session) {}
 
+bool ChartWindow::PositionOfPixel(long x, long y, chartscene::GeoPosition& at) const {
+  const auto* projection = session_.Display().projection;
+  return projection && PixelToPosition(*projection, x + 0.0, y + 0.0, at);
+}
+
 ChartWindow::~ChartWindow() {
   if (contours_) contours_->Release();
   if (window_ && IsWindow(window_)) DestroyWindow(window_);
@@ -87,8 +92,10 @@ bool ChartWindow::Create(std::string& error) {
   if (statusLine_ && font_) SendMessageW(statusLine_, WM_SETFONT, reinterpret_cast<WPARAM>(font_), FALSE);
   std::string why;
   if (!MakeDepthPanel(why)) note_ = why;
+  if (session_.Host().IsOpen() && !legend_.Open(session_.Host(), ChartDataSetId(session_.Scene()), why))
+    note_ += (note_.empty() ? "" : "; ") + why;
   LayOut();
-  ShowStatus(session_.PositionAt(session_.Picture().Width() / 2, session_.Picture().Height() / 2));
+  ShowStatusAt(nullptr);
   return true;
 }
 
@@ -206,11 +213,13 @@ std::vector<std::uint32_t> ChartWindow::Pixels(int& width, int& height) {
 
 void ChartWindow::SetNote(const std::string& note) {
   note_ = note;
-  ShowStatus(session_.PositionAt(session_.Picture().Width() / 2, session_.Picture().Height() / 2));
+  ShowStatusAt(nullptr);
 }
 
-void ChartWindow::ShowStatus(const std::string& position) {
-  status_ = position;
+void ChartWindow::ShowStatusAt(const chartscene::GeoPosition* at) {
+  status_ = at ? PositionText(*at) : "";
+  const std::string legend = at ? legend_.At(at->lat, at->lon) : "";
+  if (!legend.empty()) status_ += "   [" + legend + "]";
   if (!picked_.empty()) status_ += "   " + picked_;
   if (!note_.empty()) status_ += "   (" + note_ + ")";
   if (statusLine_) SetWindowTextW(statusLine_, FromUtf8(status_).c_str());
@@ -219,7 +228,9 @@ void ChartWindow::ShowStatus(const std::string& position) {
 void ChartWindow::PickAt(long x, long y) {
   session_.Pick(x, y);
   picked_ = session_.PickedText();
-  ShowStatus(session_.PositionAt(x, y));
+  chartscene::GeoPosition at;
+  const bool known = PositionOfPixel(x, y, at);
+  ShowStatusAt(known ? &at : nullptr);
   InvalidateRect(window_, nullptr, FALSE);
 }
 
@@ -227,8 +238,7 @@ bool ChartWindow::SelectNamed(const std::string& name) {
   if (!session_.Select(name)) return false;
   picked_ = "selected: " + session_.PickedText().substr(session_.PickedText().find(": ") + 2);
   const auto& shape = session_.Scene().objects[session_.Picked().front()].geometry;
-  chartscene::GeoPosition at = shape.empty() ? chartscene::GeoPosition{} : shape.front();
-  ShowStatus(shape.empty() ? std::string() : PositionText(at));
+  ShowStatusAt(shape.empty() ? nullptr : &shape.front());
   InvalidateRect(window_, nullptr, FALSE);
   return true;
 }
@@ -282,7 +292,8 @@ LRESULT ChartWindow::Handle(UINT message, WPARAM wParam, LPARAM lParam) {
       return 0;
     case WM_MOUSEMOVE: {
       const long x = GET_X_LPARAM(lParam), y = GET_Y_LPARAM(lParam);
-      if (y < session_.Picture().Height()) ShowStatus(session_.PositionAt(x, y));
+      chartscene::GeoPosition at;
+      if (y < session_.Picture().Height() && PositionOfPixel(x, y, at)) ShowStatusAt(&at);
       return 0;
     }
     case WM_LBUTTONDOWN: {

@@ -1,7 +1,8 @@
 // brchart's window: the chart at its projection's pixel size, the depth-shading panel
 // beside it (BR_Info's XContoursView with the scene's presentation parameters, colour map
 // and palette, hosted by ATL's control host window), and a status line under both with
-// the position under the pointer and what the last click picked.
+// the position under the pointer, the chart legend's fields there (BR_Info's XChartLegend)
+// and what the last click picked.
 #pragma once
 
 #include <windows.h>
@@ -12,6 +13,7 @@
 
 #include "BR_Info.h"
 #include "host/brchart/ChartSession.h"
+#include "host/brchart/LegendReader.h"
 
 namespace br::brchart {
 
@@ -48,9 +50,11 @@ private:
   static LRESULT CALLBACK Procedure(HWND window, UINT message, WPARAM wParam, LPARAM lParam);
   LRESULT Handle(UINT message, WPARAM wParam, LPARAM lParam);
   void Paint();
-  void ShowStatus(const std::string& position);
+  // The position, the legend there, the last pick and the note; null: no position.
+  void ShowStatusAt(const chartscene::GeoPosition* at);
   void LayOut();
-  SIZE ContentSize() const;  // chart and panel, status line under them
+  SIZE ContentSize() const;
+  bool PositionOfPixel(long x, long y, chartscene::GeoPosition& at) const;  // chart and panel, status line under them
   bool MakeDepthPanel(std::string& error);
 
   ChartSession& session_;
@@ -59,6 +63,7 @@ private:
   HWND panelTitle_ = nullptr;
   HWND contoursHost_ = nullptr;
   IXContoursView* contours_ = nullptr;
+  LegendReader legend_;
   HFONT font_ = nullptr;
   std::string status_;
   std::string picked_;

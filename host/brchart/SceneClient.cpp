@@ -7,7 +7,7 @@ namespace br::brchart {
 namespace {
 
 // Dispatch ids of IChartScene.
-constexpr DISPID kLoad = 1, kLastError = 2, kObject = 5, kProjection = 6, kPresParams = 7, kColorMap = 8,
+constexpr DISPID kLoad = 1, kLastError = 2, kDataSet = 4, kObject = 5, kProjection = 6, kPresParams = 7, kColorMap = 8,
                  kPalette = 9;
 
 std::wstring Wide(const std::string& text) {
@@ -114,6 +114,14 @@ IGeoObject* SceneClient::Object(const std::string& name) {
   found->QueryInterface(IID_IGeoObject, reinterpret_cast<void**>(&object));
   found->Release();
   return object;
+}
+
+IUnknown* SceneClient::DataSet(const std::string& id) { return scene_ ? Named(kDataSet, id) : nullptr; }
+
+IUnknown* SceneClient::ProjectionObject() {
+  if (!projection_) return nullptr;
+  projection_->AddRef();
+  return projection_;
 }
 
 IUnknown* SceneClient::PresParams(const std::string& name) { return scene_ ? Named(kPresParams, name) : nullptr; }

@@ -30,6 +30,10 @@ public:
   std::vector<std::string> HitTest(const std::vector<std::string>& candidates, const RECT& pixels);
   // The host's object of that scene name (one reference for the caller), or null.
   IGeoObject* Object(const std::string& name);
+  // The dataset of that id (one reference for the caller), or null.
+  IUnknown* DataSet(const std::string& id);
+  // The projection Open took (one reference for the caller), or null.
+  IUnknown* ProjectionObject();
   // Display components by scene name (one reference for the caller), or null.
   IUnknown* PresParams(const std::string& name);
   IUnknown* ColorMap(const std::string& name);

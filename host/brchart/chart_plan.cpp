@@ -99,6 +99,17 @@ std::vector<DrawItem> PlanChart(const SceneModel& scene, const ChartDisplay& dis
   return items;
 }
 
+std::string ChartDataSetId(const SceneModel& scene) {
+  for (const auto& dataSet : scene.dataSets) {
+    if (dataSet.type != chartscene::DataSetType::Vector || dataSet.database >= scene.databases.size()) continue;
+    if (scene.databases[dataSet.database].kind != chartscene::DatabaseKind::Chart) continue;
+    std::string id = dataSet.id;
+    while (!id.empty() && id.back() == '.') id.pop_back();
+    return id;
+  }
+  return "";
+}
+
 Rgb BackgroundColour(const ChartDisplay& display) {
   return ChartColour(display.colorMap, display.palette, kDeepWater, Rgb{255, 255, 255});
 }

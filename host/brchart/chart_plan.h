@@ -41,6 +41,10 @@ struct DrawItem {
 // scene order. Objects of hidden classes are drawn too: hiding is the inspector's rule.
 std::vector<DrawItem> PlanChart(const chartscene::SceneModel& scene, const ChartDisplay& display);
 
+// The id of the dataset the chart shows (its legend's): the first vector dataset of a
+// chart database, without the '.' padding; "" when there is none.
+std::string ChartDataSetId(const chartscene::SceneModel& scene);
+
 // The sea around everything: the deep-water colour.
 Rgb BackgroundColour(const ChartDisplay& display);
 

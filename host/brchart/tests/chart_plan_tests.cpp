@@ -197,6 +197,19 @@ TEST_CASE("labels for people") {
   CHECK(AcronymOf(scene, scene.objects.size()).empty());
 }
 
+TEST_CASE("the chart's dataset: the first vector dataset of a chart database") {
+  CHECK(ChartDataSetId(Harbour()) == "FR5BR010");
+  SceneModel scene = Harbour();
+  // Only the mariner's database left: no chart dataset.
+  scene.databases[0].kind = br::chartscene::DatabaseKind::User;
+  CHECK(ChartDataSetId(scene).empty());
+  // A short id loses its padding.
+  SceneModel padded = Harbour();
+  for (auto& d : padded.dataSets)
+    if (d.id == "FR5BR010") d.id = "BR12....";
+  CHECK(ChartDataSetId(padded) == "BR12");
+}
+
 TEST_CASE("a scene that cannot be read says why") {
   SceneModel scene;
   std::string error;
