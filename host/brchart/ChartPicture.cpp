@@ -50,6 +50,9 @@ ChartPicture::ChartPicture(std::vector<br::brchart::DrawItem> items, Rgb backgro
 
 void ChartPicture::Draw(HDC dc) const {
   const RECT all{0, 0, width_, height_};
+  // Shapes reach past the chart's edges: nothing of them lands beside it.
+  const int saved = SaveDC(dc);
+  IntersectClipRect(dc, 0, 0, width_, height_);
   HBRUSH sea = CreateSolidBrush(Ref(background_));
   FillRect(dc, &all, sea);
   DeleteObject(sea);
@@ -59,6 +62,7 @@ void ChartPicture::Draw(HDC dc) const {
   for (const auto& item : items_)
     if (highlighted_.count(item.object)) DrawHighlight(dc, item);
   SetBkMode(dc, savedMode);
+  RestoreDC(dc, saved);
 }
 
 void ChartPicture::DrawItem(HDC dc, const br::brchart::DrawItem& item) const {

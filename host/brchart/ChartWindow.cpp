@@ -2,6 +2,10 @@
 
 #include <windowsx.h>
 
+#include <cstdint>
+#include <cstring>
+#include <utility>
+
 #include "host/brchart/chart_position.h"
 
 namespace br::brchart {
@@ -46,7 +50,11 @@ std::wstring FromUtf8(const std::string& text) {
 
 }  // namespace
 
-ChartWindow::ChartWindow(ChartSession& session) : session_(session) {}
+ChartWindow::ChartWindow(ChartSession& session)
+    : session_(session),
+      inspectorSink_(DIID__IXObjectInspectorEvents, [this](DISPID id, const DISPPARAMS& params) {
+        if (id == 1) OnInspectorSelection(params);
+      }) {}
 
 bool ChartWindow::PositionOfPixel(long x, long y, chartscene::GeoPosition& at) const {
   const auto* projection = session_.Display().projection;
@@ -54,6 +62,8 @@ bool ChartWindow::PositionOfPixel(long x, long y, chartscene::GeoPosition& at) c
 }
 
 ChartWindow::~ChartWindow() {
+  inspectorSink_.Disconnect();
+  if (inspector_) inspector_->Release();
   if (contours_) contours_->Release();
   if (window_ && IsWindow(window_)) DestroyWindow(window_);
   if (font_) DeleteObject(font_);
@@ -75,7 +85,8 @@ bool ChartWindow::Create(std::string& error) {
     return false;
   }
   const DWORD style = WS_OVERLAPPEDWINDOW;
-  RECT outer{0, 0, session_.Picture().Width() + kPanelWidth, session_.Picture().Height() + kStatusHeight};
+  RECT outer{0, 0, session_.Picture().Width() + kPanelWidth + kInspectorWidth,
+             session_.Picture().Height() + kStatusHeight};
   AdjustWindowRect(&outer, style, FALSE);
   window_ = CreateWindowExW(0, kClassName, L"brchart", style, CW_USEDEFAULT, CW_USEDEFAULT, outer.right - outer.left,
                             outer.bottom - outer.top, nullptr, nullptr, wc.hInstance, this);
@@ -92,6 +103,7 @@ bool ChartWindow::Create(std::string& error) {
   if (statusLine_ && font_) SendMessageW(statusLine_, WM_SETFONT, reinterpret_cast<WPARAM>(font_), FALSE);
   std::string why;
   if (!MakeDepthPanel(why)) note_ = why;
+  if (!MakeInspector(why)) note_ += (note_.empty() ? "" : "; ") + why;
   if (session_.Host().IsOpen() && !legend_.Open(session_.Host(), ChartDataSetId(session_.Scene()), why))
     note_ += (note_.empty() ? "" : "; ") + why;
   LayOut();
@@ -133,7 +145,92 @@ bool ChartWindow::MakeDepthPanel(std::string& error) {
 }
 
 SIZE ChartWindow::ContentSize() const {
-  return SIZE{session_.Picture().Width() + kPanelWidth, session_.Picture().Height() + kStatusHeight};
+  return SIZE{session_.Picture().Width() + kPanelWidth + kInspectorWidth, session_.Picture().Height() + kStatusHeight};
+}
+
+bool ChartWindow::MakeInspector(std::string& error) {
+  if (!StartAtl()) {
+    error = "no inspector: the ATL control host (atl.dll) is not available";
+    return false;
+  }
+  inspectorHost_ = CreateWindowExW(0, L"AtlAxWin", L"BR_Info.XObjectInspector", WS_CHILD | WS_VISIBLE | WS_CLIPCHILDREN,
+                                   0, 0, 0, 0, window_, nullptr, GetModuleHandleW(nullptr), nullptr);
+  if (!inspectorHost_ || FAILED(ControlOf(inspectorHost_, IID_IXObjectInspector, &inspector_))) {
+    error = "no inspector: BR_Info.XObjectInspector cannot be made";
+    return false;
+  }
+  inspectorSink_.Connect(inspector_);
+  return true;
+}
+
+void ChartWindow::Inspect() {
+  if (!inspector_ || !session_.Host().IsOpen()) return;
+  std::string names;
+  for (std::size_t object : session_.Picked()) {
+    if (!names.empty()) names += ",";
+    names += session_.Scene().objects[object].name;
+  }
+  VARIANT records;
+  if (names.empty() || !session_.Host().ObjectRecords(names, records)) {
+    // Nothing picked: an empty tree.
+    VARIANT none;
+    VariantInit(&none);
+    inspector_->SetInfo(none);
+    return;
+  }
+  inspector_->SetInfo(records);
+  VariantClear(&records);
+}
+
+std::size_t ChartWindow::ObjectOfGuid(const std::string& guid) const {
+  const auto& scene = session_.Scene();
+  for (std::size_t i = 0; i < scene.objects.size(); ++i) {
+    const auto identity = chartscene::ObjectIdentity(scene, i);
+    GUID id;
+    static_assert(sizeof(id) == 16, "an identity is 16 bytes");
+    std::memcpy(&id, identity.data(), sizeof(id));
+    wchar_t text[40] = {};
+    StringFromGUID2(id, text, 40);
+    if (lstrcmpiW(text, FromUtf8(guid).c_str()) == 0) return i;
+  }
+  return SIZE_MAX;
+}
+
+void ChartWindow::OnInspectorSelection(const DISPPARAMS& params) {
+  // SelectObject(guid, &owner, double click): the arguments come last first.
+  if (params.cArgs < 1) return;
+  const VARIANT& first = params.rgvarg[params.cArgs - 1];
+  if (first.vt != VT_BSTR) return;
+  const int n = WideCharToMultiByte(CP_UTF8, 0, first.bstrVal, -1, nullptr, 0, nullptr, nullptr);
+  std::string guid(n > 0 ? n - 1 : 0, '\0');
+  if (n > 1) WideCharToMultiByte(CP_UTF8, 0, first.bstrVal, -1, &guid[0], n, nullptr, nullptr);
+  const std::size_t object = ObjectOfGuid(guid);
+  if (object == SIZE_MAX) return;  // the dataset header, or an object off this chart
+  session_.Picture().SetHighlighted({object});
+  inspected_ = "inspected: " + LabelOf(session_.Scene(), object) + " (" + AcronymOf(session_.Scene(), object) + ")";
+  const chartscene::GeoPosition at = lastAt_;
+  ShowStatusAt(hasLastAt_ ? &at : nullptr);
+  InvalidateRect(window_, nullptr, FALSE);
+}
+
+std::string ChartWindow::InspectedGuid() {
+  if (!inspector_) return "";
+  BSTR guid = nullptr;
+  IUnknown* owner = nullptr;
+  std::string out;
+  if (inspector_->GetSelectedObject(&guid, &owner) == S_OK && guid) {
+    const int n = WideCharToMultiByte(CP_UTF8, 0, guid, -1, nullptr, 0, nullptr, nullptr);
+    out.assign(n > 0 ? n - 1 : 0, '\0');
+    if (n > 1) WideCharToMultiByte(CP_UTF8, 0, guid, -1, &out[0], n, nullptr, nullptr);
+  }
+  SysFreeString(guid);
+  if (owner) owner->Release();
+  return out;
+}
+
+std::string ChartWindow::InspectedName() {
+  const std::size_t object = ObjectOfGuid(InspectedGuid());
+  return object == SIZE_MAX ? "" : session_.Scene().objects[object].name;
 }
 
 void ChartWindow::LayOut() {
@@ -143,6 +240,7 @@ void ChartWindow::LayOut() {
   if (panelTitle_) MoveWindow(panelTitle_, chartWidth, 0, kPanelWidth, kPanelTitleHeight, TRUE);
   if (contoursHost_)
     MoveWindow(contoursHost_, chartWidth, kPanelTitleHeight, kPanelWidth, chartHeight - kPanelTitleHeight, TRUE);
+  if (inspectorHost_) MoveWindow(inspectorHost_, chartWidth + kPanelWidth, 0, kInspectorWidth, chartHeight, TRUE);
   if (statusLine_) MoveWindow(statusLine_, 0, chartHeight, content.cx, kStatusHeight, TRUE);
 }
 
@@ -150,6 +248,24 @@ void ChartWindow::DrawInto(HDC dc) {
   const SIZE content = ContentSize();
   const RECT all{0, 0, content.cx, content.cy};
   FillRect(dc, &all, GetSysColorBrush(COLOR_BTNFACE));
+  // The hosted controls picture themselves.
+  const std::pair<HWND, IUnknown*> controls[] = {{contoursHost_, contours_}, {inspectorHost_, inspector_}};
+  for (const auto& [host, control] : controls) {
+    if (!host || !control) continue;
+    RECT r{};
+    GetWindowRect(host, &r);
+    MapWindowPoints(HWND_DESKTOP, window_, reinterpret_cast<POINT*>(&r), 2);
+    IViewObject* view = nullptr;
+    if (SUCCEEDED(control->QueryInterface(IID_IViewObject, reinterpret_cast<void**>(&view)))) {
+      const RECTL bounds{r.left, r.top, r.right, r.bottom};
+      const int saved = SaveDC(dc);
+      view->Draw(DVASPECT_CONTENT, -1, nullptr, nullptr, nullptr, dc, &bounds, nullptr, nullptr, 0);
+      RestoreDC(dc, saved);
+      view->Release();
+    }
+  }
+  // Then what brchart draws itself, over anything a control left beyond its bounds.
+  SelectClipRgn(dc, nullptr);
   session_.Picture().Draw(dc);
   // Children that are drawn by hand: not every system's static controls answer WM_PRINT.
   const HGDIOBJ oldFont = font_ ? SelectObject(dc, font_) : nullptr;
@@ -160,6 +276,7 @@ void ChartWindow::DrawInto(HDC dc) {
     RECT r{};
     GetWindowRect(label, &r);
     MapWindowPoints(HWND_DESKTOP, window_, reinterpret_cast<POINT*>(&r), 2);
+    FillRect(dc, &r, GetSysColorBrush(COLOR_BTNFACE));
     if (label == statusLine_) DrawEdge(dc, &r, BDR_SUNKENOUTER, BF_RECT | BF_ADJUST);
     InflateRect(&r, -3, 0);
     wchar_t text[512] = {};
@@ -167,17 +284,6 @@ void ChartWindow::DrawInto(HDC dc) {
     DrawTextW(dc, text, -1, &r, DT_SINGLELINE | DT_VCENTER | DT_NOPREFIX | (label == panelTitle_ ? DT_CENTER : DT_LEFT));
   }
   if (oldFont) SelectObject(dc, oldFont);
-  if (contoursHost_ && contours_) {
-    RECT r{};
-    GetWindowRect(contoursHost_, &r);
-    MapWindowPoints(HWND_DESKTOP, window_, reinterpret_cast<POINT*>(&r), 2);
-    IViewObject* view = nullptr;
-    if (SUCCEEDED(contours_->QueryInterface(IID_IViewObject, reinterpret_cast<void**>(&view)))) {
-      const RECTL bounds{r.left, r.top, r.right, r.bottom};
-      view->Draw(DVASPECT_CONTENT, -1, nullptr, nullptr, nullptr, dc, &bounds, nullptr, nullptr, 0);
-      view->Release();
-    }
-  }
 }
 
 std::vector<std::uint32_t> ChartWindow::Pixels(int& width, int& height) {
@@ -217,10 +323,13 @@ void ChartWindow::SetNote(const std::string& note) {
 }
 
 void ChartWindow::ShowStatusAt(const chartscene::GeoPosition* at) {
+  hasLastAt_ = at != nullptr;
+  if (at) lastAt_ = *at;
   status_ = at ? PositionText(*at) : "";
   const std::string legend = at ? legend_.At(at->lat, at->lon) : "";
   if (!legend.empty()) status_ += "   [" + legend + "]";
   if (!picked_.empty()) status_ += "   " + picked_;
+  if (!inspected_.empty()) status_ += "   " + inspected_;
   if (!note_.empty()) status_ += "   (" + note_ + ")";
   if (statusLine_) SetWindowTextW(statusLine_, FromUtf8(status_).c_str());
 }
@@ -228,6 +337,8 @@ void ChartWindow::ShowStatusAt(const chartscene::GeoPosition* at) {
 void ChartWindow::PickAt(long x, long y) {
   session_.Pick(x, y);
   picked_ = session_.PickedText();
+  inspected_.clear();
+  Inspect();
   chartscene::GeoPosition at;
   const bool known = PositionOfPixel(x, y, at);
   ShowStatusAt(known ? &at : nullptr);
@@ -237,6 +348,8 @@ void ChartWindow::PickAt(long x, long y) {
 bool ChartWindow::SelectNamed(const std::string& name) {
   if (!session_.Select(name)) return false;
   picked_ = "selected: " + session_.PickedText().substr(session_.PickedText().find(": ") + 2);
+  inspected_.clear();
+  Inspect();
   const auto& shape = session_.Scene().objects[session_.Picked().front()].geometry;
   ShowStatusAt(shape.empty() ? nullptr : &shape.front());
   InvalidateRect(window_, nullptr, FALSE);

@@ -2,7 +2,8 @@
 // beside it (BR_Info's XContoursView with the scene's presentation parameters, colour map
 // and palette, hosted by ATL's control host window), and a status line under both with
 // the position under the pointer, the chart legend's fields there (BR_Info's XChartLegend)
-// and what the last click picked.
+// and what the last click picked; the object inspector (XObjectInspector) at the right
+// shows the picked objects, and the object chosen in it is ringed on the chart.
 #pragma once
 
 #include <windows.h>
@@ -12,6 +13,7 @@
 #include <vector>
 
 #include "BR_Info.h"
+#include "host/brdesk/DispatchSink.h"
 #include "host/brchart/ChartSession.h"
 #include "host/brchart/LegendReader.h"
 
@@ -22,6 +24,7 @@ public:
   static constexpr int kStatusHeight = 22;
   static constexpr int kPanelWidth = 110;
   static constexpr int kPanelTitleHeight = 20;
+  static constexpr int kInspectorWidth = 420;
 
   explicit ChartWindow(ChartSession& session);
   ~ChartWindow();
@@ -36,6 +39,11 @@ public:
   // The client area as 32-bit pixels (blue, green, red, unused), rows top-down.
   std::vector<std::uint32_t> Pixels(int& width, int& height);
   bool HasDepthPanel() const { return contours_ != nullptr; }
+  bool HasInspector() const { return inspector_ != nullptr; }
+  // What the inspector has selected: its GUID text and the scene name of the object ("" for
+  // none or the dataset header).
+  std::string InspectedGuid();
+  std::string InspectedName();
   HWND Handle() const { return window_; }
   // Picks at a chart pixel, as a click there does.
   void PickAt(long x, long y);
@@ -56,6 +64,12 @@ private:
   SIZE ContentSize() const;
   bool PositionOfPixel(long x, long y, chartscene::GeoPosition& at) const;  // chart and panel, status line under them
   bool MakeDepthPanel(std::string& error);
+  bool MakeInspector(std::string& error);
+  // Hands the picked objects' records to the inspector.
+  void Inspect();
+  // The inspector chose an object: it alone is highlighted on the chart.
+  void OnInspectorSelection(const DISPPARAMS& params);
+  std::size_t ObjectOfGuid(const std::string& guid) const;  // SIZE_MAX for none
 
   ChartSession& session_;
   HWND window_ = nullptr;
@@ -64,10 +78,16 @@ private:
   HWND contoursHost_ = nullptr;
   IXContoursView* contours_ = nullptr;
   LegendReader legend_;
+  HWND inspectorHost_ = nullptr;
+  IXObjectInspector* inspector_ = nullptr;
+  br::brdesk::DispatchSink inspectorSink_;
   HFONT font_ = nullptr;
   std::string status_;
   std::string picked_;
   std::string note_;
+  std::string inspected_;
+  chartscene::GeoPosition lastAt_;
+  bool hasLastAt_ = false;
 };
 
 }  // namespace br::brchart

@@ -8,7 +8,7 @@ namespace {
 
 // Dispatch ids of IChartScene.
 constexpr DISPID kLoad = 1, kLastError = 2, kDataSet = 4, kObject = 5, kProjection = 6, kPresParams = 7, kColorMap = 8,
-                 kPalette = 9;
+                 kPalette = 9, kObjectRecords = 10;
 
 std::wstring Wide(const std::string& text) {
   const int n = MultiByteToWideChar(CP_ACP, 0, text.c_str(), -1, nullptr, 0);
@@ -127,6 +127,22 @@ IUnknown* SceneClient::ProjectionObject() {
 IUnknown* SceneClient::PresParams(const std::string& name) { return scene_ ? Named(kPresParams, name) : nullptr; }
 
 IUnknown* SceneClient::ColorMap(const std::string& name) { return scene_ ? Named(kColorMap, name) : nullptr; }
+
+bool SceneClient::ObjectRecords(const std::string& names, VARIANT& records) {
+  VariantInit(&records);
+  if (!scene_) return false;
+  VARIANT argument;
+  VariantInit(&argument);
+  argument.vt = VT_BSTR;
+  argument.bstrVal = SysAllocString(Wide(names).c_str());
+  const HRESULT hr = Call(kObjectRecords, DISPATCH_METHOD, &argument, 1, &records);
+  VariantClear(&argument);
+  if (FAILED(hr) || records.vt != (VT_ARRAY | VT_UI1)) {
+    VariantClear(&records);
+    return false;
+  }
+  return true;
+}
 
 long SceneClient::Palette(const std::string& name) {
   if (!scene_) return 0;

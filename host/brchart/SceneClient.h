@@ -37,6 +37,9 @@ public:
   // Display components by scene name (one reference for the caller), or null.
   IUnknown* PresParams(const std::string& name);
   IUnknown* ColorMap(const std::string& name);
+  // Object records (VT_ARRAY|VT_UI1) of comma-separated scene names, for SetInfo; the
+  // host keeps their owners alive until its next Load. False when it refuses them.
+  bool ObjectRecords(const std::string& names, VARIANT& records);
   // The logical palette handle the host keeps for that palette, or 0.
   long Palette(const std::string& name);
 

@@ -96,6 +96,10 @@ int Run(const ChartOptions& options) {
     if (!br::brtide::WritePngFile(path, pixels.data(), width, height, error)) return Fail(error);
     std::printf("wrote %s (%dx%d)\n", options.screenshot.c_str(), width, height);
     std::printf("status: %s\n", window.Status().c_str());
+    if (window.HasInspector()) {
+      const std::string guid = window.InspectedGuid();
+      std::printf("inspected %s %s\n", guid.empty() ? "nothing" : guid.c_str(), window.InspectedName().c_str());
+    }
     return kExitOk;
   }
   ShowWindow(window.Handle(), SW_SHOWDEFAULT);

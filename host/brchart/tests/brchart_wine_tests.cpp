@@ -190,7 +190,11 @@ TEST_CASE("a click picks through the host's hit test, what lies on top first") {
   REQUIRE(corner != std::string::npos);
   CHECK(run.out.find(": 6 picked\n", corner) != std::string::npos);
   CHECK(run.out.find("depth-area", corner) == std::string::npos);
-  CHECK(run.out.find("wrote Z:/tmp/brchart_pick.png (1134x790)") != std::string::npos);
+  CHECK(run.out.find("wrote Z:/tmp/brchart_pick.png (1554x790)") != std::string::npos);
+  // The picks went to BR_Info's object inspector as records: it shows them under the header of
+  // their dataset (FR5BR010 in the identity's last 8 bytes), which it has selected.
+  CHECK(run.out.find("inspected {00000000-0000-0000-4652-354252303130} \n") != std::string::npos);
+  CHECK(run.out.find("no inspector") == std::string::npos);
   // The position of the pixel, from the projection's inverse.
   CHECK(run.out.find("click 5,5 48\xC2\xB0" "22.559'N 004\xC2\xB0" "36.135'W") != std::string::npos);
   DeleteFileW(L"Z:/tmp/brchart_pick.png");
@@ -210,7 +214,7 @@ TEST_CASE("the picture: the scene's colours at known features, the pick highligh
     Png png(path);
     REQUIRE(png.Ok());
     // The chart at its projection's size, the depth panel beside it, the status line under both.
-    CHECK(png.Width() == 1024 + 110);
+    CHECK(png.Width() == 1024 + 110 + 420);  // and the object inspector
     CHECK(png.Height() == 768 + 22);
     // North of the depth area: the sea (chart colour 28, palette "day" index 5).
     CHECK(Text(png.At(0, 0)) == "#D4EAEE");
