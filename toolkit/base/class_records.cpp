@@ -33,6 +33,7 @@ constexpr ClassRecord cXEditW{"cXEditW", &ContainedWindow};
 constexpr ClassRecord cXTextDescr{"cXTextDescr", &ContainedWindow};
 constexpr ClassRecord cP_SHPanel{"cP_SHPanel", &Container};
 constexpr ClassRecord cLightsViewPanel{"cLightsViewPanel", &Container};
+constexpr ClassRecord cHierarchyPanel{"cHierarchyPanel", &Container};
 constexpr ClassRecord cXPictDescr{"cXPictDescr", &Container};
 constexpr ClassRecord cAttrViewPanel_Tbl{"cAttrViewPanel_Tbl", &cP_SHPanel};
 constexpr ClassRecord cXPictDescr_AXPictDescr{"cXPictDescr::AXPictDescr", &AXComponent};

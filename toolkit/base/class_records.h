@@ -37,6 +37,7 @@ extern const ClassRecord cXEditW;
 extern const ClassRecord cXTextDescr;
 extern const ClassRecord cP_SHPanel;
 extern const ClassRecord cLightsViewPanel;
+extern const ClassRecord cHierarchyPanel;
 extern const ClassRecord cXPictDescr;
 extern const ClassRecord cAttrViewPanel_Tbl;
 extern const ClassRecord cXPictDescr_AXPictDescr;  // cXPictDescr::AXPictDescr
