@@ -87,13 +87,19 @@ private:
       return false;
     }
     path.push_back(object.item.id);
+    // An object related both ways (held and holding) is listed twice: one child.
+    std::vector<HierarchyId> taken;
     for (std::size_t handle : related) {
       std::optional<HierarchyItem> child = source_.Describe(handle);
       if (!child) {
         Fail("a related object cannot be read");
         return false;
       }
-      if (std::find(path.begin(), path.end(), child->id) != path.end()) continue;
+      if (std::find(path.begin(), path.end(), child->id) != path.end() ||
+          std::find(taken.begin(), taken.end(), child->id) != taken.end()) {
+        continue;
+      }
+      taken.push_back(child->id);
       if (child->classCode == kClassHierarchyNode) {
         if (!child->level) {
           Fail("a child node's level cannot be read");

@@ -9,8 +9,8 @@
 //    level rules of hierarchy_values.h; leaves and objects of other classes take none.
 //    Only nodes' levels are read: a child node whose level cannot be read fails the build.
 // Hosts may relate nodes both ways and in circles: an object already on the path from the
-// root is not taken again, the depth stops at kMaxHierarchyDepth and the tree at
-// kMaxHierarchyNodes nodes (the tree is then marked cut).
+// root is not taken again, nor one already among the node's children; the depth stops at
+// kMaxHierarchyDepth and the tree at kMaxHierarchyNodes nodes (the tree is then marked cut).
 
 #include <cstddef>
 #include <optional>

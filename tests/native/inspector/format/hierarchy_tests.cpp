@@ -279,6 +279,7 @@ TEST_CASE("the tree: nodes of one level related in a circle end, each shown once
   host.Hold(chapter, b);
   host.objects[a].related.push_back(b);  // a and b hold each other
   host.objects[b].related.push_back(a);
+  host.objects[b].related.push_back(a);  // listed again, as a member after a holder
   const auto tree = BuildHierarchyTree(host, a);
   REQUIRE(tree);
   CHECK(Shape(*tree) == std::vector<std::string>{"0@0", "1@1", "2@2", "3@3", "3@2", "2@3"});

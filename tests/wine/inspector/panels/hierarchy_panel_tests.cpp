@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "inspector/format/hierarchy_request.h"
+#include "inspector/panels/GeoHierarchySource.h"
 #include "inspector/panels/cHierarchyPanel.h"
 #include "inspector/panels/hierarchy_attributes.h"
 #include "tests/wine/common/SceneProbe.h"
