@@ -54,9 +54,66 @@ public:
     return at;
   }
 
+  // Breadth first, so that a tree cut at the node limit keeps its upper levels whole;
+  // then put in depth-first order for showing.
   bool Build(const Located& root) {
-    std::vector<HierarchyId> path;
-    return Add(root, -1, 0, path);
+    std::vector<HierarchyNode> found{{root.handle, root.item, -1, 0}};
+    std::vector<std::vector<int>> children(1);
+    for (std::size_t at = 0; at < found.size() && !tree.cut; ++at) {
+      const HierarchyNode node = found[at];  // `found` grows below
+      if (node.item.classCode != kClassHierarchyNode || !node.item.level || !TakesLeaves(*node.item.level)) continue;
+      if (node.depth + 1 >= kMaxHierarchyDepth) {
+        tree.cut = true;
+        continue;
+      }
+      std::vector<std::size_t> related;
+      if (!source_.Related(node.handle, related)) {
+        Fail("the related objects cannot be read");
+        return false;
+      }
+      // An object related both ways (held and holding) is listed twice: one child.
+      std::vector<HierarchyId> taken;
+      for (std::size_t handle : related) {
+        std::optional<HierarchyItem> child = source_.Describe(handle);
+        if (!child) {
+          Fail("a related object cannot be read");
+          return false;
+        }
+        if (OnPath(found, static_cast<int>(at), child->id) ||
+            std::find(taken.begin(), taken.end(), child->id) != taken.end()) {
+          continue;
+        }
+        taken.push_back(child->id);
+        if (child->classCode == kClassHierarchyNode) {
+          if (!child->level) {
+            Fail("a child node's level cannot be read");
+            return false;
+          }
+          if (!TakesChildNode(*node.item.level, *child->level)) continue;
+        }
+        if (found.size() >= kMaxHierarchyNodes) {
+          tree.cut = true;
+          break;
+        }
+        children[at].push_back(static_cast<int>(found.size()));
+        found.push_back({handle, *child, static_cast<int>(at), node.depth + 1});
+        children.emplace_back();
+      }
+    }
+    // Depth first: a node, then each child's subtree in the host's order.
+    std::vector<std::pair<int, int>> stack{{0, -1}};  // found index, parent in the tree
+    while (!stack.empty()) {
+      const auto [index, parent] = stack.back();
+      stack.pop_back();
+      HierarchyNode node = found[index];
+      node.parent = parent;
+      const int placed = static_cast<int>(tree.nodes.size());
+      tree.nodes.push_back(node);
+      for (auto child = children[index].rbegin(); child != children[index].rend(); ++child) {
+        stack.push_back({*child, placed});
+      }
+    }
+    return true;
   }
 
   HierarchyTree tree;
@@ -67,50 +124,12 @@ private:
     return std::nullopt;
   }
 
-  bool Add(const Located& object, int parent, int depth, std::vector<HierarchyId>& path) {
-    if (tree.nodes.size() >= kMaxHierarchyNodes) {
-      tree.cut = true;
-      return true;
+  // Whether the identity is the node's own or one of its ancestors'.
+  static bool OnPath(const std::vector<HierarchyNode>& found, int node, const HierarchyId& id) {
+    for (; node >= 0; node = found[node].parent) {
+      if (found[node].item.id == id) return true;
     }
-    const int index = static_cast<int>(tree.nodes.size());
-    tree.nodes.push_back({object.handle, object.item, parent, depth});
-    if (object.item.classCode != kClassHierarchyNode || !object.item.level) return true;
-    const unsigned level = *object.item.level;
-    if (!TakesLeaves(level)) return true;
-    if (depth + 1 >= kMaxHierarchyDepth) {
-      tree.cut = true;
-      return true;
-    }
-    std::vector<std::size_t> related;
-    if (!source_.Related(object.handle, related)) {
-      Fail("the related objects cannot be read");
-      return false;
-    }
-    path.push_back(object.item.id);
-    // An object related both ways (held and holding) is listed twice: one child.
-    std::vector<HierarchyId> taken;
-    for (std::size_t handle : related) {
-      std::optional<HierarchyItem> child = source_.Describe(handle);
-      if (!child) {
-        Fail("a related object cannot be read");
-        return false;
-      }
-      if (std::find(path.begin(), path.end(), child->id) != path.end() ||
-          std::find(taken.begin(), taken.end(), child->id) != taken.end()) {
-        continue;
-      }
-      taken.push_back(child->id);
-      if (child->classCode == kClassHierarchyNode) {
-        if (!child->level) {
-          Fail("a child node's level cannot be read");
-          return false;
-        }
-        if (!TakesChildNode(level, *child->level)) continue;
-      }
-      if (!Add({handle, *child}, index, depth + 1, path)) return false;
-    }
-    path.pop_back();
-    return true;
+    return false;
   }
 
   HierarchySource& source_;
@@ -124,10 +143,12 @@ std::optional<HierarchyTree> BuildHierarchyTree(HierarchySource& source, std::si
   const std::optional<HierarchyItem> first = source.Describe(start);
   const std::optional<Located> root = builder.FindRoot(start);
   if (!root || !builder.Build(*root)) return std::nullopt;
+  // The object's place nearest the root, the first of those in the order shown.
   for (std::size_t i = 0; i < builder.tree.nodes.size() && first; ++i) {
-    if (builder.tree.nodes[i].item.id == first->id) {
+    const HierarchyNode& node = builder.tree.nodes[i];
+    if (node.item.id == first->id &&
+        (builder.tree.start < 0 || node.depth < builder.tree.nodes[builder.tree.start].depth)) {
       builder.tree.start = static_cast<int>(i);
-      break;
     }
   }
   return std::move(builder.tree);

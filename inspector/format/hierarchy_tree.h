@@ -5,12 +5,13 @@
 // 1. The root: a note, diagram or source goes to its first related object, which must be
 //    a node; from a node the walk goes up to the first related node of a higher level
 //    until a node of level 7, or one without a higher related node, is reached.
-// 2. From the root, depth first: a node takes its related objects as children by the
+// 2. From the root, level by level: a node takes its related objects as children by the
 //    level rules of hierarchy_values.h; leaves and objects of other classes take none.
 //    Only nodes' levels are read: a child node whose level cannot be read fails the build.
 // Hosts may relate nodes both ways and in circles: an object already on the path from the
 // root is not taken again, nor one already among the node's children; the depth stops at
-// kMaxHierarchyDepth and the tree at kMaxHierarchyNodes nodes (the tree is then marked cut).
+// kMaxHierarchyDepth and the tree at kMaxHierarchyNodes nodes (the tree is then marked cut;
+// being built level by level, it keeps its upper levels whole).
 
 #include <cstddef>
 #include <optional>
@@ -51,7 +52,7 @@ struct HierarchyNode {
 
 struct HierarchyTree {
   std::vector<HierarchyNode> nodes;  // depth first: the root, then each child's subtree in the host's order
-  int start = -1;                    // the node of the object the tree was built from
+  int start = -1;                    // the object's node nearest the root (the first shown of those)
   bool cut = false;                  // a limit was reached
 };
 

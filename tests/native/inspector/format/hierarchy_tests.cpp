@@ -3,6 +3,7 @@
 // in circles, or not at all.
 #include <doctest/doctest.h>
 
+#include <algorithm>
 #include <cfloat>
 #include <cstdint>
 #include <map>
@@ -302,6 +303,11 @@ TEST_CASE("the tree: nodes of one level related in a circle end, each shown once
   CHECK(big->cut);
   CHECK(big->nodes.size() == kMaxHierarchyNodes);
   CHECK(big->nodes[big->start].handle == ring[3]);
+  CHECK(big->nodes[big->start].depth == 1);  // its place under the top, not deep in a circle
+  // Built level by level: the cut leaves the upper levels whole.
+  CHECK(std::count_if(big->nodes.begin(), big->nodes.end(), [](const HierarchyNode& n) { return n.depth == 1; }) == 12);
+  CHECK(std::count_if(big->nodes.begin(), big->nodes.end(), [](const HierarchyNode& n) { return n.depth == 2; }) ==
+        12 * 11);
   int deepest = 0;
   for (const HierarchyNode& node : big->nodes) deepest = std::max(deepest, node.depth);
   CHECK(deepest < kMaxHierarchyDepth);

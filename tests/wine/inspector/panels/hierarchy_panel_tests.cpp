@@ -201,8 +201,38 @@ TEST_CASE("hierarchy: sections holding each other end, each shown once on a path
                                                     L"    Supplementary information node - B",
                                                     L"      Supplementary information node - A",
                                                     L"        Supplementary note - Note"});
-  CHECK(m.panel.hierarchyTable().getCurrentRow() == 3);  // B's first place
+  CHECK(m.panel.hierarchyTable().getCurrentRow() == 5);  // B under the chapter, not under A
   CHECK_FALSE(m.panel.WasCut());
+}
+
+TEST_CASE("hierarchy: twelve sections each holding every other stop at the limits") {
+  MountedPanel<cHierarchyPanel> m;
+  std::string objects = R"({"name": "top", "class": "csinod", "primitive": "none", "attributes": {"csilvl": 7},
+                            "members": [)";
+  for (int i = 0; i < 12; ++i) objects += (i ? ", " : "") + std::string("\"s") + std::to_string(i) + "\"";
+  objects += "]}";
+  for (int i = 0; i < 12; ++i) {
+    objects += ", {\"name\": \"s" + std::to_string(i) +
+               "\", \"class\": \"csinod\", \"primitive\": \"none\", \"attributes\": {\"csilvl\": 5}, \"members\": [";
+    bool first = true;
+    for (int j = 0; j < 12; ++j) {
+      if (j == i) continue;
+      objects += (first ? "\"s" : ", \"s") + std::to_string(j) + "\"";
+      first = false;
+    }
+    objects += "]}";
+  }
+  ScratchScene scene(std::string(R"({"format": "chartscene 1", "catalogue": {"classes": [
+      {"code": 57004, "acronym": "csinod", "name": "Node"}],
+      "attributes": [{"code": 57003, "acronym": "csilvl", "name": "Level", "type": "U"}]},
+    "databases": [{"name": "CSI", "kind": "hierarchy", "datasets": [{"id": "DENSE", "objects": [)") +
+                     objects + "]}]}]}");
+  REQUIRE(m.panel.Fill(scene.Object(L"s4").Get()) == S_OK);
+  CHECK(m.panel.WasCut());
+  CHECK(m.panel.hierarchyTable().getRowCount() == 4096);
+  const int current = m.panel.hierarchyTable().getCurrentRow();
+  REQUIRE(current > 0);
+  CHECK(m.panel.hierarchyTable().getCellText(current, 0) == "  Node");
 }
 
 TEST_CASE("hierarchy: a top node below level 7 is the root; a note held by a note, or a signed level, gives nothing") {
