@@ -24,6 +24,7 @@ InspectorPanel::InspectorPanel(Owner& owner, const PanelSettings& settings)
     : toolkit::Panel(std::make_unique<toolkit::GridLayout>(1, 2, 3, 0, "35,65")),
       owner_(owner),
       cards_(CardLayout()),
+      hierarchy_(settings, 1),
       attributes_(settings),
       internal_(settings),
       external_(settings),
@@ -43,6 +44,7 @@ void InspectorPanel::clearDetails() {
   internal_.Clear();
   external_.Clear();
   lights_.Clear();
+  hierarchy_.Clear();
 }
 
 void InspectorPanel::showFilledTabs() {

@@ -6,6 +6,7 @@
 
 #include "inspector/ObjectTree.h"
 #include "inspector/panels/cAttrViewPanel_Tbl.h"
+#include "inspector/panels/cHierarchyPanel.h"
 #include "inspector/panels/cLightsViewPanel.h"
 #include "inspector/panels/cP_SHPanel.h"
 #include "toolkit/core/Panel.h"
@@ -36,7 +37,8 @@ public:
   cP_SHPanel& internalServices() { return internal_; }
   cP_SHPanel& externalServices() { return external_; }
   cLightsViewPanel& lights() { return lights_; }
-  // Empties the attribute, services and lights panels.
+  cHierarchyPanel& hierarchy() { return hierarchy_; }
+  // Empties the attribute, services, lights and hierarchy panels.
   void clearDetails();
   // Puts the services and lights tabs in or takes them out by their content, after a fill.
   void showFilledTabs();
@@ -51,7 +53,7 @@ private:
   ObjectTree tree_;
   toolkit::Panel cards_;
   toolkit::TabContainer tabs_;
-  toolkit::Panel hierarchy_;
+  cHierarchyPanel hierarchy_;
   cAttrViewPanel_Tbl attributes_;
   cP_SHPanel internal_;
   cP_SHPanel external_;

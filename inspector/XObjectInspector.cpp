@@ -7,6 +7,7 @@
 #include "frame/settings/settings.h"
 #include "inspector/TreeBuilder.h"
 #include "inspector/dataset_label.h"
+#include "inspector/format/hierarchy_request.h"
 #include "inspector/object_access.h"
 #include "inspector/panels/dataset_metadata.h"
 #include "inspector/rules/attribute_text.h"
@@ -184,9 +185,10 @@ void XObjectInspector::ShowDetails(const ObjectRecord& record, bool header) {
     const auto facts = FactsOf(object.Get());
     if (facts) {
       const bool chart = facts->haveKind && SameId(facts->kind, kChartDatabaseKind);
-      if (IsHierarchyClass(facts->classCode) && facts->haveKind && KindNotBelow(facts->kind, kHierarchyKind))
+      if (IsHierarchyClass(facts->classCode) && facts->haveKind && KindNotBelow(facts->kind, kHierarchyKind)) {
         card = InspectorPanel::kCardHierarchy;
-      else
+        panel->hierarchy().Fill(object.Get());  // a failure leaves the card empty, and is logged
+      } else
         FillObjectDetails(*panel, object.Get(), facts->classCode, chart);
     }
   }
@@ -321,7 +323,18 @@ STDMETHODIMP XObjectInspector::FormatAttributes(IUnknown* database, BSTR guid, B
 
 // ---- content
 
-std::unique_ptr<toolkit::Container> XObjectInspector::MakeContent() { return std::make_unique<InspectorPanel>(relay_, settings_); }
+std::unique_ptr<toolkit::Container> XObjectInspector::MakeContent() {
+  auto panel = std::make_unique<InspectorPanel>(relay_, settings_);
+  panel->hierarchy().SetRequestHandler([this](const std::string& request) { TakeHierarchyRequest(request); });
+  return panel;
+}
+
+void XObjectInspector::TakeHierarchyRequest(const std::string& request) {
+  const auto chosen = ParseHierarchyRequest(request);
+  if (!chosen) return;
+  br::control::OwnerHold hold(*static_cast<IXObjectInspector*>(this));
+  FireSelectObject(IdTextOf(GuidOf(chosen->object)), nullptr, true);
+}
 
 void XObjectInspector::ContentGoing() {
   rebuilding_ = true;  // the items going send selection notifications

@@ -66,6 +66,8 @@ private:
   void ShowDetails(const ObjectRecord& record, bool header);
   void FireSelectObject(const std::wstring& guidText, IUnknown* owner, bool doubleClick);
   void FillObjectDetails(InspectorPanel& panel, IGeoObject* object, long classCode, bool chart);
+  // A request of the hierarchy card's buttons: SelectObject for the chart's node it names.
+  void TakeHierarchyRequest(const std::string& request);
 
   std::vector<ObjectRecord> records_;
   br::cErrReporter reporter_;

@@ -5,28 +5,27 @@
 // information title, both identities parse strictly and the kind is, byte by byte, not
 // below the hierarchy kind. No Windows API: tested natively.
 
-#include <array>
 #include <optional>
 #include <string>
 #include <string_view>
 
+#include "inspector/rules/guid_text.h"
+
 namespace br::inspector {
 
-// 16 bytes in the platform's GUID layout (a little-endian 32-bit number, two
-// little-endian 16-bit numbers, eight bytes as they stand).
-using HierarchyId = std::array<unsigned char, 16>;
+// 16 bytes in the platform's GUID layout.
+using HierarchyId = IdBytes;
 
 // All zero but "CSI" in bytes 8 to 10.
-inline constexpr HierarchyId kHierarchyKind = {0, 0, 0, 0, 0, 0, 0, 0, 'C', 'S', 'I', 0, 0, 0, 0, 0};
+inline constexpr HierarchyId kHierarchyKindId = {0, 0, 0, 0, 0, 0, 0, 0, 'C', 'S', 'I', 0, 0, 0, 0, 0};
 inline constexpr std::string_view kHierarchyTitle = "CHART SUPPLEMENTARY INFORMATION";
 
 // Whether a kind, compared byte by byte, is not below the hierarchy kind.
 bool IsHierarchyKind(const HierarchyId& kind);
 
-// "{XXXXXXXX-XXXX-XXXX-XXXX-XXXXXXXXXXXX}", upper-case digits.
+// IdText and ParseIdText over 8-bit text: the registry form, upper-case digits; exactly
+// that form read back, digits in either case, nothing else.
 std::string HierarchyIdText(const HierarchyId& id);
-// Exactly the registry form, digits in either case; none for anything else (other
-// lengths, missing braces or hyphens, blanks, signs, program identifiers).
 std::optional<HierarchyId> ParseHierarchyIdText(std::string_view text);
 
 // The request text of a node: "%s|%s|%s" of its text and the two identities.

@@ -32,10 +32,6 @@ std::string Real(double value, double largest) {
 
 }  // namespace
 
-bool IsHierarchyClass(long classCode) {
-  return classCode >= kClassHierarchyNote && classCode <= kClassHierarchyNode;
-}
-
 bool IsHierarchyLeafClass(long classCode) {
   return classCode >= kClassHierarchyNote && classCode <= kClassHierarchySource;
 }

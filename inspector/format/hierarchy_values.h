@@ -17,7 +17,7 @@ inline constexpr long kClassHierarchyNode = 57004;
 // A node's level: an unsigned 16-bit value; 7 the top, then 6 and 5.
 inline constexpr long kCodeHierarchyLevel = 57003;
 
-bool IsHierarchyClass(long classCode);
+// Notes, diagrams and sources (IsHierarchyClass of rules/object_groups.h takes nodes too).
 bool IsHierarchyLeafClass(long classCode);
 
 // Whether a node of `parentLevel` takes a related node of `childLevel` as its child:

@@ -17,12 +17,6 @@ HierarchyId HierarchyIdOf(const GUID& guid) {
   return id;
 }
 
-GUID GuidOf(const HierarchyId& id) {
-  GUID guid{};
-  std::memcpy(&guid, id.data(), id.size());
-  return guid;
-}
-
 GeoHierarchySource::GeoHierarchySource(IGeoObject* start) { objects_.emplace_back(start); }
 
 bool GeoHierarchySource::Related(std::size_t handle, std::vector<std::size_t>& related) {

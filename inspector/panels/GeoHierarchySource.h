@@ -31,6 +31,5 @@ private:
 };
 
 HierarchyId HierarchyIdOf(const GUID& guid);
-GUID GuidOf(const HierarchyId& id);
 
 }  // namespace br::inspector

@@ -136,9 +136,9 @@ TEST_CASE("a node of a level takes the nodes below it, and leaves only from leve
   CHECK(TakesLeaves(7));
   CHECK_FALSE(TakesLeaves(4));
   CHECK_FALSE(TakesLeaves(8));
-  CHECK(IsHierarchyClass(57001));
-  CHECK(IsHierarchyClass(57004));
-  CHECK_FALSE(IsHierarchyClass(57005));
+  CHECK(IsHierarchyLeafClass(57001));
+  CHECK(IsHierarchyLeafClass(57003));
+  CHECK_FALSE(IsHierarchyLeafClass(57005));
   CHECK_FALSE(IsHierarchyLeafClass(57004));
 }
 
@@ -149,7 +149,7 @@ TEST_CASE("identity texts are read only in the registry form") {
                                 0x43, 0x53, 0x49, 0xA0, 0xB0, 0xC0, 0xD0, 0xE0};
   CHECK(*id == expected);
   CHECK(HierarchyIdText(*id) == "{0A0B0C0D-0E0F-1011-4353-49A0B0C0D0E0}");
-  CHECK(HierarchyIdText(kHierarchyKind) == "{00000000-0000-0000-4353-490000000000}");
+  CHECK(HierarchyIdText(kHierarchyKindId) == "{00000000-0000-0000-4353-490000000000}");
 
   for (const char* bad : {"", "{0A0B0C0D-0E0F-1011-4353-49A0B0C0D0E}", "0A0B0C0D-0E0F-1011-4353-49A0B0C0D0E0",
                           "{0A0B0C0D-0E0F-1011-4353-49A0B0C0D0E0} ", "{0A0B0C0D 0E0F-1011-4353-49A0B0C0D0E0}",
@@ -164,20 +164,20 @@ TEST_CASE("a request is acted on only with the title, two strict identities and 
   HierarchyId object{};
   object[0] = 7;
   object[8] = 'C';
-  const std::string sent = HierarchyRequestText(kHierarchyTitle, object, kHierarchyKind);
+  const std::string sent = HierarchyRequestText(kHierarchyTitle, object, kHierarchyKindId);
   CHECK(sent ==
         "CHART SUPPLEMENTARY INFORMATION|{00000007-0000-0000-4300-000000000000}|"
         "{00000000-0000-0000-4353-490000000000}");
   const auto request = ParseHierarchyRequest(sent);
   REQUIRE(request);
   CHECK(request->object == object);
-  CHECK(request->kind == kHierarchyKind);
+  CHECK(request->kind == kHierarchyKindId);
 
   // A kind above the hierarchy kind counts, one below does not.
-  HierarchyId above = kHierarchyKind;
+  HierarchyId above = kHierarchyKindId;
   above[11] = 1;
   CHECK(ParseHierarchyRequest(HierarchyRequestText(kHierarchyTitle, object, above)));
-  HierarchyId below = kHierarchyKind;
+  HierarchyId below = kHierarchyKindId;
   below[10] = 'H';
   CHECK_FALSE(IsHierarchyKind(below));
   CHECK_FALSE(ParseHierarchyRequest(HierarchyRequestText(kHierarchyTitle, object, below)));
@@ -185,9 +185,9 @@ TEST_CASE("a request is acted on only with the title, two strict identities and 
   CHECK(IsHierarchyKind(chart));
 
   // Other titles, a title with a bar in it, and broken identities send nothing.
-  CHECK_FALSE(ParseHierarchyRequest(HierarchyRequestText("Buoyage", object, kHierarchyKind)));
-  CHECK_FALSE(ParseHierarchyRequest(HierarchyRequestText("chart supplementary information", object, kHierarchyKind)));
-  CHECK_FALSE(ParseHierarchyRequest(HierarchyRequestText("CHART SUPPLEMENTARY INFORMATION|x", object, kHierarchyKind)));
+  CHECK_FALSE(ParseHierarchyRequest(HierarchyRequestText("Buoyage", object, kHierarchyKindId)));
+  CHECK_FALSE(ParseHierarchyRequest(HierarchyRequestText("chart supplementary information", object, kHierarchyKindId)));
+  CHECK_FALSE(ParseHierarchyRequest(HierarchyRequestText("CHART SUPPLEMENTARY INFORMATION|x", object, kHierarchyKindId)));
   CHECK_FALSE(ParseHierarchyRequest(sent + "|"));
   CHECK_FALSE(ParseHierarchyRequest(sent.substr(0, sent.size() - 1)));
   CHECK_FALSE(ParseHierarchyRequest("CHART SUPPLEMENTARY INFORMATION|ChartScene.Scene|{00000000-0000-0000-4353-490000000000}"));
@@ -196,8 +196,8 @@ TEST_CASE("a request is acted on only with the title, two strict identities and 
 
   // A long text from the host is carried whole, and a format sequence in it is a text.
   const std::string longText(5000, 'x');
-  CHECK(HierarchyRequestText(longText, object, kHierarchyKind).size() == 5000 + 2 + 2 * 38);
-  CHECK(HierarchyRequestText("%s%n%d", object, kHierarchyKind).rfind("%s%n%d|", 0) == 0);
+  CHECK(HierarchyRequestText(longText, object, kHierarchyKindId).size() == 5000 + 2 + 2 * 38);
+  CHECK(HierarchyRequestText("%s%n%d", object, kHierarchyKindId).rfind("%s%n%d|", 0) == 0);
 }
 
 TEST_CASE("the tree: root found upwards, levels pick the children, leaves are read without levels") {

@@ -273,7 +273,7 @@ TEST_CASE("hierarchy: the buttons send the node's text, identity and kind; show 
   CHECK(requests.sent[1] == root);
   const auto request = inspector::ParseHierarchyRequest(requests.sent[1]);
   REQUIRE(request);
-  CHECK(inspector::GuidOf(request->object) == ScratchScene::IdOf(scene.Object(L"root").Get()));
+  CHECK(request->object == inspector::HierarchyIdOf(ScratchScene::IdOf(scene.Object(L"root").Get())));
 
   // A row chosen by the user: its attributes show, the buttons take it.
   m.panel.hierarchyTable().selectRow(0, true);
