@@ -84,41 +84,18 @@ std::vector<std::string> Shape(const HierarchyTree& tree) {
 
 }  // namespace
 
-TEST_CASE("value texts by type, with the no-value marker of each type unknown") {
-  HierarchyValue text;
-  text.type = HierarchyValueType::Text;
-  text.text = "Red to port";
-  CHECK(HierarchyValueText(text) == "Red to port");
-
-  CHECK(HierarchyValueText(Whole(HierarchyValueType::I1, -5)) == "-5");
+TEST_CASE("value texts: each type's own no-value marker, unsigned numbers without a letter") {
   CHECK(HierarchyValueText(Whole(HierarchyValueType::I1, 127)) == "<unknown>");
-  CHECK(HierarchyValueText(Whole(HierarchyValueType::I2, 127)) == "127");
-  CHECK(HierarchyValueText(Whole(HierarchyValueType::I2, 32767)) == "<unknown>");
+  CHECK(HierarchyValueText(Whole(HierarchyValueType::I2, 127)) == "127");  // a byte's marker, not a short's
   CHECK(HierarchyValueText(Whole(HierarchyValueType::I4, 32767)) == "32767");
   CHECK(HierarchyValueText(Whole(HierarchyValueType::I4, -2147483647 - 1)) == "-2147483648");
-  CHECK(HierarchyValueText(Whole(HierarchyValueType::I4, 2147483647)) == "<unknown>");
-
-  // Unsigned numbers print without a trailing letter.
-  CHECK(HierarchyValueText(Whole(HierarchyValueType::UI4, 42)) == "42");
   CHECK(HierarchyValueText(Whole(HierarchyValueType::UI4, 4294967295)) == "4294967295");
-  CHECK(HierarchyValueText(Whole(HierarchyValueType::UI4, 0)) == "<unknown>");
-  HierarchyValue enumerated = Whole(HierarchyValueType::UI1, 4);
-  CHECK(HierarchyValueText(enumerated) == "4");
+  HierarchyValue enumerated = Whole(HierarchyValueType::UI2, 0);
   enumerated.enumText = "green";
-  CHECK(HierarchyValueText(enumerated) == "green");
-  enumerated.whole = 0;
-  CHECK(HierarchyValueText(enumerated) == "<unknown>");
-  CHECK(HierarchyValueText(Whole(HierarchyValueType::UI2, 65535)) == "65535");
-
-  CHECK(HierarchyValueText(Real(HierarchyValueType::R4, 3.4f)) == "3.400");
-  CHECK(HierarchyValueText(Real(HierarchyValueType::R4, FLT_MAX)) == "<unknown>");
-  CHECK(HierarchyValueText(Real(HierarchyValueType::R4, DBL_MAX)) != "<unknown>");  // not a float's marker
-  CHECK(HierarchyValueText(Real(HierarchyValueType::R8, -0.0625)) == "-0.062");
-  CHECK(HierarchyValueText(Real(HierarchyValueType::R8, DBL_MAX)) == "<unknown>");
+  CHECK(HierarchyValueText(enumerated) == "<unknown>");  // 0 before the catalogue's text
+  CHECK(HierarchyValueText(Real(HierarchyValueType::R4, DBL_MAX)) != "<unknown>");
   CHECK(HierarchyValueText(Real(HierarchyValueType::R8, FLT_MAX)).size() > 30);  // printed in full
-
-  CHECK(HierarchyValueText(Whole(HierarchyValueType::Other, 1)) == "<unknown value type>");
-  CHECK(HierarchyValueText(HierarchyValue{}) == "<Error retrieving value>");
+  CHECK(HierarchyValueText(Real(HierarchyValueType::R8, -DBL_MAX)).size() > 300);
 }
 
 TEST_CASE("a node of a level takes the nodes below it, and leaves only from levels 5 to 7") {
@@ -142,22 +119,15 @@ TEST_CASE("a node of a level takes the nodes below it, and leaves only from leve
   CHECK_FALSE(IsHierarchyLeafClass(57004));
 }
 
-TEST_CASE("identity texts are read only in the registry form") {
+TEST_CASE("identity texts: the platform's byte order, 8-bit text beyond ASCII refused") {
   const auto id = ParseHierarchyIdText("{0A0B0C0D-0E0F-1011-4353-49a0b0c0d0e0}");
   REQUIRE(id);
   const HierarchyId expected = {0x0D, 0x0C, 0x0B, 0x0A, 0x0F, 0x0E, 0x11, 0x10,
                                 0x43, 0x53, 0x49, 0xA0, 0xB0, 0xC0, 0xD0, 0xE0};
   CHECK(*id == expected);
   CHECK(HierarchyIdText(*id) == "{0A0B0C0D-0E0F-1011-4353-49A0B0C0D0E0}");
-  CHECK(HierarchyIdText(kHierarchyKindId) == "{00000000-0000-0000-4353-490000000000}");
-
-  for (const char* bad : {"", "{0A0B0C0D-0E0F-1011-4353-49A0B0C0D0E}", "0A0B0C0D-0E0F-1011-4353-49A0B0C0D0E0",
-                          "{0A0B0C0D-0E0F-1011-4353-49A0B0C0D0E0} ", "{0A0B0C0D 0E0F-1011-4353-49A0B0C0D0E0}",
-                          "{0A0B0C0D-0E0F-1011-4353-49A0B0C0D0EG}", "{+A0B0C0D-0E0F-1011-4353-49A0B0C0D0E0}",
-                          "{0A0B0C0D-0E0F-1011-435349-A0B0C0D0E0}", "ChartScene.Scene"}) {
-    CAPTURE(bad);
-    CHECK_FALSE(ParseHierarchyIdText(bad));
-  }
+  CHECK_FALSE(ParseHierarchyIdText("{0A0B0C0D-0E0F-1011-4353-49A0B0C0D0E\xC5}"));
+  CHECK_FALSE(ParseHierarchyIdText("ChartScene.Scene"));
 }
 
 TEST_CASE("a request is acted on only with the title, two strict identities and a hierarchy kind") {
