@@ -108,6 +108,7 @@ bool cHierarchyPanel::SelectNode(int row) {
 
 void cHierarchyPanel::ShowAttributes(int node) {
   attributes_.removeAllRows();
+  if (node < 0 || node >= static_cast<int>(hierarchy_.size())) return;
   for (const std::string& row : HierarchyAttributeRows(hierarchy_[node].object.Get(), catalogue_.Get())) {
     attributes_.appendRowText(0, row.c_str(), 0);
   }
