@@ -45,21 +45,36 @@ void InspectorPanel::clearDetails() {
   external_.Clear();
   lights_.Clear();
   hierarchy_.Clear();
+  description_.Clear();
+  nationalDescription_.Clear();
 }
 
 void InspectorPanel::showFilledTabs() {
+  showTab(description_, description_.HasContent(), 7, "Textual description");
+  showTab(nationalDescription_, nationalDescription_.HasContent(), 65, "Textual description in national language");
   showTab(internal_, internal_.HasContent(), 8, "Internal services/shops");
   showTab(external_, external_.HasContent(), 9, "External services/shops");
   showTab(lights_, lights_.HasContent(), 10, "Lights");
   if (tabs_.isValid()) tabs_.doLayout();
 }
 
-void InspectorPanel::showTab(toolkit::Panel& panel, bool hasContent, long textId, const char* title) {
+int InspectorPanel::tabPlace(const toolkit::cXComponent& panel) const {
+  const toolkit::cXComponent* const order[] = {&attributes_, &description_, &nationalDescription_, &internal_,
+                                               &external_, &lights_};
+  int place = 0;
+  for (const toolkit::cXComponent* tab : order) {
+    if (tab == &panel) break;
+    if (tab->getParent() == &tabs_) ++place;
+  }
+  return place;
+}
+
+void InspectorPanel::showTab(toolkit::cXComponent& panel, bool content, long textId, const char* title) {
   const bool shown = panel.getParent() == &tabs_;
-  if (hasContent && !shown) {
+  if (content && !shown) {
     const std::string text = br::GetText("ObjInspector", textId, title);
-    tabs_.insertNamed(nullptr, &panel, text.c_str());
-  } else if (!hasContent && shown) {
+    tabs_.insertAtNamed(tabPlace(panel), nullptr, &panel, text.c_str());
+  } else if (!content && shown) {
     if (tabs_.getSelectedPage() > 0) tabs_.selectPage(0, false);
     tabs_.removeComponent(&panel, false);
   }

@@ -1,14 +1,15 @@
 #pragma once
 // The inspector's content: the object tree on the left (35 %), and on the right a card
 // panel whose card 0 holds the detail tabs and card 1 the hierarchy view. The tab
-// "Attributes" holds the attribute table from the start; the services and lights tabs are
-// shown only while their panels have rows.
+// "Attributes" holds the attribute table from the start; the others (text descriptions,
+// services, lights) are shown only while their panels have content, always in the same order.
 
 #include "inspector/ObjectTree.h"
 #include "inspector/panels/cAttrViewPanel_Tbl.h"
 #include "inspector/panels/cHierarchyPanel.h"
 #include "inspector/panels/cLightsViewPanel.h"
 #include "inspector/panels/cP_SHPanel.h"
+#include "inspector/panels/cXTextDescr.h"
 #include "toolkit/core/Panel.h"
 #include "toolkit/widgets/TabContainer.h"
 
@@ -38,9 +39,11 @@ public:
   cP_SHPanel& externalServices() { return external_; }
   cLightsViewPanel& lights() { return lights_; }
   cHierarchyPanel& hierarchy() { return hierarchy_; }
-  // Empties the attribute, services, lights and hierarchy panels.
+  cXTextDescr& description() { return description_; }
+  cXTextDescr& nationalDescription() { return nationalDescription_; }
+  // Empties the attribute, text, services, lights and hierarchy panels.
   void clearDetails();
-  // Puts the services and lights tabs in or takes them out by their content, after a fill.
+  // Puts the optional tabs in or takes them out by their content, after a fill.
   void showFilledTabs();
   // Card 0 (details) or 1 (hierarchy), laid out again when it changes.
   void showCard(int card);
@@ -58,7 +61,11 @@ private:
   cP_SHPanel internal_;
   cP_SHPanel external_;
   cLightsViewPanel lights_;
-  void showTab(toolkit::Panel& panel, bool hasContent, long textId, const char* title);
+  cXTextDescr description_;
+  cXTextDescr nationalDescription_;
+  void showTab(toolkit::cXComponent& panel, bool content, long textId, const char* title);
+  // Where a tab goes: after the shown tabs that come before it in the fixed order.
+  int tabPlace(const toolkit::cXComponent& panel) const;
 };
 
 }  // namespace br::inspector
