@@ -15,18 +15,21 @@ constexpr ULONG kReadStep = 1u << 20;
 
 }  // namespace
 
-HRESULT OpenStoredStream(IGeoObject* object, const std::wstring& name, IStream** stream) {
-  if (stream == nullptr) return E_POINTER;
-  *stream = nullptr;
+HRESULT ReadStoredFile(IGeoObject* object, const std::wstring& name, std::string& bytes, bool& stored) {
+  stored = false;
+  bytes.clear();
   if (object == nullptr) return E_POINTER;
   if (name.empty() || name.find(L'\0') != std::wstring::npos) return STG_E_FILENOTFOUND;
   ComPtr<IStorage> storage;
   HRESULT hr = object->GetStorage(&storage);
   if (FAILED(hr)) return hr;
   if (!storage) return STG_E_FILENOTFOUND;
-  hr = storage->OpenStream(name.c_str(), nullptr, STGM_READ | STGM_SHARE_EXCLUSIVE, 0, stream);
-  if (SUCCEEDED(hr) && *stream == nullptr) return STG_E_FILENOTFOUND;
-  return hr;
+  ComPtr<IStream> stream;
+  hr = storage->OpenStream(name.c_str(), nullptr, STGM_READ | STGM_SHARE_EXCLUSIVE, 0, &stream);
+  if (FAILED(hr)) return hr;
+  if (!stream) return STG_E_FILENOTFOUND;
+  stored = true;
+  return ReadWholeStream(stream.Get(), bytes);
 }
 
 HRESULT ReadWholeStream(IStream* stream, std::string& bytes, std::uint64_t limit) {

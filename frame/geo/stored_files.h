@@ -16,10 +16,11 @@ namespace br::geo {
 // (E_OUTOFMEMORY, as a failed allocation would be) instead of exhausting the host.
 constexpr std::uint64_t kMaxWholeFileBytes = 32u << 20;
 
-// Opens `name` as a stream of the object's storage (GetStorage, then OpenStream for
-// exclusive reading). A failure when the object keeps no storage or no such stream; an
-// empty name, or one holding a NUL, opens nothing.
-HRESULT OpenStoredStream(IGeoObject* object, const std::wstring& name, IStream** stream);
+// Reads `name` whole (ReadWholeStream) when the object keeps it as a stream of its storage
+// (GetStorage, then OpenStream for exclusive reading); `stored` tells whether it does. The
+// storage is held while the stream is read: a stream outlived by its storage is reverted.
+// An empty name, or one holding a NUL, is never stored.
+HRESULT ReadStoredFile(IGeoObject* object, const std::wstring& name, std::string& bytes, bool& stored);
 
 // The whole stream: its size by seeking to the end, then from the start up to that size.
 // Streams answer S_OK with 0 bytes at their end, so a stream that gives fewer bytes than

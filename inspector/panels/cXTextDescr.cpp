@@ -133,10 +133,10 @@ HRESULT cXTextDescr::Fill(IGeoObject* object, long attributeCode) {
 HRESULT cXTextDescr::Load(IGeoObject* object, IGeoDatabase* database, const std::wstring& name) {
   content_ = false;
   std::string bytes;
-  ComPtr<IStream> stream;
-  if (SUCCEEDED(br::geo::OpenStoredStream(object, name, &stream))) {
-    const HRESULT hr = br::geo::ReadWholeStream(stream.Get(), bytes);
-    if (FAILED(hr)) return hr;
+  bool stored = false;
+  HRESULT hr = br::geo::ReadStoredFile(object, name, bytes, stored);
+  if (stored) {
+    if (FAILED(hr)) return hr;  // a short read shows nothing rather than part of a text
     Show(std::move(bytes));
     return S_OK;
   }
@@ -145,7 +145,7 @@ HRESULT cXTextDescr::Load(IGeoObject* object, IGeoDatabase* database, const std:
   if (!AnsiName(name, ansi)) return kFileNotFound;
   if (FAILED(br::geo::FindVolumeFile(database, ansi.c_str(), path)) && FAILED(br::FindStoreFile(ansi.c_str(), path)))
     return kFileNotFound;
-  const HRESULT hr = br::geo::ReadWholeFile(path, bytes);
+  hr = br::geo::ReadWholeFile(path, bytes);
   if (FAILED(hr)) return hr;
   Show(std::move(bytes));
   return S_OK;
