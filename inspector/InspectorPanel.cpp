@@ -47,9 +47,16 @@ void InspectorPanel::clearDetails() {
   hierarchy_.Clear();
   description_.Clear();
   nationalDescription_.Clear();
+  picture_.FillNames(nullptr, std::string());
 }
 
 void InspectorPanel::showFilledTabs() {
+  const bool pictureWasShown = picture_.getParent() == &tabs_;
+  // The list was filled while its view may not have existed: a tab put in now shows the
+  // first picture (stepping back from the first one stays on it).
+  if (showTab(picture_, picture_.HasContent(), 6, "Pictorial representation") && !pictureWasShown &&
+      !picture_.pictures().Shown())
+    picture_.ShowPrevious();
   showTab(description_, description_.HasContent(), 7, "Textual description");
   showTab(nationalDescription_, nationalDescription_.HasContent(), 65, "Textual description in national language");
   showTab(internal_, internal_.HasContent(), 8, "Internal services/shops");
@@ -59,8 +66,8 @@ void InspectorPanel::showFilledTabs() {
 }
 
 int InspectorPanel::tabPlace(const toolkit::cXComponent& panel) const {
-  const toolkit::cXComponent* const order[] = {&attributes_, &description_, &nationalDescription_, &internal_,
-                                               &external_, &lights_};
+  const toolkit::cXComponent* const order[] = {&attributes_, &picture_, &description_, &nationalDescription_,
+                                               &internal_, &external_, &lights_};
   int place = 0;
   for (const toolkit::cXComponent* tab : order) {
     if (tab == &panel) break;
@@ -69,7 +76,7 @@ int InspectorPanel::tabPlace(const toolkit::cXComponent& panel) const {
   return place;
 }
 
-void InspectorPanel::showTab(toolkit::cXComponent& panel, bool content, long textId, const char* title) {
+bool InspectorPanel::showTab(toolkit::cXComponent& panel, bool content, long textId, const char* title) {
   const bool shown = panel.getParent() == &tabs_;
   if (content && !shown) {
     const std::string text = br::GetText("ObjInspector", textId, title);
@@ -78,6 +85,7 @@ void InspectorPanel::showTab(toolkit::cXComponent& panel, bool content, long tex
     if (tabs_.getSelectedPage() > 0) tabs_.selectPage(0, false);
     tabs_.removeComponent(&panel, false);
   }
+  return panel.getParent() == &tabs_;
 }
 
 void InspectorPanel::showCard(int card) {

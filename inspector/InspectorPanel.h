@@ -10,6 +10,7 @@
 #include "inspector/panels/cLightsViewPanel.h"
 #include "inspector/panels/cP_SHPanel.h"
 #include "inspector/panels/cXTextDescr.h"
+#include "picture/cXPictDescr.h"
 #include "toolkit/core/Panel.h"
 #include "toolkit/widgets/TabContainer.h"
 
@@ -41,7 +42,8 @@ public:
   cHierarchyPanel& hierarchy() { return hierarchy_; }
   cXTextDescr& description() { return description_; }
   cXTextDescr& nationalDescription() { return nationalDescription_; }
-  // Empties the attribute, text, services, lights and hierarchy panels.
+  br::picture::cXPictDescr& picture() { return picture_; }
+  // Empties the attribute, picture, text, services, lights and hierarchy panels.
   void clearDetails();
   // Puts the optional tabs in or takes them out by their content, after a fill.
   void showFilledTabs();
@@ -61,9 +63,11 @@ private:
   cP_SHPanel internal_;
   cP_SHPanel external_;
   cLightsViewPanel lights_;
+  br::picture::cXPictDescr picture_;
   cXTextDescr description_;
   cXTextDescr nationalDescription_;
-  void showTab(toolkit::cXComponent& panel, bool content, long textId, const char* title);
+  // Whether the tab is in the container afterwards.
+  bool showTab(toolkit::cXComponent& panel, bool content, long textId, const char* title);
   // Where a tab goes: after the shown tabs that come before it in the fixed order.
   int tabPlace(const toolkit::cXComponent& panel) const;
 };

@@ -196,13 +196,15 @@ void XObjectInspector::ShowDetails(const ObjectRecord& record, bool header) {
   panel->showCard(card);
 }
 
-// The attribute table, a chart object's lights and text descriptions, and for a harbour
-// its services; a failure is logged and leaves what was filled.
+// The attribute table, the pictures, a chart object's lights and text descriptions, and
+// for a harbour its services; a failure is logged and leaves what was filled.
 void XObjectInspector::FillObjectDetails(InspectorPanel& panel, IGeoObject* object, long classCode, bool chart) {
   br::ErrRecord failure;
   br::RunGuarded(reporter_, "CXObjectInspector", BR_ERR_PLACE("_fillGeoObjectAttr"), failure, [&] {
     const bool collection = classCode == kClassAggregation || classCode == kClassAssociation;
     panel.attributes().FillObject(object, true, !(chart && collection));
+    // A picture not found leaves the list with those found before it.
+    panel.picture().Fill(object);
     if (chart) {
       panel.lights().FillLights(object);
       // Only a text that loaded shows its tab; a missing file leaves it hidden.

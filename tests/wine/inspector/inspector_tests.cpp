@@ -728,3 +728,134 @@ TEST_CASE("a failing fill and a fill too deep are logged; no geo failure stops t
   in.close();
   DeleteFileA(log.c_str());
 }
+
+namespace {
+
+// Every rich edit window below `parent`, visible ones only, with the text it holds.
+void VisibleRichEditTexts(HWND parent, std::vector<std::string>& texts) {
+  for (HWND child = GetWindow(parent, GW_CHILD); child; child = GetWindow(child, GW_HWNDNEXT)) {
+    char found[32] = {};
+    GetClassNameA(child, found, sizeof(found));
+    if (lstrcmpiA(found, "RICHEDIT") == 0 && IsWindowVisible(child)) {
+      char text[256] = {};
+      const LRESULT length = SendMessageA(child, WM_GETTEXT, sizeof(text), reinterpret_cast<LPARAM>(text));
+      texts.emplace_back(text, static_cast<std::size_t>(length > 0 ? length : 0));
+    }
+    VisibleRichEditTexts(child, texts);
+  }
+}
+
+// The file name the picture tab's view shows (empty when none), asked of the control that
+// the tab's ATL host window holds.
+std::wstring ShownPictureName(HWND inspectorWindow) {
+  HWND host = FindClass(inspectorWindow, L"AtlAxWin");
+  REQUIRE(host != nullptr);
+  using GetControl = HRESULT(WINAPI*)(HWND, IUnknown**);
+  const auto getControl = reinterpret_cast<GetControl>(
+      reinterpret_cast<void*>(GetProcAddress(GetModuleHandleA("atl.dll"), "AtlAxGetControl")));
+  const bool haveGetControl = getControl != nullptr;
+  REQUIRE(haveGetControl);
+  ComRef<IUnknown> control;
+  REQUIRE(getControl(host, control.Out()) == S_OK);
+  ComRef<IXPICREPView> view = Query<IXPICREPView>(control.Get());
+  REQUIRE(view);
+  VARIANT name;
+  VariantInit(&name);
+  REQUIRE(view->get_Property(PRV_PICFILENAME, &name) == S_OK);
+  REQUIRE(name.vt == VT_BSTR);
+  const std::wstring text = Take(name.bstrVal);
+  return text;
+}
+
+std::string SourcePath(const char* relative) {
+  const char* root = getenv("BR_SOURCE_DIR");
+  REQUIRE(root != nullptr);
+  return std::string("Z:") + root + "/" + relative;
+}
+
+}  // namespace
+
+TEST_CASE("the picture and text description tabs: shown with content, in their order, texts read back") {
+  DllUnderTest dll;
+  ScratchFolder files;
+  WriteTextFile(files / "about.txt", "About the buoy");
+  WriteTextFile(files / "national.txt", "Sur la bouee");
+  std::string folder = files.Path();
+  for (char& c : folder)
+    if (c == '\\') c = '/';
+  ScratchScene scene(R"({"format":"chartscene 1","databases":[{"name":"TABSDB","kind":"chart","datasets":[
+    {"id":"TABS0001","objects":[
+     {"name":"all","class":"BOYLAT","point":[0,0],
+      "attributes":{"OBJNAM":"All","TXTDSC":"ABOUT.TXT","NTXTDS":"NATIONAL.TXT","PICREP":"BEACON.PNG"},
+      "files":{"ABOUT.TXT":")" + folder + R"(/about.txt","NATIONAL.TXT":")" + folder +
+                     R"(/national.txt","BEACON.PNG":")" + SourcePath("data/harbour/files/beacon.png") + R"("}},
+     {"name":"text","class":"BOYLAT","point":[0,0],"attributes":{"OBJNAM":"Text","TXTDSC":"ABOUT.TXT"},
+      "files":{"ABOUT.TXT":")" + folder + R"(/about.txt"}},
+     {"name":"picture","class":"BOYLAT","point":[0,0],"attributes":{"OBJNAM":"Picture","PICREP":"BEACON.PNG"},
+      "files":{"BEACON.PNG":")" + SourcePath("data/harbour/files/beacon.png") + R"("}},
+     {"name":"missing","class":"BOYLAT","point":[0,0],"attributes":{"OBJNAM":"Missing","TXTDSC":"nowhere-at-all.txt"}},
+     {"name":"none","class":"BOYLAT","point":[0,0],"attributes":{"OBJNAM":"None"}}]}]}]})");
+  {
+    InspectorControl inspector(dll);
+    inspector.Host();
+    VARIANT records = scene.Records(L"all, text, picture, missing, none");
+    REQUIRE(inspector->SetInfo(records) == S_OK);
+    VariantClear(&records);
+    HWND strip = FindClass(inspector.Window(), WC_TABCONTROLW);
+    REQUIRE(strip != nullptr);
+    HWND tabs = GetParent(strip);
+    auto select = [&](const wchar_t* name) {
+      HTREEITEM found = nullptr;
+      for (LPARAM data = 1; data <= 5 && !found; ++data) {
+        const HTREEITEM item = inspector.ItemWithData(data);
+        if (!item) continue;
+        TVITEMW read{};
+        wchar_t text[64] = {};
+        read.mask = TVIF_TEXT | TVIF_HANDLE;
+        read.hItem = item;
+        read.pszText = text;
+        read.cchTextMax = 64;
+        SendMessageW(inspector.Tree(), TVM_GETITEMW, 0, reinterpret_cast<LPARAM>(&read));
+        if (std::wstring(text).find(name) != std::wstring::npos) found = item;
+      }
+      REQUIRE(found != nullptr);
+      inspector.Select(found);
+    };
+    auto showPage = [&](int page) {
+      TabCtrl_SetCurSel(strip, page);
+      NMHDR change{strip, static_cast<UINT_PTR>(GetDlgCtrlID(strip)), static_cast<UINT>(TCN_SELCHANGE)};
+      SendMessageW(tabs, WM_NOTIFY, change.idFrom, reinterpret_cast<LPARAM>(&change));
+    };
+
+    select(L"All");
+    CHECK(TabTitles(strip) == std::vector<std::wstring>{L"Attributes", L"Pictorial representation", L"Textual description",
+                                                        L"Textual description in national language"});
+    // The first picture is shown: the view holds the copy of the stored one.
+    const std::wstring shown = ShownPictureName(inspector.Window());
+    CHECK(shown.find(L"\\PICREP\\") != std::wstring::npos);
+    CHECK(shown.find(L"TIF") != std::wstring::npos);
+    showPage(2);
+    std::vector<std::string> texts;
+    VisibleRichEditTexts(inspector.Window(), texts);
+    CHECK(texts == std::vector<std::string>{"About the buoy"});
+    showPage(3);
+    texts.clear();
+    VisibleRichEditTexts(inspector.Window(), texts);
+    CHECK(texts == std::vector<std::string>{"Sur la bouee"});
+
+    select(L"Text");
+    CHECK(TabTitles(strip) == std::vector<std::wstring>{L"Attributes", L"Textual description"});
+    select(L"Picture");
+    CHECK(TabTitles(strip) == std::vector<std::wstring>{L"Attributes", L"Pictorial representation"});
+    select(L"Missing");
+    CHECK(TabTitles(strip) == std::vector<std::wstring>{L"Attributes"});
+    select(L"None");
+    CHECK(TabTitles(strip) == std::vector<std::wstring>{L"Attributes"});
+    // The header's metadata has no texts either.
+    inspector.Select(inspector.ItemWithData(-2));
+    CHECK(TabTitles(strip) == std::vector<std::wstring>{L"Attributes"});
+    select(L"Text");
+    CHECK(TabTitles(strip) == std::vector<std::wstring>{L"Attributes", L"Textual description"});
+  }
+  CHECK(dll.CanUnloadNow() == S_OK);
+}
