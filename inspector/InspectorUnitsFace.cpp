@@ -14,12 +14,14 @@ STDMETHODIMP InspectorUnitsFace::SetOption(LONG value) {
 STDMETHODIMP InspectorUnitsFace::SetUnits(VARIANT units) {
   if (units.vt == VT_BSTR) {
     inspector_.Units().text.assign(units.bstrVal ? units.bstrVal : L"", units.bstrVal ? SysStringLen(units.bstrVal) : 0);
+    inspector_.UnitsChanged();
     return S_OK;
   }
   VARIANT number;
   VariantInit(&number);
   if (FAILED(VariantChangeType(&number, &units, 0, VT_I4))) return E_INVALIDARG;
   inspector_.Units().units = number.lVal;
+  inspector_.UnitsChanged();
   return S_OK;
 }
 

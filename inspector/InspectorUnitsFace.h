@@ -18,7 +18,8 @@ public:
   // units record for the panels to read.
   STDMETHODIMP SetOption(LONG value) override;
   // A string is kept as the option text; anything else must convert to a 32-bit number
-  // (E_INVALIDARG when it does not).
+  // (E_INVALIDARG when it does not). Either goes on to the formatter, and the shown details
+  // are filled again in the new units.
   STDMETHODIMP SetUnits(VARIANT units) override;
 
 private:

@@ -263,6 +263,21 @@ STDMETHODIMP XObjectInspector::GetSelectedObject(BSTR* guid, IUnknown** owner) {
   });
 }
 
+void XObjectInspector::UnitsChanged() {
+  settings_.SetUnits(units_.units);
+  settings_.SetUnitsText(units_.text);
+  InspectorPanel* panel = Panel();
+  if (!panel || rebuilding_) return;
+  br::control::OwnerHold hold(*static_cast<IXObjectInspector*>(this));
+  Guard([&] {
+    const LPARAM word = panel->tree().DataOf(panel->tree().Selected());
+    if (!IsRecordWord(word, records_.size())) return S_FALSE;
+    const ObjectRecord record = records_[RecordOfWord(word)];
+    ShowDetails(record, word == kHeaderWord);
+    return S_OK;
+  });
+}
+
 // ---- DataSet, agency names and attribute texts
 
 STDMETHODIMP XObjectInspector::get_DataSet(IUnknown** dataSet) {

@@ -39,6 +39,9 @@ public:
   STDMETHODIMP FormatAttributes(IUnknown* database, BSTR guid, BSTR* attributes) override;
 
   UnitsOptions& Units() { return units_; }
+  // Hands the units set through IUnitsOption to the formatter and shows the chosen entry's
+  // details again in them.
+  void UnitsChanged();
   // For tests and hosts inside the library: the tree, null before the window.
   ObjectTree* Tree() const { return Panel() ? &Panel()->tree() : nullptr; }
   std::size_t RecordCount() const { return records_.size(); }

@@ -10,6 +10,8 @@ namespace {
 
 constexpr long kOptionLanguage = 61;
 constexpr long kOptionMissingText = 64;
+constexpr long kFormatterUnits = 62;
+constexpr long kFormatterUnitsText = 63;
 
 std::wstring Wide(const std::string& ansi) {
   if (ansi.empty()) return {};
@@ -50,6 +52,27 @@ HRESULT PanelSettings::Create() {
   formatter_->SetOption(kOptionMissingText, option);
   VariantClear(&option);
   return S_OK;
+}
+
+HRESULT PanelSettings::SetUnits(long units) {
+  if (!formatter_) return S_FALSE;
+  VARIANT value;
+  VariantInit(&value);
+  value.vt = VT_I4;
+  value.lVal = units;
+  return formatter_->SetOption(kFormatterUnits, value);
+}
+
+HRESULT PanelSettings::SetUnitsText(const std::wstring& text) {
+  if (!formatter_) return S_FALSE;
+  VARIANT value;
+  VariantInit(&value);
+  value.vt = VT_BSTR;
+  value.bstrVal = SysAllocStringLen(text.data(), static_cast<UINT>(text.size()));
+  if (!value.bstrVal) return E_OUTOFMEMORY;
+  const HRESULT hr = formatter_->SetOption(kFormatterUnitsText, value);
+  VariantClear(&value);
+  return hr;
 }
 
 }  // namespace br::inspector

@@ -30,6 +30,10 @@ public:
   void SetFormatter(IObjectFormatter* formatter) { formatter_ = formatter; }
 
   IObjectFormatter* Formatter() const { return formatter_.Get(); }
+  // The units the host shows values in, handed on to the formatter (option 62 a number,
+  // 63 a text) so attribute values follow them; the formatter's answer, S_FALSE without one.
+  HRESULT SetUnits(long units);
+  HRESULT SetUnitsText(const std::wstring& text);
   // Where the panels report the failures they skip: the library's reporter (log file,
   // box) unless the control hands over its own.
   cErrHandler& Errors() const { return *errors_; }

@@ -57,6 +57,13 @@ ScratchScene::~ScratchScene() {
   if (!file_.empty()) DeleteFileW(file_.c_str());
 }
 
+std::wstring ScratchScene::FormatterOption(long id) const {
+  VARIANT out = CallValue(L"FormatterOption", std::to_wstring(id).c_str());
+  std::wstring text = out.vt == VT_BSTR && out.bstrVal ? std::wstring(out.bstrVal, SysStringLen(out.bstrVal)) : L"";
+  VariantClear(&out);
+  return text;
+}
+
 VARIANT ScratchScene::CallValue(const wchar_t* method, const wchar_t* argument) const {
   DISPID id = 0;
   LPOLESTR name = const_cast<LPOLESTR>(method);

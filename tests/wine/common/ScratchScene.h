@@ -38,6 +38,9 @@ public:
   // Object records of the named objects ("a, b, dataset:ID") as SetInfo takes them:
   // VT_ARRAY|VT_UI1 (REQUIREd); the caller clears it.
   VARIANT Records(const wchar_t* names) const;
+  // The last value the host's object formatters were given for option `id` ("I4:2",
+  // "BSTR:feet"), empty when none was.
+  std::wstring FormatterOption(long id) const;
 
 private:
   void Load(const std::wstring& file);

@@ -475,17 +475,25 @@ TEST_CASE("DataSet, FormatAttributes, HOCode2Name and IUnitsOption") {
   ComRef<IUnitsOption> units = Query<IUnitsOption>(inspector.Get());
   CHECK(units->SetOption(1) == S_OK);
   CHECK(units->SetOption(0) == S_OK);
+  // The units reach the formatter, and the chosen object's rows are formatted again.
+  inspector.Select(inspector.ItemWithData(1));
+  SceneProbe probe;
+  const long before = probe.Counter("calls.IGeoObject.GetAttributes");
   VARIANT value;
   value.vt = VT_BSTR;
   value.bstrVal = SysAllocString(L"metric");
   CHECK(units->SetUnits(value) == S_OK);
   VariantClear(&value);
+  CHECK(s.scene.FormatterOption(63) == L"BSTR:metric");
+  CHECK(probe.Counter("calls.IGeoObject.GetAttributes") > before);
   value.vt = VT_R8;
   value.dblVal = 2.0;
   CHECK(units->SetUnits(value) == S_OK);
+  CHECK(s.scene.FormatterOption(62) == L"I4:2");
   value.vt = VT_UNKNOWN;
   value.punkVal = nullptr;
   CHECK(units->SetUnits(value) == E_INVALIDARG);
+  CHECK(s.scene.FormatterOption(62) == L"I4:2");
 }
 
 TEST_CASE("dataset entries, hierarchy objects, an unreadable header and stray notifications") {
