@@ -178,8 +178,10 @@ HRESULT AXPictDescr::AddStored(IStorage* storage, const std::wstring& name, bool
   if (folder_.empty() || !GetTempFileNameW(folder_.c_str(), L"TIF", 0, path)) return kPictureNotCopied;
   ULONGLONG left = kCopyCap;
   STATSTG status{};
-  if (SUCCEEDED(stream->Stat(&status, STATFLAG_NONAME)) && status.cbSize.QuadPart < left)
-    left = status.cbSize.QuadPart;
+  // Streams answer S_OK with 0 bytes at their end: one that ends before the size it told
+  // has lost part of the picture, and a cut picture is no copy.
+  const bool sized = SUCCEEDED(stream->Stat(&status, STATFLAG_NONAME)) && status.cbSize.QuadPart < left;
+  if (sized) left = status.cbSize.QuadPart;
 
   bool copied = false;
   if (FILE* file = _wfopen(path, L"wb")) {
@@ -199,6 +201,7 @@ HRESULT AXPictDescr::AddStored(IStorage* storage, const std::wstring& name, bool
       }
       left -= read;
     }
+    if (sized && left > 0) copied = false;
     if (std::fclose(file) != 0) copied = false;
   }
   if (!copied) {

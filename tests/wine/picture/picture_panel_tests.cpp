@@ -328,6 +328,12 @@ TEST_CASE("copying a stored picture: exclusive read access, the stream's size, f
       REQUIRE(pictures.FillNames(&object, "pic.bin") == S_OK);
       CHECK(FileSize(pictures.PathAt(0)) == 2500);
     }
+    SUBCASE("a stream that ends before the size it tells: 0x80040322 and no partial file") {
+      object.storage.stream.statSize = 20000;
+      CHECK(pictures.FillNames(&object, "pic.bin") == br::picture::kPictureNotCopied);
+      CHECK(pictures.Count() == 0);
+      CHECK(TemporaryFiles(pictures.TemporaryFolder()) == 0);
+    }
     SUBCASE("without a size, up to the first empty read") {
       object.storage.stream.statSize = -1;
       REQUIRE(pictures.FillNames(&object, "pic.bin") == S_OK);
