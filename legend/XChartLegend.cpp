@@ -91,6 +91,8 @@ bool ReadAttribute(IGeoObject* object, long code, VARTYPE type, Variant& out) {
   ComRef<IGeoAttribute> attribute;
   if (object->GetAttribute(code, attribute.Out()) != S_OK || !attribute) return false;
   if (FAILED(attribute->GetValue(&out.value))) return false;
+  // An empty value is a missing one: the platform would make it 0.
+  if (out.value.vt == VT_EMPTY || out.value.vt == VT_NULL) return false;
   return ConvertTo(out.value, type);
 }
 

@@ -1,5 +1,7 @@
 #include "host/chartscene/model/scene_counters.h"
 
+#include "host/chartscene/model/scene_misanswers.h"
+
 #include <mutex>
 
 namespace br::chartscene {
@@ -68,6 +70,7 @@ void ClearFaults() {
   State& state = TheState();
   std::lock_guard<std::mutex> guard(state.lock);
   state.faults.clear();
+  ClearMisanswers();
 }
 
 std::optional<std::uint32_t> CallAndFault(std::string_view operation) {

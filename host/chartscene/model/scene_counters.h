@@ -24,6 +24,7 @@ std::map<std::string, long> Counters(const std::string& prefix);
 
 // The HRESULT an operation is to return, as a 32-bit pattern; 0 removes the fault.
 void SetFault(const std::string& operation, std::uint32_t result);
+// Also removes every misanswer (scene_misanswers.h).
 void ClearFaults();
 // Counts the call and gives the injected result, if any. Cheap enough for every call of a
 // client walking thousands of objects: no allocation once a counter exists.

@@ -1,5 +1,7 @@
 #include "host/chartscene/server/SceneAttribute.h"
 
+#include "host/chartscene/server/scene_misanswer_values.h"
+
 #include "host/chartscene/server/scene_variants.h"
 
 namespace br::chartscene {
@@ -30,6 +32,7 @@ STDMETHODIMP SceneAttribute::GetValue(VARIANT* value) {
   if (value == nullptr) return E_POINTER;
   VariantInit(value);
   SCENE_CALL("IGeoAttribute.GetValue");
+  if (MisanswerVariant("IGeoAttribute.GetValue", value)) return S_OK;
   return VariantFromTyped(scene_->Model().objects[object_].attributes[attribute_].value, value);
 }
 

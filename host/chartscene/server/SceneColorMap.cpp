@@ -1,5 +1,7 @@
 #include "host/chartscene/server/SceneColorMap.h"
 
+#include "host/chartscene/server/scene_misanswer_values.h"
+
 namespace br::chartscene {
 
 SceneColorMap::SceneColorMap(SceneRef scene, std::size_t index)
@@ -11,6 +13,7 @@ STDMETHODIMP SceneColorMap::GetPaletteIndex(long colorNumber, USHORT* index) {
   if (index == nullptr) return E_POINTER;
   *index = 0;
   SCENE_CALL("IColorMap.GetPaletteIndex");
+  SCENE_MISANSWER_NULL("IColorMap.GetPaletteIndex");
   const auto& indices = scene_->Model().colorMaps[index_].indices;
   const auto found = indices.find(colorNumber);
   if (found == indices.end()) return E_INVALIDARG;

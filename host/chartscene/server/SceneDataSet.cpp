@@ -1,5 +1,7 @@
 #include "host/chartscene/server/SceneDataSet.h"
 
+#include "host/chartscene/server/scene_misanswer_values.h"
+
 #include "host/chartscene/server/SceneRasterDataSet.h"
 #include "host/chartscene/server/scene_variants.h"
 
@@ -27,6 +29,7 @@ STDMETHODIMP SceneDataSet::GetDatabase(IGeoDatabase** database) {
   if (database == nullptr) return E_POINTER;
   *database = nullptr;
   SCENE_CALL("IGeoDataSet.GetDatabase");
+  SCENE_MISANSWER_NULL("IGeoDataSet.GetDatabase");
   *database = NewDatabase(scene_, scene_->Model().dataSets[index_].database);
   return S_OK;
 }
@@ -42,6 +45,10 @@ STDMETHODIMP SceneDataSet::GetHeader(SAFEARRAY** header) {
   if (header == nullptr) return E_POINTER;
   *header = nullptr;
   SCENE_CALL("IGeoDataSet.GetHeader");
+  if (MisanswerByteArray("IGeoDataSet.GetHeader", header,
+                         static_cast<ULONG>(scene_->Model().dataSets[index_].header.size()))) {
+    return S_OK;
+  }
   *header = ByteArray(scene_->Model().dataSets[index_].header);
   return *header ? S_OK : E_OUTOFMEMORY;
 }
@@ -50,6 +57,7 @@ STDMETHODIMP SceneDataSet::GetParameters(VARIANT* parameters) {
   if (parameters == nullptr) return E_POINTER;
   VariantInit(parameters);
   SCENE_CALL("IGeoDataSet.GetParameters");
+  if (MisanswerVariant("IGeoDataSet.GetParameters", parameters)) return S_OK;
   const SceneDataSetModel& model = scene_->Model().dataSets[index_];
   SAFEARRAY* array = SafeArrayCreateVector(VT_VARIANT, 0, static_cast<ULONG>(model.parameters.size()));
   if (array == nullptr) return E_OUTOFMEMORY;
@@ -88,6 +96,7 @@ STDMETHODIMP SceneDataSet::GetObjectById(REFGUID id, IGeoObject** object) {
   if (object == nullptr) return E_POINTER;
   *object = nullptr;
   SCENE_CALL("IGeoDataSet.GetObjectById");
+  SCENE_MISANSWER_NULL("IGeoDataSet.GetObjectById");
   const std::size_t found = FindObject(scene_->Model(), BytesOf(id));
   if (found == SIZE_MAX || scene_->Model().objects[found].dataSet != index_) return S_FALSE;
   *object = NewObject(scene_, found);
@@ -98,6 +107,7 @@ STDMETHODIMP SceneDataSet::GetObjectEnum(IGeoSelectionEnum** objects) {
   if (objects == nullptr) return E_POINTER;
   *objects = nullptr;
   SCENE_CALL("IGeoDataSet.GetObjectEnum");
+  SCENE_MISANSWER_NULL("IGeoDataSet.GetObjectEnum");
   *objects = NewSelectionEnum(scene_, index_);
   return S_OK;
 }
@@ -106,6 +116,7 @@ STDMETHODIMP SceneDataSet::GetDataSetProperty(long index, VARIANT* value) {
   if (value == nullptr) return E_POINTER;
   VariantInit(value);
   SCENE_CALL("IGeoDataSet.GetDataSetProperty");
+  if (MisanswerVariant("IGeoDataSet.GetDataSetProperty", value)) return S_OK;
   const auto& properties = scene_->Model().dataSets[index_].properties;
   const auto found = properties.find(index);
   if (found == properties.end()) return E_INVALIDARG;

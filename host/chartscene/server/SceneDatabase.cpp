@@ -1,5 +1,7 @@
 #include "host/chartscene/server/SceneDatabase.h"
 
+#include "host/chartscene/server/scene_misanswer_values.h"
+
 #include <cstring>
 
 #include "host/chartscene/server/scene_text.h"
@@ -81,6 +83,7 @@ STDMETHODIMP SceneDatabase::CreateSelection(long count, const GEO_SELECTION_RECO
   if (selection == nullptr) return E_POINTER;
   *selection = 0;
   SCENE_CALL("IGeoDatabase.CreateSelection");
+  SCENE_MISANSWER_NULL("IGeoDatabase.CreateSelection");
   if (count < 0 || (count > 0 && records == nullptr)) return E_INVALIDARG;
   std::vector<long> classes;
   for (long i = 0; i < count; ++i) classes.push_back(records[i].ClassCode);
@@ -132,6 +135,7 @@ STDMETHODIMP SceneDatabase::GetAttributeCode(const char* acronym, long* code) {
   if (code == nullptr) return E_POINTER;
   *code = 0;
   SCENE_CALL("IGeoCatalog.GetAttributeCode");
+  SCENE_MISANSWER_NULL("IGeoCatalog.GetAttributeCode");
   if (acronym == nullptr) return E_INVALIDARG;
   const CatalogueAttribute* found = scene_->Model().catalogue.AttributeByAcronym(acronym);
   if (found == nullptr) return E_INVALIDARG;
@@ -170,6 +174,11 @@ STDMETHODIMP SceneDatabase::GetEnumTextLength(long code, ULONG value, long* leng
   if (length == nullptr) return E_POINTER;
   *length = 0;
   SCENE_CALL("IGeoCatalog.GetEnumTextLength");
+  SCENE_MISANSWER_NULL("IGeoCatalog.GetEnumTextLength");
+  if (Misanswers("IGeoCatalog.GetEnumTextLength", Misanswer::HugeText)) {
+    *length = static_cast<long>(kHugeTextLength);
+    return S_OK;
+  }
   const std::string* text = scene_->Model().catalogue.EnumText(code, static_cast<long>(value));
   if (text == nullptr) return E_INVALIDARG;
   *length = static_cast<long>(text->size());
@@ -178,6 +187,9 @@ STDMETHODIMP SceneDatabase::GetEnumTextLength(long code, ULONG value, long* leng
 
 STDMETHODIMP SceneDatabase::GetEnumText(long code, ULONG value, long size, char* buffer) {
   SCENE_CALL("IGeoCatalog.GetEnumText");
+  if (Misanswers("IGeoCatalog.GetEnumText", Misanswer::HugeText)) {
+    return CopyCatalogueText(std::string(kHugeTextLength, 'x'), size, buffer);
+  }
   const std::string* text = scene_->Model().catalogue.EnumText(code, static_cast<long>(value));
   if (text == nullptr) return E_INVALIDARG;
   return CopyCatalogueText(*text, size, buffer);

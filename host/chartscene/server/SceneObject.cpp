@@ -1,5 +1,7 @@
 #include "host/chartscene/server/SceneObject.h"
 
+#include "host/chartscene/server/scene_misanswer_values.h"
+
 #include <cmath>
 
 #include "host/brgbase/map_metrics.h"
@@ -18,6 +20,7 @@ STDMETHODIMP SceneObject::GetDataSet(IGeoDataSet** dataSet) {
   if (dataSet == nullptr) return E_POINTER;
   *dataSet = nullptr;
   SCENE_CALL("IGeoObject.GetDataSet");
+  SCENE_MISANSWER_NULL("IGeoObject.GetDataSet");
   IUnknown* wrapper = NewDataSet(scene_, Model().dataSet);
   const HRESULT hr = wrapper->QueryInterface(IID_IGeoDataSet, reinterpret_cast<void**>(dataSet));
   wrapper->Release();
@@ -57,6 +60,7 @@ STDMETHODIMP SceneObject::GetAttribute(long code, IGeoAttribute** attribute) {
   if (attribute == nullptr) return E_POINTER;
   *attribute = nullptr;
   SCENE_CALL("IGeoObject.GetAttribute");
+  SCENE_MISANSWER_NULL("IGeoObject.GetAttribute");
   const auto& attributes = Model().attributes;
   for (std::size_t i = 0; i < attributes.size(); ++i) {
     if (attributes[i].code == code) {

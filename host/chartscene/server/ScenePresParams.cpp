@@ -1,5 +1,7 @@
 #include "host/chartscene/server/ScenePresParams.h"
 
+#include "host/chartscene/server/scene_misanswer_values.h"
+
 #include "host/chartscene/server/scene_variants.h"
 
 namespace br::chartscene {
@@ -13,6 +15,7 @@ STDMETHODIMP ScenePresParams::GetParam(long index, VARIANT* value) {
   if (value == nullptr) return E_POINTER;
   VariantInit(value);
   SCENE_CALL("IPresParams.GetParam");
+  if (MisanswerVariant("IPresParams.GetParam", value)) return S_OK;
   const auto& values = scene_->Model().presParams[index_].values;
   const auto found = values.find(index);
   if (found == values.end()) return E_INVALIDARG;

@@ -1,5 +1,7 @@
 #include "host/chartscene/server/SceneProjection.h"
 
+#include "host/chartscene/server/scene_misanswer_values.h"
+
 #include "host/chartscene/model/scene_geometry.h"
 
 namespace br::chartscene {
@@ -13,6 +15,7 @@ IGeoProjection* NewProjection(const SceneRef& scene, std::size_t projection) {
 
 STDMETHODIMP SceneProjection::GeoToPixel(const GEO_POINT* geo, POINT* pixels, long count) {
   SCENE_CALL("IGeoProjection.GeoToPixel");
+  SCENE_MISANSWER_NULL("IGeoProjection.GeoToPixel");
   if (geo == nullptr || pixels == nullptr) return E_POINTER;
   if (count < 0) return E_INVALIDARG;
   const SceneProjectionModel& projection = scene_->Model().projections[index_];

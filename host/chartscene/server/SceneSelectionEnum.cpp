@@ -1,5 +1,7 @@
 #include "host/chartscene/server/SceneSelectionEnum.h"
 
+#include "host/chartscene/server/scene_misanswer_values.h"
+
 #include <algorithm>
 
 namespace br::chartscene {
@@ -27,8 +29,28 @@ STDMETHODIMP SceneSelectionEnum::Next(ULONG count, IGeoObject** object, ULONG* f
   *fetched = 0;
   SCENE_CALL("IGeoSelectionEnum.Next");
   if (count != 1) return E_INVALIDARG;
+  if (MisanswerNull("IGeoSelectionEnum.Next")) {
+    *fetched = 1;  // claims an object and hands out none
+    return S_OK;
+  }
   const SceneModel& model = scene_->Model();
   const std::vector<std::size_t>& objects = model.dataSets[dataSet_].objects;
+  // Never at the end: start over, with the dataset's first object when none is selected.
+  if (next_ >= objects.size() && !objects.empty() && Misanswers("IGeoSelectionEnum.Next", Misanswer::Endless)) {
+    next_ = 0;
+    std::size_t given = objects.front();
+    while (next_ < objects.size()) {
+      const std::size_t candidate = objects[next_++];
+      if (!selected_ ||
+          std::find(classes_.begin(), classes_.end(), model.objects[candidate].classCode) != classes_.end()) {
+        given = candidate;
+        break;
+      }
+    }
+    *object = NewObject(scene_, given);
+    *fetched = 1;
+    return S_OK;
+  }
   while (next_ < objects.size()) {
     const std::size_t candidate = objects[next_++];
     if (!selected_ ||

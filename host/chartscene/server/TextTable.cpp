@@ -1,5 +1,7 @@
 #include "host/chartscene/server/TextTable.h"
 
+#include "host/chartscene/server/scene_misanswer_values.h"
+
 #include <fstream>
 #include <sstream>
 
@@ -53,6 +55,12 @@ STDMETHODIMP TextTable::GetText(BSTR section, long id, BSTR* text) {
     return static_cast<HRESULT>(*fault);
   }
   if (!loaded_) return E_UNEXPECTED;
+  SCENE_MISANSWER_NULL("ITextTable.GetText");
+  if (Misanswers("ITextTable.GetText", Misanswer::HugeText)) {
+    const std::wstring huge(kHugeTextLength, L'x');
+    *text = SysAllocStringLen(huge.data(), static_cast<UINT>(huge.size()));
+    return S_OK;
+  }
   const std::string key = Utf8FromWide(section, section ? SysStringLen(section) : 0);
   const std::optional<std::string> found = FindText(table_, key, id, language_);
   if (!found) return S_FALSE;

@@ -3,6 +3,7 @@
 #include <windows.h>
 
 #include "host/chartscene/model/scene_counters.h"
+#include "host/chartscene/model/scene_misanswers.h"
 #include "host/chartscene/server/SceneClassFactory.h"
 #include "host/chartscene/server/SceneModule.h"
 #include "host/chartscene/server/scene_classes.h"
@@ -61,3 +62,9 @@ extern "C" void WINAPI ChartSceneSetFault(const char* operation, HRESULT result)
 }
 
 extern "C" void WINAPI ChartSceneClearFaults() { ClearFaults(); }
+
+// Makes an operation answer S_OK wrongly from now on (kind: scene_misanswers.h's
+// Misanswer, 1 to 5); 0 removes it. ChartSceneClearFaults removes them all.
+extern "C" void WINAPI ChartSceneSetMisanswer(const char* operation, int kind) {
+  if (operation != nullptr && kind >= 0 && kind <= kMisanswerKinds) SetMisanswer(operation, static_cast<Misanswer>(kind));
+}

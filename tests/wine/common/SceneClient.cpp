@@ -47,6 +47,13 @@ br::com::ComRef<IUnknown> SceneClient::Component(const wchar_t* kind, const wcha
   return br::com::ComRef<IUnknown>::Adopt(result.punkVal);
 }
 
+long SceneClient::Palette(const wchar_t* name) {
+  VARIANT result;
+  REQUIRE(Call(L"Palette", name, result) == S_OK);
+  REQUIRE(result.vt == VT_I4);
+  return result.lVal;
+}
+
 HRESULT SceneClient::Call(const wchar_t* method, const wchar_t* text, VARIANT& result) {
   VariantInit(&result);
   DISPID id = 0;

@@ -22,6 +22,9 @@ public:
   // The scene's component of that kind ("DataSet", "Projection", "Object", ...) and name,
   // one reference for the caller; REQUIREd.
   br::com::ComRef<IUnknown> Component(const wchar_t* kind, const wchar_t* name);
+  // The scene's logical palette of that name, as the 32-bit number a host passes; the scene
+  // keeps it. REQUIREd.
+  long Palette(const wchar_t* name);
 
   // The sample scene: data/harbour/harbour.json of the source tree (BR_SOURCE_DIR).
   static std::wstring SamplePath();

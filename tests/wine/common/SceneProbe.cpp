@@ -30,7 +30,8 @@ SceneProbe::SceneProbe() : path_(RegisteredPath()) {
   counter_ = reinterpret_cast<decltype(counter_)>(entry("ChartSceneCounter"));
   setFault_ = reinterpret_cast<decltype(setFault_)>(entry("ChartSceneSetFault"));
   clearFaults_ = reinterpret_cast<decltype(clearFaults_)>(entry("ChartSceneClearFaults"));
-  REQUIRE((counter_ && setFault_ && clearFaults_));
+  setMisanswer_ = reinterpret_cast<decltype(setMisanswer_)>(entry("ChartSceneSetMisanswer"));
+  REQUIRE((counter_ && setFault_ && clearFaults_ && setMisanswer_));
 }
 
 ScopedEnvironment::ScopedEnvironment(const wchar_t* name, const wchar_t* value) : name_(name) {

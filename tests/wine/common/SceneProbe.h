@@ -17,6 +17,9 @@ public:
   long Counter(const char* name) const { return counter_(name); }
   // result 0 removes the fault.
   void SetFault(const char* operation, HRESULT result) const { setFault_(operation, result); }
+  // A wrong answer with success (kind: the stand-in's Misanswer, 1 to 5; 0 removes it).
+  void SetMisanswer(const char* operation, int kind) const { setMisanswer_(operation, kind); }
+  // Removes the faults and the wrong answers.
   void ClearFaults() const { clearFaults_(); }
 
   const std::wstring& Path() const { return path_; }
@@ -26,6 +29,7 @@ private:
   long(WINAPI* counter_)(const char*) = nullptr;
   void(WINAPI* setFault_)(const char*, HRESULT) = nullptr;
   void(WINAPI* clearFaults_)() = nullptr;
+  void(WINAPI* setMisanswer_)(const char*, int) = nullptr;
 };
 
 // Sets a process environment variable for its lifetime (the stand-in reads them when a

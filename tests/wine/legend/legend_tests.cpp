@@ -323,6 +323,13 @@ TEST_CASE("near and far magnetic variation objects") {
     scene.Load(text);
     REQUIRE(legend->SetLegendData(scene.dataSet.Get(), scene.projection.Get(), Unit(50), Unit(0)) == S_OK);
     CHECK(Read(legend.Get()).magneticVariation == 2.0);  // not 2 + 0.1 x the year number
+
+    // A missing value is no variation at all, not 0 degrees; a missing change counts as 0.
+    text.objects = MagVar("blank", 0.0, R"("VALMAG": null, "VALACM": 6, "RYRMGV": "2020")") + "," +
+                   MagVar("steady", 0.003, R"("VALMAG": 1.5, "VALACM": null, "RYRMGV": "2020")");
+    scene.Load(text);
+    REQUIRE(legend->SetLegendData(scene.dataSet.Get(), scene.projection.Get(), Unit(50), Unit(0)) == S_OK);
+    CHECK(Read(legend.Get()).magneticVariation == 1.5);  // from "steady", on the screen
   }
 }
 
