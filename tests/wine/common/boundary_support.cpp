@@ -134,4 +134,27 @@ void HostedControl::Close() {
   control_.Reset();
 }
 
+HRESULT InvokeByName(IDispatch* object, const wchar_t* name, WORD flags, std::vector<VARIANT> arguments,
+                     VARIANT* result) {
+  DISPID id = DISPID_UNKNOWN;
+  LPOLESTR names[] = {const_cast<LPOLESTR>(name)};
+  const HRESULT found = object->GetIDsOfNames(IID_NULL, names, 1, LOCALE_USER_DEFAULT, &id);
+  if (FAILED(found)) return found;
+  std::vector<VARIANT> reversed(arguments.rbegin(), arguments.rend());
+  DISPID put = DISPID_PROPERTYPUT;
+  DISPPARAMS parameters{reversed.empty() ? nullptr : reversed.data(), nullptr, static_cast<UINT>(reversed.size()), 0};
+  if (flags == DISPATCH_PROPERTYPUT) {
+    parameters.rgdispidNamedArgs = &put;
+    parameters.cNamedArgs = 1;
+  }
+  EXCEPINFO exception{};
+  UINT badArgument = 0;
+  const HRESULT hr = object->Invoke(id, IID_NULL, LOCALE_USER_DEFAULT, flags, &parameters, result, &exception,
+                                    &badArgument);
+  SysFreeString(exception.bstrSource);
+  SysFreeString(exception.bstrDescription);
+  SysFreeString(exception.bstrHelpFile);
+  return hr;
+}
+
 }  // namespace br::test::boundary

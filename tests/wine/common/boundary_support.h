@@ -93,6 +93,12 @@ SAFEARRAY* MakeRawArray(ULONG elementSize, ULONG count);
 // owns nor frees: an array that holds nothing however long a dimension says it is.
 SAFEARRAY* MakeEmptyTwoDimensionArray(IUnknown** data, ULONG claimed, bool emptyFirst);
 
+// A late-bound call: the member by name through GetIDsOfNames and IDispatch::Invoke, the
+// arguments in the order the member declares them (reversed here as DISPPARAMS wants);
+// DISPATCH_PROPERTYPUT passes the last one as the named put argument. result may be null.
+HRESULT InvokeByName(IDispatch* object, const wchar_t* name, WORD flags, std::vector<VARIANT> arguments,
+                     VARIANT* result = nullptr);
+
 // Out-parameters of the rows, holding markers until a call writes them.
 struct Outs {
   double value, second;
