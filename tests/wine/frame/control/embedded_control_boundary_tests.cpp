@@ -1,5 +1,6 @@
-// IEmbeddedControl of each control with bad input: only one dimension of 20 four-byte elements
-// from 0 replaces the shared palette; every call answers S_OK or E_POINTER.
+// IEmbeddedControl of each control (the tide controls and the contours view) with bad
+// input: only one dimension of 20 four-byte elements from 0 replaces the shared palette;
+// every call answers S_OK or E_POINTER.
 #include "tests/wine/common/boundary_support.h"
 
 #include "BR_Private.h"
@@ -14,7 +15,8 @@ namespace {
 
 constexpr int kFrameColour = 7;  // fills the frame of a TidesWindow without a port
 const std::pair<const char*, const CLSID*> kControls[] = {{"TidesWindow", &CLSID_TidesWindow},
-                                                          {"TidesPortList", &CLSID_TidesPortList}};
+                                                          {"TidesPortList", &CLSID_TidesPortList},
+                                                          {"XContoursView", &CLSID_XContoursView}};
 
 
 // The shared palette's colour 7 as an unhosted TidesWindow without a port draws it.
