@@ -1,9 +1,14 @@
-// Times XChartLegend::SetLegendData on a dataset of COUNT meta objects (default 10,000,
-// spread over a grid of the chart, every fifth one a magnetic variation object) held by the
-// stand-in chart host: a cache miss (the record reset first, so the header, parameters and
-// meta object list are read again) and a cache hit (the same dataset again: only the
-// position's hit tests), then one contours paint for comparison.
-//   legend_bench [COUNT] [REPEATS]
+// Times XChartLegend::SetLegendData on a dataset held by the stand-in chart host: COUNT
+// objects (default 10,000) spread over a grid of the chart, of which every META_EVERY-th is
+// a meta object (default 1: all), every fifth of those a magnetic variation object.
+//  - a cache miss (the record reset first, so the header, parameters and meta object list
+//    are read again) and a cache hit (the same dataset again: only the position's hit
+//    tests), each REPEATS times;
+//  - POSITIONS calls (default 1,000) at positions spread over the grid, as a host moving its
+//    cursor over the chart: total, median and worst;
+//  - one contours paint for comparison.
+//   legend_bench [COUNT] [REPEATS] [POSITIONS] [META_EVERY]
+//   legend_bench 100000 5 1000 100    the scale run: 100,000 objects, 1,000 meta objects
 #include "BR_Info.h"
 #include "GeoData.h"
 #include "bench/common/contours_setup.h"
@@ -32,7 +37,7 @@ int Fail(const char* message) {
 double Ms(Clock::time_point since) { return std::chrono::duration<double, std::milli>(Clock::now() - since).count(); }
 
 // A scene of one chart dataset with count meta objects on a grid around 50 N 0 E.
-std::string SceneJson(int count) {
+std::string SceneJson(int count, int metaEvery) {
   const char* classes[] = {"M_QUAL", "M_ACCY", "M_SDAT", "M_VDAT", "MAGVAR"};
   const char* attributes[] = {R"("CATZOC": 3)", R"("POSACC": {"R4": 2.5})", R"("VERDAT": 23)", R"("VERDAT": 3)",
                               R"("VALMAG": 1.5, "VALACM": 6, "RYRMGV": "2020")"};
@@ -44,8 +49,16 @@ std::string SceneJson(int count) {
   for (int i = 0; i < count; ++i) {
     const double lat = 49.5 + (i / side % side) * 0.01, lon = -0.5 + (i % side) * 0.01;
     char object[256];
-    std::snprintf(object, sizeof object, R"(%s{"name": "m%d", "class": "%s", "point": [%.4f, %.4f], "attributes": {%s}})",
-                  i ? ",\n" : "", i, classes[i % 5], lat, lon, attributes[i % 5]);
+    if (i % metaEvery == 0) {
+      const int meta = i / metaEvery;
+      std::snprintf(object, sizeof object,
+                    R"(%s{"name": "m%d", "class": "%s", "point": [%.4f, %.4f], "attributes": {%s}})",
+                    i ? ",\n" : "", i, classes[meta % 5], lat, lon, attributes[meta % 5]);
+    } else {
+      std::snprintf(object, sizeof object,
+                    R"(%s{"name": "m%d", "class": "SOUNDG", "point": [%.4f, %.4f], "attributes": {"VALSOU": %d}})",
+                    i ? ",\n" : "", i, lat + 0.005, lon + 0.005, i % 40);
+    }
     json += object;
   }
   json += R"(]}]}], "projections": [{"name": "p", "kind": "mercator", "centre": [50, 0], "pixelsPerDegree": 1000}]})";
@@ -112,7 +125,7 @@ double ContoursPaint() {
   return drawn ? ms : -1;
 }
 
-int Run(int count, int repeats) {
+int Run(int count, int repeats, int positions, int metaEvery) {
   IDispatch* scene = nullptr;
   CLSID sceneClass{};
   if (FAILED(CLSIDFromProgID(L"ChartScene.Scene", &sceneClass)) ||
@@ -125,7 +138,7 @@ int Run(int count, int repeats) {
   const std::wstring file = std::wstring(folder) + L"legend_bench_scene.json";
   {
     std::ofstream out(file.c_str(), std::ios::binary);
-    out << SceneJson(count);
+    out << SceneJson(count, metaEvery);
   }
   const Clock::time_point loading = Clock::now();
   VARIANT loaded = Call(scene, L"Load", file);
@@ -159,12 +172,26 @@ int Run(int count, int repeats) {
   long edition = 0;
   legend->get_EditionNumber(&edition);
   if (found != S_OK || edition != 3) return Fail("the legend was not filled");
-  const Timing miss = Summary(misses), hit = Summary(hits);
-  std::printf("scene of %d meta objects loaded in %.1f ms\n", count, loadMs);
+  // A cursor moving over the grid (and off it): every call a cache hit of new positions.
+  std::vector<double> moves;
+  const Clock::time_point sweeping = Clock::now();
+  for (int i = 0; i < positions; ++i) {
+    const long moveLa = 495000000 + static_cast<long>((i * 7919L) % 110) * 100000;
+    const long moveFi = -5000000 + static_cast<long>((i * 104729L) % 110) * 100000;
+    const Clock::time_point start = Clock::now();
+    legend->SetLegendData(dataSet.punkVal, projection.punkVal, moveLa, moveFi);
+    moves.push_back(Ms(start));
+  }
+  const double sweepMs = Ms(sweeping);
+  const Timing miss = Summary(misses), hit = Summary(hits), move = Summary(moves);
+  std::printf("scene of %d objects (%d meta objects) loaded in %.1f ms\n", count, (count + metaEvery - 1) / metaEvery,
+              loadMs);
   std::printf("SetLegendData, cache miss: %.3f ms median, %.3f ms worst (%d calls)\n", miss.median, miss.worst,
               repeats);
   std::printf("SetLegendData, cache hit:  %.3f ms median, %.3f ms worst (%d calls)\n", hit.median, hit.worst,
               repeats);
+  std::printf("SetLegendData at %d positions: %.1f ms in all, %.3f ms median, %.3f ms worst\n", positions, sweepMs,
+              move.median, move.worst);
   const double paint = ContoursPaint();
   if (paint < 0) return Fail("the contours view did not paint");
   std::printf("one contours paint, 300 x 600, four shades: %.3f ms\n", paint);
@@ -181,9 +208,13 @@ int Run(int count, int repeats) {
 int wmain(int argc, wchar_t** argv) {
   const int count = argc > 1 ? static_cast<int>(std::wcstol(argv[1], nullptr, 10)) : 10000;
   const int repeats = argc > 2 ? static_cast<int>(std::wcstol(argv[2], nullptr, 10)) : 20;
-  if (count < 1 || count > 1000000 || repeats < 1) return Fail("COUNT and REPEATS must be positive");
+  const int positions = argc > 3 ? static_cast<int>(std::wcstol(argv[3], nullptr, 10)) : 1000;
+  const int metaEvery = argc > 4 ? static_cast<int>(std::wcstol(argv[4], nullptr, 10)) : 1;
+  if (count < 1 || count > 1000000 || repeats < 1 || positions < 1 || metaEvery < 1) {
+    return Fail("COUNT, REPEATS, POSITIONS and META_EVERY must be positive");
+  }
   if (FAILED(CoInitializeEx(nullptr, COINIT_APARTMENTTHREADED))) return Fail("COM cannot start");
-  const int result = Run(count, repeats);
+  const int result = Run(count, repeats, positions, metaEvery);
   CoUninitialize();
   return result;
 }
