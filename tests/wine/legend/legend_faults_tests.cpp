@@ -210,7 +210,6 @@ TEST_CASE("every host operation of SetLegendData failing or answering wrongly") 
     }
     // Every operation of the table is one SetLegendData calls.
     CHECK(reachedOperations.size() == sizeof kRows / sizeof kRows[0]);
-    MESSAGE(sweep.Summary("XChartLegend", sizeof kRows / sizeof kRows[0]));
     std::printf("%s\n", sweep.Summary("XChartLegend", sizeof kRows / sizeof kRows[0]).c_str());
     const std::string lines = ReadWholeFile(log);
     CHECK(lines.find("CXChartLegend::SetLegendData") != std::string::npos);
