@@ -28,6 +28,14 @@ bool HandleIn(const VARIANT& value, HBITMAP& bitmap) {
   return false;
 }
 
+// value with one level of reference taken away. A reference to nothing is refused here:
+// the platform's copy would read through it.
+bool CopyPlain(const VARIANT& value, VARIANT& plain) {
+  VariantInit(&plain);
+  if ((value.vt & VT_BYREF) && !value.byref) return false;
+  return SUCCEEDED(VariantCopyInd(&plain, const_cast<VARIANT*>(&value)));
+}
+
 }  // namespace
 
 const br::com::ClassIdentity XPICREPView::kClass = {&CLSID_XPICREPView, &IID_IXPICREPView,
@@ -86,8 +94,7 @@ STDMETHODIMP XPICREPView::put_Property(PRV_PROPERTY code, VARIANT value) {
   return Guard([&]() -> HRESULT {
     // Script hosts hand values by reference.
     VARIANT plain;
-    VariantInit(&plain);
-    if (FAILED(VariantCopyInd(&plain, &value))) return E_INVALIDARG;
+    if (!CopyPlain(value, plain)) return E_INVALIDARG;
     HRESULT hr = E_INVALIDARG;
     switch (code) {
       case PRV_PICFILENAME: hr = PutFileName(plain); break;
@@ -278,8 +285,7 @@ bool XPICREPView::OnMessage(HWND window, UINT message, WPARAM wParam, LPARAM, LR
 HRESULT XPICREPView::SetPalette(const VARIANT& palette) {
   VARIANT number, source;
   VariantInit(&number);
-  VariantInit(&source);
-  if (FAILED(VariantCopyInd(&source, const_cast<VARIANT*>(&palette)))) return E_INVALIDARG;
+  if (!CopyPlain(palette, source)) return E_INVALIDARG;
   const HRESULT hr = VariantChangeType(&number, &source, 0, VT_UI4);
   VariantClear(&source);
   if (FAILED(hr)) return E_INVALIDARG;
