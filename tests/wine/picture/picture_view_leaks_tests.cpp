@@ -48,7 +48,7 @@ TEST_CASE("paints, font changes, palette replacements and new pictures leave the
       Canvas canvas(200, 150);
       DrawControl(hosted.Control(), canvas);
     });
-    CheckGdiFlat("pictures replaced", 1000, [&](int i) {
+    CheckGdiFlat("pictures replaced", 200, [&](int i) {
       switch (i % 4) {
         case 0: view->put_Property(PRV_PICFILENAME, Variant::Bstr(png).get()); break;
         case 1: {
