@@ -56,6 +56,8 @@ bool ParseChartOptions(const std::vector<std::string>& arguments, ChartOptions& 
       if (!value(options.presParams)) return false;
     } else if (name == "--select") {
       if (!value(options.select)) return false;
+    } else if (name == "--tab") {
+      if (!value(options.tab)) return false;
     } else if (name == "--catalogue") {
       if (!value(options.catalogue)) return false;
     } else if (name == "--click") {
@@ -89,8 +91,10 @@ void WriteChartUsage(std::ostream& out) {
          "  --catalogue DIR     the folder of gdal-data's S-57 files (default: s57 beside the program)\n"
          "  --click X,Y         pick the objects at that pixel, as a click does; repeatable\n"
          "  --select NAME       select the object of that scene name (after any clicks)\n"
+         "  --tab TITLE         bring the inspector's details tab of that title forward\n"
+         "                      (\"Lights\", \"Tidal stream\", ...)\n"
          "  --screenshot FILE   write the chart as PNG and exit, without showing a window;\n"
-         "                      the picked objects are printed, one line each\n"
+         "                      the picked objects and the inspector's tree are printed\n"
          "  --help              this text\n"
          "\n"
          "Exit codes: 0 done, 1 the scene, a component or the picture failed, 2 a wrong command line.\n";

@@ -22,6 +22,7 @@ struct ChartOptions {
   std::string catalogue;   // folder of the S-57 files ("" = looked for)
   std::vector<ChartClick> clicks;  // --click X,Y: pick there, as a click does
   std::string select;      // an object (by its scene name) to select, as after a pick
+  std::string tab;         // the inspector's details tab to bring forward ("" = as it chooses)
   std::string screenshot;  // "" = interactive
   bool help = false;
 };

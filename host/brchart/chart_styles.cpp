@@ -88,6 +88,8 @@ ClassStyle StyleOf(const std::string& acronym, long primitive) {
     if (acronym == "LIGHTS") return Point(Symbol::Flare, kMagenta, 6);
     if (StartsWith(acronym, "BOY") || StartsWith(acronym, "BCN")) return Point(Symbol::Circle, kBlack, 4);
     if (acronym == "LNDMRK" || acronym == "BUISGL") return Point(Symbol::Square, kBlack, 4);
+    // A tidal stream diamond: its letter refers to the table of the stream there.
+    if (StartsWith(acronym, "TS_")) return Point(Symbol::Diamond, kMagenta, 5);
     if (acronym == "UWTROC" || acronym == "WRECKS" || acronym == "OBSTRN") return Point(Symbol::Cross, kBlack, 4);
     return Point(Symbol::Dot, kBlack, 1);
   }

@@ -17,7 +17,7 @@ struct Rgb {
 };
 
 enum class Mark { None, Fill, Outline, Line, Symbol };
-enum class Symbol { Dot, Circle, Square, Cross, Flare };
+enum class Symbol { Dot, Circle, Square, Cross, Flare, Diamond };
 enum class Dash { Solid, Dashed, Dotted };
 
 struct ClassStyle {

@@ -11,7 +11,8 @@ TEST_CASE("brchart options: scene, components, clicks and the picture") {
   std::string error;
   REQUIRE(ParseChartOptions({"--scene", "C:\\charts\\brest.json", "--projection", "overview", "--palette", "dusk",
                              "--colormap", "day", "--presparams", "two-shades", "--click", "512,384", "--click",
-                             "-3 7", "--screenshot", "chart.png", "--catalogue", "Z:\\usr\\share\\gdal", "--select", "fillettes-beacon"},
+                             "-3 7", "--screenshot", "chart.png", "--catalogue", "Z:\\usr\\share\\gdal", "--select", "fillettes-beacon",
+                             "--tab", "Tidal stream"},
                             o, error));
   CHECK(o.scene == "C:\\charts\\brest.json");
   CHECK(o.projection == "overview");
@@ -21,6 +22,7 @@ TEST_CASE("brchart options: scene, components, clicks and the picture") {
   CHECK(o.catalogue == "Z:\\usr\\share\\gdal");
   CHECK(o.screenshot == "chart.png");
   CHECK(o.select == "fillettes-beacon");
+  CHECK(o.tab == "Tidal stream");
   REQUIRE(o.clicks.size() == 2);
   CHECK((o.clicks[0].x == 512 && o.clicks[0].y == 384));
   CHECK((o.clicks[1].x == -3 && o.clicks[1].y == 7));
@@ -46,6 +48,7 @@ TEST_CASE("brchart options: wrong command lines are refused with a message") {
       {{"--click", "200000,2"}, "--click wants X,Y in pixels of the chart"},
       {{"--click", "-,2"}, "--click wants X,Y in pixels of the chart"},
       {{"--select"}, "--select wants a value"},
+      {{"--tab", ""}, "--tab wants a value"},
       {{"--selected", "x"}, "unknown option --selected (brchart --help lists them)"},
       {{"chart.json"}, "unknown option chart.json (brchart --help lists them)"},
   };
@@ -66,7 +69,7 @@ TEST_CASE("brchart usage names every option and the exit codes") {
   WriteChartUsage(out);
   const std::string text = out.str();
   for (const char* word : {"--scene", "--projection", "--colormap", "--palette", "--presparams", "--catalogue",
-                           "--click", "--select", "--screenshot", "--help", "Exit codes: 0"}) {
+                           "--click", "--select", "--tab", "--screenshot", "--help", "Exit codes: 0"}) {
     CAPTURE(word);
     CHECK(text.find(word) != std::string::npos);
   }

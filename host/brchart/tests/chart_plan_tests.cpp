@@ -178,6 +178,11 @@ TEST_CASE("the chart plan: what is drawn, how, and in which order") {
   CHECK(beacon->colour == Rgb{220, 0, 0});     // COLOUR [3, 1, 3]: red
   CHECK(ItemOf(items, scene, "kerviniou-buoy")->colour == Rgb{0, 160, 0});  // [4]: green
   CHECK(ItemOf(items, scene, "minou-light-white")->style.symbol == Symbol::Flare);
+  // The tidal stream table is drawn where it applies, as a diamond.
+  const DrawItem* stream = ItemOf(items, scene, "goulet-stream");
+  REQUIRE(stream);
+  CHECK(stream->style.symbol == Symbol::Diamond);
+  CHECK(stream->style.mark == Mark::Symbol);
   // Named symbols carry their names to be written beside them; areas and unnamed points do not.
   CHECK(beacon->label == "Fillettes");
   CHECK(ItemOf(items, scene, "harbour-entry")->label == "Entr\xC3\xA9" "e du port");
