@@ -21,7 +21,9 @@ std::unique_ptr<toolkit::Layout> CardLayout() {
 }  // namespace
 
 InspectorPanel::InspectorPanel(Owner& owner, const PanelSettings& settings)
-    : toolkit::Panel(std::make_unique<toolkit::GridLayout>(1, 2, 3, 0, "35,65")),
+    // The one row takes the whole height: by default a grid row is only as tall as its
+    // tallest child wants, which left the tree and the tabs a strip at the top.
+    : toolkit::Panel(std::make_unique<toolkit::GridLayout>(1, 2, 3, 0, "35,65", toolkit::kAlignCenter)),
       owner_(owner),
       cards_(CardLayout()),
       hierarchy_(settings, 1),

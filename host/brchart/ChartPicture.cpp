@@ -119,6 +119,13 @@ void ChartPicture::DrawItem(HDC dc, const br::brchart::DrawItem& item) const {
           Polygon(dc, flare, 3);
           break;
         }
+        case Symbol::Diamond: {
+          // Outlined, so the water's shade shows through as on a paper chart.
+          const Selected pen(dc, CreatePen(PS_SOLID, 2, colour));
+          const POINT diamond[5] = {{p.x, p.y - r}, {p.x + r, p.y}, {p.x, p.y + r}, {p.x - r, p.y}, {p.x, p.y - r}};
+          Polyline(dc, diamond, 5);
+          break;
+        }
         case Symbol::Dot:
         default: {
           const Selected brush(dc, CreateSolidBrush(colour));

@@ -1,6 +1,9 @@
 #include "host/brchart/ChartWindow.h"
 
 #include <windowsx.h>
+#include <commctrl.h>
+
+#include <functional>
 
 #include <cstdint>
 #include <cstring>
@@ -350,10 +353,96 @@ bool ChartWindow::SelectNamed(const std::string& name) {
   picked_ = "selected: " + session_.PickedText().substr(session_.PickedText().find(": ") + 2);
   inspected_.clear();
   Inspect();
+  // SetInfo leaves the dataset header chosen; a selection by name means the object itself.
+  ChooseFirstInspected();
   const auto& shape = session_.Scene().objects[session_.Picked().front()].geometry;
   ShowStatusAt(shape.empty() ? nullptr : &shape.front());
   InvalidateRect(window_, nullptr, FALSE);
   return true;
+}
+
+HWND ChartWindow::InspectorChild(const wchar_t* className) const {
+  if (!inspectorHost_) return nullptr;
+  struct Search {
+    const wchar_t* className;
+    HWND found;
+  } search{className, nullptr};
+  EnumChildWindows(
+      inspectorHost_,
+      [](HWND child, LPARAM data) -> BOOL {
+        auto* s = reinterpret_cast<Search*>(data);
+        wchar_t name[64] = {};
+        GetClassNameW(child, name, 64);
+        if (lstrcmpiW(name, s->className) != 0) return TRUE;
+        s->found = child;
+        return FALSE;
+      },
+      reinterpret_cast<LPARAM>(&search));
+  return search.found;
+}
+
+void ChartWindow::ChooseFirstInspected() {
+  HWND tree = InspectorChild(WC_TREEVIEWW);
+  if (!tree) return;
+  // Record 1 is the first object handed over (0 is the dataset header).
+  HTREEITEM found = nullptr;
+  std::function<void(HTREEITEM)> walk = [&](HTREEITEM item) {
+    for (; item && !found; item = TreeView_GetNextSibling(tree, item)) {
+      TVITEMW data{};
+      data.mask = TVIF_PARAM | TVIF_HANDLE;
+      data.hItem = item;
+      if (SendMessageW(tree, TVM_GETITEMW, 0, reinterpret_cast<LPARAM>(&data)) && data.lParam == 1) found = item;
+      else walk(TreeView_GetChild(tree, item));
+    }
+  };
+  walk(TreeView_GetRoot(tree));
+  if (found) TreeView_SelectItem(tree, found);
+}
+
+std::vector<std::string> ChartWindow::InspectorTreeLines() {
+  std::vector<std::string> lines;
+  HWND tree = InspectorChild(WC_TREEVIEWW);
+  if (!tree) return lines;
+  const HTREEITEM selected = TreeView_GetSelection(tree);
+  std::function<void(HTREEITEM, int)> walk = [&](HTREEITEM item, int depth) {
+    for (; item && lines.size() < 1000; item = TreeView_GetNextSibling(tree, item)) {
+      wchar_t text[512] = {};
+      TVITEMW data{};
+      data.mask = TVIF_TEXT | TVIF_HANDLE;
+      data.hItem = item;
+      data.pszText = text;
+      data.cchTextMax = 512;
+      if (!SendMessageW(tree, TVM_GETITEMW, 0, reinterpret_cast<LPARAM>(&data))) continue;
+      const int n = WideCharToMultiByte(CP_UTF8, 0, text, -1, nullptr, 0, nullptr, nullptr);
+      std::string label(n > 0 ? n - 1 : 0, '\0');
+      if (n > 1) WideCharToMultiByte(CP_UTF8, 0, text, -1, &label[0], n, nullptr, nullptr);
+      lines.push_back(std::string(static_cast<std::size_t>(depth) * 2, ' ') + (item == selected ? "* " : "") + label);
+      walk(TreeView_GetChild(tree, item), depth + 1);
+    }
+  };
+  walk(TreeView_GetRoot(tree), 0);
+  return lines;
+}
+
+bool ChartWindow::ShowInspectorTab(const std::string& title) {
+  HWND strip = InspectorChild(WC_TABCONTROLW);
+  if (!strip) return false;
+  const std::wstring wanted = FromUtf8(title);
+  const int count = TabCtrl_GetItemCount(strip);
+  for (int i = 0; i < count; ++i) {
+    wchar_t text[128] = {};
+    TCITEMW item{};
+    item.mask = TCIF_TEXT;
+    item.pszText = text;
+    item.cchTextMax = 128;
+    if (!SendMessageW(strip, TCM_GETITEMW, static_cast<WPARAM>(i), reinterpret_cast<LPARAM>(&item)) || lstrcmpiW(text, wanted.c_str()) != 0) continue;
+    // As a click on the tab does: the strip's owner hears of the change.
+    TabCtrl_SetCurSel(strip, i);
+    NMHDR note{strip, static_cast<UINT_PTR>(GetDlgCtrlID(strip)), static_cast<UINT>(TCN_SELCHANGE)};
+    SendMessageW(GetParent(strip), WM_NOTIFY, note.idFrom, reinterpret_cast<LPARAM>(&note));
+    return true;
+  }
+  return false;
 }
 
 void ChartWindow::Paint() {

@@ -49,6 +49,11 @@ public:
   void PickAt(long x, long y);
   // Selects one object by scene name; false when there is none.
   bool SelectNamed(const std::string& name);
+  // The inspector's tree as a person reads it: one line per item, two spaces per level,
+  // "* " before the selected one (UTF-8; empty without an inspector).
+  std::vector<std::string> InspectorTreeLines();
+  // Brings the inspector's details tab of that title to the front; false when it is not shown.
+  bool ShowInspectorTab(const std::string& title);
   // The status line's text (UTF-8).
   const std::string& Status() const { return status_; }
   // A note shown at the end of the status line (e.g. why picking is unavailable).
@@ -70,6 +75,9 @@ private:
   // The inspector chose an object: it alone is highlighted on the chart.
   void OnInspectorSelection(const DISPPARAMS& params);
   std::size_t ObjectOfGuid(const std::string& guid) const;  // SIZE_MAX for none
+  HWND InspectorChild(const wchar_t* className) const;       // a window of that class inside the inspector
+  // Chooses the first picked object in the inspector's tree, as a person's click there does.
+  void ChooseFirstInspected();
 
   ChartSession& session_;
   HWND window_ = nullptr;

@@ -84,6 +84,8 @@ int Run(const ChartOptions& options) {
                   AcronymOf(session.Scene(), session.Picked().front()).c_str(),
                   LabelOf(session.Scene(), session.Picked().front()).c_str());
   }
+  if (!options.tab.empty() && !window.ShowInspectorTab(options.tab))
+    return Fail("the inspector shows no tab " + options.tab);
   if (!options.screenshot.empty()) {
     // The window as it would look, never shown: chart, depth panel and status line.
     int width = 0, height = 0;
@@ -99,6 +101,7 @@ int Run(const ChartOptions& options) {
     if (window.HasInspector()) {
       const std::string guid = window.InspectedGuid();
       std::printf("inspected %s %s\n", guid.empty() ? "nothing" : guid.c_str(), window.InspectedName().c_str());
+      for (const std::string& line : window.InspectorTreeLines()) std::printf("tree: %s\n", line.c_str());
     }
     return kExitOk;
   }

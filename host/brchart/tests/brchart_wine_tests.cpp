@@ -262,13 +262,66 @@ TEST_CASE("--select rings one object by name and names it in the status line") {
   // The object's own position, the legend there, then the selection.
   const std::size_t status = run.out.find("status: 48\xC2\xB0" "20.520'N 004\xC2\xB0" "35.880'W   [1:22000, ");
   REQUIRE(status != std::string::npos);
-  CHECK(run.out.find("]   selected: Kerviniou (BOYLAT)\n", status) != std::string::npos);
+  // The inspector chooses it too, and says so.
+  CHECK(run.out.find("]   selected: Kerviniou (BOYLAT)   inspected: Kerviniou (BOYLAT)\n", status) != std::string::npos);
   {
     Png png(path);
     REQUIRE(png.Ok());
     CHECK(Text(png.At(buoy.x + 10, buoy.y)) == "#FF0000");
     CHECK(Text(png.At(buoy.x, buoy.y)) == "#00A000");
     CHECK(Text(png.At(beacon.x + 10, beacon.y)) != "#FF0000");  // the click's pick is replaced
+  }
+  DeleteFileW(path.c_str());
+}
+
+TEST_CASE("--select chooses the object in the inspector's tree, with its light under it") {
+  const std::wstring path = TempPath(L"brchart_tree.png");
+  const std::string file(path.begin(), path.end());
+  const Run run = Brchart("--select fillettes-beacon --screenshot \"" + file + "\"");
+  REQUIRE(run.exit == kExitOk);
+  // The dataset header first, the beacon chosen beside it, its light one level down.
+  const std::size_t header = run.out.find("tree: DataSet FR5BR010   BREST\n");
+  REQUIRE(header != std::string::npos);
+  const std::size_t beacon = run.out.find("\ntree: * Beacon, lateral Fillettes\n", header);
+  CHECK(beacon != std::string::npos);
+  CHECK(run.out.find("\ntree:   Light Fillettes light\n", beacon) != std::string::npos);
+  // The object itself is what the inspector reports chosen, not the header.
+  CHECK(run.out.find("inspected {") != std::string::npos);
+  CHECK(run.out.find("} fillettes-beacon\n") != std::string::npos);
+  CHECK(run.out.find("inspected: Fillettes (BCNLAT)") != std::string::npos);
+  {
+    // The tree and the details fill the inspector's height: near its foot both still show
+    // their white window, not the grey of the window behind a strip at the top.
+    Harbour harbour;
+    Png png(path);
+    REQUIRE(png.Ok());
+    const int chartWidth = harbour.display.projection->width, chartHeight = harbour.display.projection->height;
+    CHECK(png.Width() == static_cast<UINT>(chartWidth + 110 + 420));
+    const int left = chartWidth + 110, foot = chartHeight - 40;
+    CHECK(Text(png.At(left + 420 * 35 / 100 / 2, foot)) == "#FFFFFF");
+    CHECK(Text(png.At(left + 420 * 35 / 100 + 420 * 65 / 100 / 2, foot)) == "#FFFFFF");
+  }
+  DeleteFileW(path.c_str());
+}
+
+TEST_CASE("--tab brings a details tab forward; a tab the object does not show is refused") {
+  const std::wstring path = TempPath(L"brchart_tab.png");
+  const std::string file(path.begin(), path.end());
+  SUBCASE("the lit beacon's lights") {
+    const Run run = Brchart("--select fillettes-beacon --tab Lights --screenshot \"" + file + "\"");
+    CHECK(run.exit == kExitOk);
+    CHECK(run.err.empty());
+  }
+  SUBCASE("a buoy without a light has no lights tab") {
+    const Run run = Brchart("--select kerviniou-buoy --tab Lights --screenshot \"" + file + "\"");
+    CHECK(run.exit == kExitFailed);
+    CHECK(run.err == "brchart: the inspector shows no tab Lights\n");
+  }
+  SUBCASE("the tidal stream diamond is chosen in the tree") {
+    const Run run = Brchart("--select goulet-stream --screenshot \"" + file + "\"");
+    REQUIRE(run.exit == kExitOk);
+    CHECK(run.out.find("\ntree: * Tidal stream panel data Goulet\n") != std::string::npos);
+    CHECK(run.out.find("} goulet-stream\n") != std::string::npos);
   }
   DeleteFileW(path.c_str());
 }
