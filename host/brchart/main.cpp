@@ -100,7 +100,8 @@ int Run(const ChartOptions& options) {
     std::printf("status: %s\n", window.Status().c_str());
     if (window.HasInspector()) {
       const std::string guid = window.InspectedGuid();
-      std::printf("inspected %s %s\n", guid.empty() ? "nothing" : guid.c_str(), window.InspectedName().c_str());
+      const std::string name = window.InspectedName();
+      std::printf("inspected %s%s%s\n", guid.empty() ? "nothing" : guid.c_str(), name.empty() ? "" : " ", name.c_str());
       for (const std::string& line : window.InspectorTreeLines()) std::printf("tree: %s\n", line.c_str());
     }
     return kExitOk;
