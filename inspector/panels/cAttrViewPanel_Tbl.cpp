@@ -8,6 +8,18 @@
 
 namespace br::inspector {
 
+namespace {
+std::wstring AnsiWide(const std::string& text) {
+  if (text.empty() || text.size() > 0x7FFFFFF) return {};
+  const int bytes = static_cast<int>(text.size());
+  const int size = MultiByteToWideChar(CP_ACP, 0, text.data(), bytes, nullptr, 0);
+  if (size <= 0) return {};
+  std::wstring wide(static_cast<std::size_t>(size), L'\0');
+  MultiByteToWideChar(CP_ACP, 0, text.data(), bytes, wide.data(), size);
+  return wide;
+}
+}  // namespace
+
 cAttrViewPanel_Tbl::cAttrViewPanel_Tbl(const PanelSettings& settings) : cP_SHPanel(settings, TwoColumns{}) {
   table().setColumnWidth(kNameColumn, 140);
 }
@@ -16,26 +28,28 @@ const toolkit::ClassRecord* cAttrViewPanel_Tbl::getClassRecord() const {
   return &toolkit::records::cAttrViewPanel_Tbl;
 }
 
-void cAttrViewPanel_Tbl::AddRow(const std::string& name, const std::string& value) {
+void cAttrViewPanel_Tbl::AddRow(const std::wstring& name, const std::wstring& value) {
   if (name.empty() || value.empty()) return;
   const int row = AppendRow(kRowAttribute, kNameColumn, name);
-  if (row >= 0) table().setCellText(kTextColumn, row, value.c_str());
+  if (row >= 0) table().setCellWideText(kTextColumn, row, value);
 }
 
-void cAttrViewPanel_Tbl::AddHeading(const std::string& label) { AppendRow(kRowHeading, kNameColumn, label); }
+void cAttrViewPanel_Tbl::AddHeading(const std::wstring& label) { AppendRow(kRowHeading, kNameColumn, label); }
 
 HRESULT cAttrViewPanel_Tbl::FillDataSetMetadata(IUnknown* owner, REFGUID id) {
   std::vector<MetadataRow> rows;
   const HRESULT hr = ReadDataSetMetadata(owner, id, &agencies_, rows);
   if (FAILED(hr)) return hr == E_INVALIDARG ? hr : E_FAIL;
+  // Metadata texts are read in the ANSI code page; the rows take them widened.
   for (const MetadataRow& row : rows) {
     if (row.caption == kHeadingCaption) {
-      if (!row.value.empty()) AddHeading(row.value);
+      if (!row.value.empty()) AddHeading(AnsiWide(row.value));
     } else {
-      AddRow(row.caption, row.value);
+      AddRow(AnsiWide(row.caption), AnsiWide(row.value));
     }
   }
   doLayout();
+  LayOutRows();
   return S_OK;
 }
 
@@ -48,15 +62,7 @@ bool cAttrViewPanel_Tbl::DrawCell(HDC dc, const RECT& rect, int column, int row)
   if (type == kRowHeading && column != kNameColumn) return true;
   RECT area = rect;
   if (type == kRowHeading) area.right = std::max(area.right, static_cast<LONG>(table().getClientRect().right));
-  FillRect(dc, &area, GetSysColorBrush(COLOR_WINDOW));
-  RECT text = area;
-  text.left += type == kRowHeading ? 4 : 8;
-  std::string cell = table().getCellText(row, column);
-  std::replace(cell.begin(), cell.end(), '\r', ' ');
-  SetBkMode(dc, TRANSPARENT);
-  SetTextColor(dc, GetSysColor(type == kRowHeading ? COLOR_HIGHLIGHT : COLOR_WINDOWTEXT));
-  DrawTextA(dc, cell.c_str(), static_cast<int>(cell.size()), &text,
-            DT_LEFT | DT_VCENTER | DT_SINGLELINE | DT_END_ELLIPSIS | DT_NOPREFIX);
+  DrawCellText(dc, area, table().getCellWideText(row, column), KindOf(row));
   return true;
 }
 

@@ -7,7 +7,8 @@
 // What the control calls, besides cP_SHPanel's FillObject, Clear and HasContent:
 //   FillDataSetMetadata(owner, id)  the dataset's metadata rows
 // Accessibility clients read each row from the table's window as "name<TAB>value", a
-// heading as "label<TAB>" (its value cell is empty).
+// heading as "label<TAB>" (its value cell is empty). A value of several lines shows them
+// one under the other, its row as high as they are.
 
 #include "frame/geo/AgencyTable.h"
 #include "inspector/panels/cP_SHPanel.h"
@@ -29,8 +30,8 @@ public:
   // E_FAIL (and no rows) without a dataset or with parameters of the wrong form.
   HRESULT FillDataSetMetadata(IUnknown* owner, REFGUID id);
 
-  void AddRow(const std::string& name, const std::string& value) override;
-  void AddHeading(const std::string& label) override;
+  void AddRow(const std::wstring& name, const std::wstring& value) override;
+  void AddHeading(const std::wstring& label) override;
 
   const geo::AgencyTable& agencies() const { return agencies_; }
 

@@ -37,8 +37,18 @@ void LogFailure(const PanelSettings& settings, const char* function, int line, H
   settings.Errors().ReportResult("cP_SHPanel", record, static_cast<std::int32_t>(result));
 }
 
+std::wstring AnsiWideText(const std::string& text) {
+  if (text.empty() || text.size() > 0x7FFFFFF) return {};
+  const int bytes = static_cast<int>(text.size());
+  const int size = MultiByteToWideChar(CP_ACP, 0, text.data(), bytes, nullptr, 0);
+  if (size <= 0) return {};
+  std::wstring wide(static_cast<std::size_t>(size), L'\0');
+  MultiByteToWideChar(CP_ACP, 0, text.data(), bytes, wide.data(), size);
+  return wide;
+}
+
 struct Related {
-  std::string label;
+  std::wstring label;
   ComPtr<IGeoObject> object;
 };
 
@@ -61,8 +71,8 @@ const toolkit::ClassRecord* cP_SHPanel::getClassRecord() const { return &toolkit
 void cP_SHPanel::SetUp(bool twoColumns) {
   using namespace toolkit::table;
   table_.addColumn("type", "Type", kCellLong, 0, nullptr, false);
-  if (twoColumns) table_.addColumn("name", "Name", kCellText, 0, nullptr, false);
-  textColumn_ = table_.addColumn("text", "Text", kCellText, 0, nullptr, false);
+  if (twoColumns) table_.addColumn("name", "Name", kCellWideText, 0, nullptr, false);
+  textColumn_ = table_.addColumn("text", "Text", kCellWideText, 0, nullptr, false);
   // Hidden columns need the style bit first: the type column is for the panel, not for people.
   table_.setTableStyle((table_.getTableStyle() | toolkit::Table::kStyleWholeRow | toolkit::Table::kStyleFillLast |
                         toolkit::Table::kStyleNoEditOnSelect | toolkit::Table::kStyleOwnerDraw |
@@ -72,19 +82,19 @@ void cP_SHPanel::SetUp(bool twoColumns) {
   insertNamed("Center", &table_, "rows");
 }
 
-int cP_SHPanel::AppendRow(int type, int column, const std::string& text) {
+int cP_SHPanel::AppendRow(int type, int column, const std::wstring& text) {
   const int row = table_.appendRowLong(kTypeColumn, type, 0);
-  if (row >= 0 && column >= 0) table_.setCellText(column, row, text.c_str());
+  if (row >= 0 && column >= 0) table_.setCellWideText(column, row, text);
   return row;
 }
 
-void cP_SHPanel::AddRow(const std::string& name, const std::string& value) {
+void cP_SHPanel::AddRow(const std::wstring& name, const std::wstring& value) {
   if (name.empty() || value.empty()) return;
   AppendRow(kRowName, textColumn_, name);
   AppendRow(kRowValue, textColumn_, value);
 }
 
-void cP_SHPanel::AddHeading(const std::string& label) { AppendRow(kRowHeading, textColumn_, label); }
+void cP_SHPanel::AddHeading(const std::wstring& label) { AppendRow(kRowHeading, textColumn_, label); }
 
 void cP_SHPanel::Clear() { table_.removeAllRows(); }
 
@@ -127,6 +137,7 @@ HRESULT cP_SHPanel::FillObject(IGeoObject* object, bool heading, bool related) {
     }
     if (kept.empty() && !hasAttributes) {
       doLayout();
+      LayOutRows();
       return S_OK;
     }
     if (related) AddHeading(ObjectLabel(settings_, object, classCode));
@@ -139,6 +150,7 @@ HRESULT cP_SHPanel::FillObject(IGeoObject* object, bool heading, bool related) {
     AddObjectAttributes(other.object.Get());
   }
   doLayout();
+  LayOutRows();
   return S_OK;
 }
 
@@ -226,7 +238,9 @@ bool cP_SHPanel::IsUnprintable(IGeoAttribute* attribute) const {
 HRESULT cP_SHPanel::AddAttributeToContent(IGeoAttribute* attribute) {
   if (attribute == nullptr) return E_INVALIDARG;
   if (IsUnprintable(attribute)) return S_FALSE;
-  return AddPrintableAttribute(attribute, std::nullopt);
+  const HRESULT hr = AddPrintableAttribute(attribute, std::nullopt);
+  if (hr == S_OK) LayOutRows();
+  return hr;
 }
 
 HRESULT cP_SHPanel::AddPrintableAttribute(IGeoAttribute* attribute, std::optional<bool> chartOwner) {
@@ -257,7 +271,8 @@ HRESULT cP_SHPanel::AddPrintableAttribute(IGeoAttribute* attribute, std::optiona
   if (formatter == nullptr) return E_NOINTERFACE;
   BSTR text = nullptr;
   hr = formatter->FormatAttribute(0, kAttributeFlags | settings_.attributeFlags, attribute, 0, 0, &text);
-  const std::string formatted = SUCCEEDED(hr) ? AnsiText(text) : std::string();
+  // UTF-8 while the rules below look for their ASCII marks; UTF-16 again for the rows.
+  const std::string formatted = SUCCEEDED(hr) ? Utf8Text(text) : std::string();
   SysFreeString(text);
   if (FAILED(hr)) {
     LogFailure(settings_, "_AddAttributeToContent", __LINE__, hr);
@@ -274,22 +289,41 @@ HRESULT cP_SHPanel::AddPrintableAttribute(IGeoAttribute* attribute, std::optiona
   }
   if (IsHiddenInformation(code, pair->value)) return S_FALSE;
   if (pair->name.empty() || pair->value.empty()) return S_FALSE;
-  AddRow(pair->name, pair->value);
+  std::wstring value;
+  if (variation) {
+    // Written here in Latin-1 (the degree sign), which maps byte for unit.
+    for (char c : *variation) value += static_cast<wchar_t>(static_cast<unsigned char>(c));
+  } else {
+    value = WideText(pair->value);
+  }
+  AddRow(WideText(pair->name), value);
   return S_OK;
 }
 
 std::string cP_SHPanel::TidalStreamValue(const std::string& raw) {
   TidalStreamCaptions captions;
-  captions.highWater = GetText("ObjInspector", 59, "HighWater");
-  captions.lowWater = GetText("ObjInspector", 60, "LowWater");
-  captions.time = GetText("ObjInspector", 61, "Time");
-  captions.direction = GetText("ObjInspector", 62, "Direction");
-  captions.velocity = GetText("ObjInspector", 63, "Velocity");
-  captions.knots = GetText("ObjInspector", 64, "kn");
+  // The value is UTF-8 here; the localised captions are in the ANSI code page.
+  const auto caption = [](int id, const char* fallback) {
+    const std::wstring wide = AnsiWideText(GetText("ObjInspector", id, fallback));
+    BSTR text = SysAllocStringLen(wide.data(), static_cast<UINT>(wide.size()));
+    std::string utf8 = Utf8Text(text);
+    SysFreeString(text);
+    return utf8;
+  };
+  captions.highWater = caption(59, "HighWater");
+  captions.lowWater = caption(60, "LowWater");
+  captions.time = caption(61, "Time");
+  captions.direction = caption(62, "Direction");
+  captions.velocity = caption(63, "Velocity");
+  captions.knots = caption(64, "kn");
   return TidalStreamText(raw, captions);
 }
 
 int cP_SHPanel::dispatchEvent(toolkit::ToolkitEvent& event) {
+  if (event.source == &table_ && event.id == toolkit::Table::kEventLayoutRows) {
+    LayOutRows();
+    return 1;
+  }
   if (event.source == &table_ && event.id == toolkit::Table::kEventDrawCell) {
     const HDC dc = reinterpret_cast<HDC>(event.params[0]);
     const RECT* rect = reinterpret_cast<const RECT*>(event.params[1]);
@@ -300,22 +334,111 @@ int cP_SHPanel::dispatchEvent(toolkit::ToolkitEvent& event) {
   return Panel::dispatchEvent(event);
 }
 
+PanelRowKind cP_SHPanel::KindOf(int row) const {
+  switch (RowType(row)) {
+    case kRowHeading: return PanelRowKind::Heading;
+    case kRowName: return PanelRowKind::Name;
+    case kRowValue: return PanelRowKind::Value;
+    default: return PanelRowKind::Attribute;
+  }
+}
+
+HFONT cP_SHPanel::RowFont() const {
+  const HFONT font = table_.getFont();
+  return font ? font : static_cast<HFONT>(GetStockObject(DEFAULT_GUI_FONT));
+}
+
+int cP_SHPanel::PrepareEngine(HDC dc) {
+  const HFONT font = RowFont();
+  if (font != engineFont_ && engine_.setBaseFont(font)) engineFont_ = font;
+  engine_.selectFontSlot(0);
+  const HGDIOBJ old = SelectObject(dc, font);
+  TEXTMETRICW metrics{};
+  const int lineHeight = GetTextMetricsW(dc, &metrics) ? static_cast<int>(metrics.tmHeight) : 13;
+  SelectObject(dc, old);
+  return std::max(lineHeight, 1);
+}
+
+namespace {
+// Text is kept this far from a cell's right edge.
+constexpr int kRightMargin = 4;
+// The name column of the side-by-side layout.
+constexpr int kSideNameColumn = 1;
+}  // namespace
+
+int cP_SHPanel::MeasureCellText(HDC dc, const std::wstring& text, int width, PanelRowKind kind, int lineHeight) {
+  const RECT box{PanelRowIndent(kind, TableLayout()), 0, std::max<LONG>(width - kRightMargin, 1), 0};
+  engine_.setMeasureOnly(true);
+  int y = 0;
+  for (std::wstring_view line : PanelTextLines(text)) {
+    engine_.drawParagraph(dc, line, y, box, 0, static_cast<int>(line.size()), lineHeight);
+  }
+  engine_.setMeasureOnly(false);
+  return y;
+}
+
+void cP_SHPanel::LayOutRows() {
+  const int rows = table_.getRowCount();
+  if (rows == 0) return;
+  const HWND window = table_.getHandle();
+  const HDC dc = window ? GetDC(window) : CreateCompatibleDC(nullptr);
+  if (dc == nullptr) return;
+  const int lineHeight = PrepareEngine(dc);
+  const HGDIOBJ old = SelectObject(dc, RowFont());
+  const int clientWidth = static_cast<int>(table_.getClientRect().right);
+  for (int row = 0; row < rows; ++row) {
+    const PanelRowKind kind = KindOf(row);
+    int textHeight = 0;
+    if (!TableLayout()) {
+      textHeight = MeasureCellText(dc, table_.getCellWideText(row, textColumn_), table_.getColumnWidth(textColumn_),
+                                   kind, lineHeight);
+    } else if (kind == PanelRowKind::Heading) {
+      // A heading spans the row from the name column's left edge.
+      const int left = static_cast<int>(table_.getCellRect(kSideNameColumn, -1).left);
+      textHeight = MeasureCellText(dc, table_.getCellWideText(row, kSideNameColumn),
+                                   std::max(clientWidth - std::max(left, 0), table_.getColumnWidth(kSideNameColumn)),
+                                   kind, lineHeight);
+    } else {
+      for (int column : {kSideNameColumn, textColumn_}) {
+        textHeight = std::max(textHeight, MeasureCellText(dc, table_.getCellWideText(row, column),
+                                                          table_.getColumnWidth(column), kind, lineHeight));
+      }
+    }
+    table_.setRowHeight(row, PanelRowHeight(textHeight, lineHeight, kind, row == rows - 1));
+  }
+  SelectObject(dc, old);
+  if (window) {
+    ReleaseDC(window, dc);
+  } else {
+    DeleteDC(dc);
+  }
+}
+
+void cP_SHPanel::DrawCellText(HDC dc, const RECT& area, const std::wstring& text, PanelRowKind kind) {
+  FillRect(dc, &area, GetSysColorBrush(COLOR_WINDOW));
+  const int lineHeight = PrepareEngine(dc);
+  const RECT box{area.left + PanelRowIndent(kind, TableLayout()), area.top,
+                 std::max<LONG>(area.right - kRightMargin, area.left + PanelRowIndent(kind, TableLayout()) + 1),
+                 area.bottom};
+  const int oldMode = SetBkMode(dc, TRANSPARENT);
+  const COLORREF oldColour = SetTextColor(dc, GetSysColor(kind == PanelRowKind::Heading ? COLOR_HIGHLIGHT : COLOR_WINDOWTEXT));
+  // Rows are as high as their text; a cell cut short (its row not measured yet) clips.
+  const int saved = SaveDC(dc);
+  IntersectClipRect(dc, area.left, area.top, area.right, area.bottom);
+  int y = area.top + PanelRowTextTop(kind);
+  for (std::wstring_view line : PanelTextLines(text)) {
+    engine_.drawParagraph(dc, line, y, box, 0, static_cast<int>(line.size()), lineHeight);
+  }
+  RestoreDC(dc, saved);
+  SetTextColor(dc, oldColour);
+  SetBkMode(dc, oldMode);
+}
+
 bool cP_SHPanel::DrawCell(HDC dc, const RECT& rect, int column, int row) {
   if (row < 0) return false;
   const int type = RowType(row);
-  // Indents: 15 pixels for a heading, 30 for a name, 60 for a value.
-  const int indent = type == kRowHeading ? 15 : type == kRowName ? 30 : type == kRowValue ? 60 : -1;
-  if (indent < 0) return false;
-  FillRect(dc, &rect, GetSysColorBrush(COLOR_WINDOW));
-  RECT text = rect;
-  text.left += indent;
-  // Rows are one line high: line breaks show as blanks here (clients read them as they are).
-  std::string cell = table_.getCellText(row, column);
-  std::replace(cell.begin(), cell.end(), '\r', ' ');
-  SetBkMode(dc, TRANSPARENT);
-  SetTextColor(dc, GetSysColor(type == kRowHeading ? COLOR_HIGHLIGHT : COLOR_WINDOWTEXT));
-  DrawTextA(dc, cell.c_str(), static_cast<int>(cell.size()), &text,
-            DT_LEFT | DT_VCENTER | DT_SINGLELINE | DT_END_ELLIPSIS | DT_NOPREFIX);
+  if (type != kRowHeading && type != kRowName && type != kRowValue) return false;
+  DrawCellText(dc, rect, table_.getCellWideText(row, column), KindOf(row));
   return true;
 }
 

@@ -11,6 +11,11 @@
 // Rows are read by accessibility clients from the table's window (table().getHandle()):
 // one list item per row, named by its visible cells joined by tabs.
 //
+// Texts stay UTF-16 from the formatter to the screen (wide text cells, drawn through a
+// TextEngine), so names in any script show as they are. Each row is word-wrapped to its
+// cell and as high as its text (see panel_rows.h); rows are measured again when the
+// panel's width changes and after each fill.
+//
 // The panel borrows the inspector's settings block (formatter, flag words), which must
 // outlive it. Failures of the host or the formatter skip the attribute or object and are
 // logged under the source name cP_SHPanel.
@@ -22,7 +27,9 @@
 
 #include "GeoData.h"
 #include "toolkit/core/Panel.h"
+#include "inspector/format/panel_rows.h"
 #include "toolkit/table/Table.h"
+#include "toolkit/text/TextEngine.h"
 
 namespace br::inspector {
 
@@ -54,8 +61,8 @@ public:
   bool IsUnprintable(IGeoAttribute* attribute) const;
 
   // A name/value row; added only when both are non-empty.
-  virtual void AddRow(const std::string& name, const std::string& value);
-  virtual void AddHeading(const std::string& label);
+  virtual void AddRow(const std::wstring& name, const std::wstring& value);
+  virtual void AddHeading(const std::wstring& label);
   void Clear();
   bool HasContent() const { return table_.getRowCount() > 0; }
 
@@ -63,6 +70,10 @@ public:
   toolkit::Table& table() { return table_; }
   const toolkit::Table& table() const { return table_; }
   int RowType(int row) const { return table_.getCellLong(kTypeColumn, row); }
+  // Gives every row the height of its wrapped text for the present column widths.
+  void LayOutRows();
+  // The font the rows are drawn and measured in.
+  HFONT RowFont() const;
 
   int dispatchEvent(toolkit::ToolkitEvent& event) override;
 
@@ -74,7 +85,11 @@ protected:
 
   const PanelSettings& settings() const { return settings_; }
   // Appends a row of the given type; column -1 leaves the text cells empty.
-  int AppendRow(int type, int column, const std::string& text);
+  int AppendRow(int type, int column, const std::wstring& text);
+  bool TableLayout() const { return textColumn_ != 1; }
+  PanelRowKind KindOf(int row) const;
+  // Draws a cell's lines, wrapped, from the row kind's indent; the area is filled first.
+  void DrawCellText(HDC dc, const RECT& area, const std::wstring& text, PanelRowKind kind);
   // A tidal stream attribute's value (the formatter's field list) laid out as its table
   // of lines, with the localised captions (tidal_stream_text.h).
   static std::string TidalStreamValue(const std::string& raw);
@@ -87,10 +102,16 @@ private:
   // of the chart-database kind, when the caller knows.
   HRESULT AddPrintableAttribute(IGeoAttribute* attribute, std::optional<bool> chartOwner);
   void AddObjectAttributes(IGeoObject* object);
+  // The engine in the rows' font; answers the height of one line.
+  int PrepareEngine(HDC dc);
+  // Height of a cell's wrapped lines in `width` pixels from the kind's indent.
+  int MeasureCellText(HDC dc, const std::wstring& text, int width, PanelRowKind kind, int lineHeight);
 
   const PanelSettings& settings_;
   toolkit::Table table_;
   int textColumn_ = 1;
+  toolkit::TextEngine engine_;
+  HFONT engineFont_ = nullptr;  // the font the engine's slots were copied from
 };
 
 }  // namespace br::inspector

@@ -56,16 +56,16 @@ bool IsHiddenClass(IGeoObject* object, long classCode) {
   return geo::ForEachItem(members.Get(), [](IUnknown*) { return false; }) == 0;
 }
 
-std::string ObjectLabel(const PanelSettings& settings, IGeoObject* object, long classCode) {
+std::wstring ObjectLabel(const PanelSettings& settings, IGeoObject* object, long classCode) {
   BSTR text = nullptr;
-  std::string label;
+  std::wstring label;
   if (IObjectFormatter* formatter = settings.Formatter()) {
-    if (SUCCEEDED(formatter->FormatObject(0, kLabelFlags | settings.objectFlags, object, 0, 0, &text))) {
-      label = AnsiText(text);
+    if (SUCCEEDED(formatter->FormatObject(0, kLabelFlags | settings.objectFlags, object, 0, 0, &text)) && text) {
+      label.assign(text, SysStringLen(text));
     }
   }
   SysFreeString(text);
-  return label.empty() ? std::to_string(classCode) : label;
+  return label.empty() ? std::to_wstring(classCode) : label;
 }
 
 std::optional<long> LongProperty(IGeoObject* object, long index) {
@@ -93,5 +93,26 @@ std::string AnsiText(const wchar_t* text, std::size_t length) {
 }
 
 std::string AnsiText(BSTR text) { return AnsiText(text, text ? SysStringLen(text) : 0); }
+
+std::string Utf8Text(BSTR text) {
+  const std::size_t length = text ? SysStringLen(text) : 0;
+  if (length == 0 || length > static_cast<std::size_t>(INT_MAX) / 4) return {};
+  const int wide = static_cast<int>(length);
+  const int size = WideCharToMultiByte(CP_UTF8, 0, text, wide, nullptr, 0, nullptr, nullptr);
+  if (size <= 0) return {};
+  std::string utf8(static_cast<std::size_t>(size), '\0');
+  WideCharToMultiByte(CP_UTF8, 0, text, wide, utf8.data(), size, nullptr, nullptr);
+  return utf8;
+}
+
+std::wstring WideText(std::string_view utf8) {
+  if (utf8.empty() || utf8.size() > static_cast<std::size_t>(INT_MAX)) return {};
+  const int bytes = static_cast<int>(utf8.size());
+  const int size = MultiByteToWideChar(CP_UTF8, 0, utf8.data(), bytes, nullptr, 0);
+  if (size <= 0) return {};
+  std::wstring wide(static_cast<std::size_t>(size), L'\0');
+  MultiByteToWideChar(CP_UTF8, 0, utf8.data(), bytes, wide.data(), size);
+  return wide;
+}
 
 }  // namespace br::inspector

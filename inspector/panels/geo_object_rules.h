@@ -7,6 +7,7 @@
 
 #include <optional>
 #include <string>
+#include <string_view>
 
 #include <wrl/client.h>
 
@@ -43,7 +44,7 @@ bool IsHiddenClass(IGeoObject* object, long classCode);
 
 // The object's label (FormatObject with flags 6 and the settings' flag word), or its
 // class code in decimal when the formatter gives nothing.
-std::string ObjectLabel(const PanelSettings& settings, IGeoObject* object, long classCode);
+std::wstring ObjectLabel(const PanelSettings& settings, IGeoObject* object, long classCode);
 
 // GetProperty converted to a 32-bit integer; none when the object has none.
 std::optional<long> LongProperty(IGeoObject* object, long index);
@@ -51,5 +52,9 @@ std::optional<long> LongProperty(IGeoObject* object, long index);
 // UTF-16 text in the ANSI code page; a null BSTR is an empty text.
 std::string AnsiText(const wchar_t* text, std::size_t length);
 std::string AnsiText(BSTR text);
+// UTF-16 text in UTF-8 and back: texts in any script pass the byte-wise rules of
+// attribute_text.h (which only look at ASCII) unharmed.
+std::string Utf8Text(BSTR text);
+std::wstring WideText(std::string_view utf8);
 
 }  // namespace br::inspector

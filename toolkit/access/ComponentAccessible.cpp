@@ -93,6 +93,23 @@ HRESULT ComponentAccessible::textAnswer(const std::string& text, BSTR* out, HRES
   return S_OK;
 }
 
+HRESULT ComponentAccessible::textAnswer(const std::wstring& text, BSTR* out, HRESULT whenEmpty) {
+  *out = nullptr;
+  if (text.empty()) return whenEmpty;
+  *out = SysAllocStringLen(text.data(), static_cast<UINT>(text.size()));
+  return *out ? S_OK : E_OUTOFMEMORY;
+}
+
+std::wstring ComponentAccessible::wideNameOf(LONG child) const {
+  const std::string text = nameOf(child);
+  if (text.empty()) return std::wstring();
+  const int length = MultiByteToWideChar(CP_ACP, 0, text.data(), static_cast<int>(text.size()), nullptr, 0);
+  if (length <= 0) return std::wstring();
+  std::wstring wide(static_cast<std::size_t>(length), L'\0');
+  MultiByteToWideChar(CP_ACP, 0, text.data(), static_cast<int>(text.size()), wide.data(), length);
+  return wide;
+}
+
 // ---- IUnknown and IDispatch
 
 HRESULT ComponentAccessible::QueryInterface(REFIID iid, void** object) {
@@ -166,7 +183,7 @@ HRESULT ComponentAccessible::get_accChild(VARIANT child, IDispatch** object) {
 HRESULT ComponentAccessible::get_accName(VARIANT child, BSTR* name) {
   if (!name) return E_POINTER;
   *name = nullptr;
-  return forChild(child, [&](LONG id) { return textAnswer(nameOf(id), name, S_FALSE); });
+  return forChild(child, [&](LONG id) { return textAnswer(wideNameOf(id), name, S_FALSE); });
 }
 
 HRESULT ComponentAccessible::get_accValue(VARIANT child, BSTR* value) {

@@ -92,6 +92,9 @@ protected:
 
   virtual LONG childCount() const;
   virtual std::string nameOf(LONG child) const;          // empty: no name
+  // The name as clients read it: nameOf's ANSI text widened, unless a component keeps
+  // texts in UTF-16 and answers them as they are.
+  virtual std::wstring wideNameOf(LONG child) const;
   virtual bool valueOf(LONG child, std::string& value) const;  // false: no value
   virtual LONG roleOf(LONG child) const;
   virtual LONG stateOf(LONG child) const;
@@ -114,6 +117,7 @@ private:
   template <typename Answer>
   HRESULT forChild(const VARIANT& child, Answer&& answer);
   static HRESULT textAnswer(const std::string& text, BSTR* out, HRESULT whenEmpty);
+  static HRESULT textAnswer(const std::wstring& text, BSTR* out, HRESULT whenEmpty);
 
   Counted counted_;
   cXComponent* component_;

@@ -133,6 +133,22 @@ bool TableAccessible::valueOf(LONG child, std::string& value) const {
   return true;
 }
 
+// Wide text cells reach the client as they are stored, never through the ANSI code page.
+std::wstring TableAccessible::wideNameOf(LONG child) const {
+  if (child == CHILDID_SELF) return ComponentAccessible::wideNameOf(child);
+  const Table& t = table();
+  const int row = rowOf(child);
+  std::wstring name;
+  bool first = true;
+  for (int column : t.displayOrder()) {
+    if (!t.isColumnVisible(column)) continue;
+    if (!first) name += L'\t';
+    name += t.getCellWideText(row, column);
+    first = false;
+  }
+  return name;
+}
+
 LONG TableAccessible::roleOf(LONG child) const {
   return child == CHILDID_SELF ? ROLE_SYSTEM_LIST : ROLE_SYSTEM_LISTITEM;
 }

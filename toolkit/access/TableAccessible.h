@@ -32,6 +32,7 @@ protected:
   LONG childCount() const override;
   std::string nameOf(LONG child) const override;
   bool valueOf(LONG child, std::string& value) const override;
+  std::wstring wideNameOf(LONG child) const override;
   LONG roleOf(LONG child) const override;
   LONG stateOf(LONG child) const override;
   RECT screenRectOf(LONG child) const override;

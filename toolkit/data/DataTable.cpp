@@ -10,6 +10,7 @@ struct DataTable::Column {
   ColumnType type;
   std::string name;
   std::vector<std::string> texts;
+  std::vector<std::wstring> wideTexts;
   std::vector<std::int64_t> integers;
   std::vector<double> doubles;
   std::vector<std::unique_ptr<DataTable>> tables;
@@ -17,6 +18,7 @@ struct DataTable::Column {
   void insertCell(int at) {
     switch (type) {
       case ColumnType::Text: texts.insert(texts.begin() + at, std::string()); break;
+      case ColumnType::WideText: wideTexts.insert(wideTexts.begin() + at, std::wstring()); break;
       case ColumnType::Integer: integers.insert(integers.begin() + at, 0); break;
       case ColumnType::Double: doubles.insert(doubles.begin() + at, 0.0); break;
       case ColumnType::Table: tables.insert(tables.begin() + at, nullptr); break;
@@ -25,6 +27,7 @@ struct DataTable::Column {
   void eraseCell(int at) {
     switch (type) {
       case ColumnType::Text: texts.erase(texts.begin() + at); break;
+      case ColumnType::WideText: wideTexts.erase(wideTexts.begin() + at); break;
       case ColumnType::Integer: integers.erase(integers.begin() + at); break;
       case ColumnType::Double: doubles.erase(doubles.begin() + at); break;
       case ColumnType::Table: tables.erase(tables.begin() + at); break;
@@ -32,6 +35,7 @@ struct DataTable::Column {
   }
   void clearCells() {
     texts.clear();
+    wideTexts.clear();
     integers.clear();
     doubles.clear();
     tables.clear();
@@ -43,7 +47,7 @@ const std::string kNoName;
 
 bool knownType(ColumnType type) {
   return type == ColumnType::Text || type == ColumnType::Integer || type == ColumnType::Table ||
-         type == ColumnType::Double;
+         type == ColumnType::Double || type == ColumnType::WideText;
 }
 }  // namespace
 
@@ -54,7 +58,7 @@ DataTable& DataTable::operator=(DataTable&&) noexcept = default;
 
 int DataTable::addColumn(ColumnType type, std::string_view name) {
   if (!knownType(type)) type = ColumnType::Text;
-  Column column{type, std::string(name), {}, {}, {}, {}};
+  Column column{type, std::string(name), {}, {}, {}, {}, {}};
   for (int row = 0; row < rows_; ++row) column.insertCell(row);
   columns_.push_back(std::move(column));
   return static_cast<int>(columns_.size()) - 1;
@@ -138,7 +142,7 @@ bool DataTable::deleteRowAt(int row) {
 void DataTable::clear() {
   std::vector<Column> old;
   for (Column& column : columns_) {
-    Column emptied{column.type, column.name, {}, {}, {}, {}};
+    Column emptied{column.type, column.name, {}, {}, {}, {}, {}};
     old.push_back(std::move(column));
     column = std::move(emptied);
   }
@@ -154,6 +158,12 @@ bool DataTable::holds(int column, int row, ColumnType type) const {
 bool DataTable::setText(int column, int row, std::string_view value) {
   if (!holds(column, row, ColumnType::Text)) return false;
   columns_[column].texts[row].assign(value.data(), value.size());
+  return true;
+}
+
+bool DataTable::setWideText(int column, int row, std::wstring_view value) {
+  if (!holds(column, row, ColumnType::WideText)) return false;
+  columns_[column].wideTexts[row].assign(value.data(), value.size());
   return true;
 }
 
@@ -183,6 +193,11 @@ bool DataTable::setPointer(int column, int row, const void* value) {
 std::string DataTable::text(int column, int row) const {
   if (!holds(column, row, ColumnType::Text)) return std::string();
   return columns_[column].texts[row];
+}
+
+std::wstring DataTable::wideText(int column, int row) const {
+  if (!holds(column, row, ColumnType::WideText)) return std::wstring();
+  return columns_[column].wideTexts[row];
 }
 
 std::int64_t DataTable::integer(int column, int row) const {

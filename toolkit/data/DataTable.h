@@ -21,6 +21,7 @@ enum class ColumnType : int {
   Integer = 3,  // 64 bits wide: also holds pointers and flags
   Table = 4,    // an owned nested table
   Double = 9,
+  WideText = 10,  // UTF-16 text, for texts in any script
 };
 
 class DataTable {
@@ -57,7 +58,9 @@ public:
   bool setDouble(int column, int row, double value);
   bool setTable(int column, int row, std::unique_ptr<DataTable> value);
   bool setPointer(int column, int row, const void* value);
+  bool setWideText(int column, int row, std::wstring_view value);
   std::string text(int column, int row) const;
+  std::wstring wideText(int column, int row) const;
   std::int64_t integer(int column, int row) const;
   double number(int column, int row) const;
   DataTable* table(int column, int row) const;  // still owned by this table

@@ -23,6 +23,26 @@ using namespace table;
 namespace {
 
 constexpr int kValue = 0;     // cell table: the value column
+
+std::wstring wideFromAnsi(const char* text) {
+  if (text == nullptr || *text == '\0') return std::wstring();
+  const int length = MultiByteToWideChar(CP_ACP, 0, text, -1, nullptr, 0);
+  if (length <= 1) return std::wstring();
+  std::wstring wide(static_cast<std::size_t>(length), L'\0');
+  MultiByteToWideChar(CP_ACP, 0, text, -1, wide.data(), length);
+  wide.resize(static_cast<std::size_t>(length - 1));
+  return wide;
+}
+
+std::string ansiFromWide(std::wstring_view text) {
+  if (text.empty() || text.size() > 0x7FFFFFF) return std::string();
+  const int units = static_cast<int>(text.size());
+  const int size = WideCharToMultiByte(CP_ACP, 0, text.data(), units, nullptr, 0, nullptr, nullptr);
+  if (size <= 0) return std::string();
+  std::string ansi(static_cast<std::size_t>(size), '\0');
+  WideCharToMultiByte(CP_ACP, 0, text.data(), units, ansi.data(), size, nullptr, nullptr);
+  return ansi;
+}
 constexpr int kUserData = 1;  // cell table: "User data"
 
 std::string dateText(const std::string& mask, double date) {
@@ -185,6 +205,7 @@ int Table::appendRowText(int column, const char* text, int userData) {
   if (!cellsOf(column)) return -1;
   for (int c = 0; c < columns_.rowCount(); ++c) cellsOf(c)->appendRow();
   const int row = rowCount_++;
+  if (!rowHeights_.empty()) rowHeights_.push_back(0);
   setCellText(column, row, text);
   setUserData(column, row, userData);
   // Filling thousands of rows must not set the scroll bars thousands of times.
@@ -207,7 +228,15 @@ int Table::appendRowDouble(int column, double value, int userData) {
 
 bool Table::setCellText(int column, int row, const char* text) {
   DataTable* cells = cellsOf(column);
+  if (cells && getColumnKind(column) == kCellWideText) return setCellWideText(column, row, wideFromAnsi(text));
   return cells && cells->setText(kValue, row, text ? text : "");
+}
+
+bool Table::setCellWideText(int column, int row, std::wstring_view text) {
+  DataTable* cells = cellsOf(column);
+  if (!cells) return false;
+  if (getColumnKind(column) == kCellWideText) return cells->setWideText(kValue, row, text);
+  return cells->setText(kValue, row, ansiFromWide(text));
 }
 
 bool Table::setCellLong(int column, int row, int value) {
@@ -234,6 +263,7 @@ void Table::removeAllRows() {
   if (editing_) endEdit(false);
   for (int c = 0; c < columns_.rowCount(); ++c) cellsOf(c)->clear();
   rowCount_ = 0;
+  rowHeights_.clear();
   order_.clear();
   hiddenRows_.clear();
   selection_.clear();
@@ -286,9 +316,17 @@ std::string Table::getCellText(int row, int column) const {
                          cells->number(kValue, row));
     case kCellDateTime:
       return dateText(mask, cells->number(kValue, row));
+    case kCellWideText:
+      return ansiFromWide(cells->wideText(kValue, row));
     default:
       return formatTextCell(mask, cells->text(kValue, row));
   }
+}
+
+std::wstring Table::getCellWideText(int row, int column) const {
+  if (getColumnKind(column) != kCellWideText) return wideFromAnsi(getCellText(row, column).c_str());
+  DataTable* cells = getCell(column, row);
+  return cells ? cells->wideText(kValue, row) : std::wstring();
 }
 
 int Table::findRow(int column, int firstRow, const char* text, bool anywhere, bool caseSensitive) const {
@@ -406,6 +444,21 @@ int Table::getRowHeight() const {
   const int textHeight = dc.valid() ? static_cast<int>(dc.metrics().tmHeight) : 13;
   rowHeight_ = textHeight + 6;
   return rowHeight_;
+}
+
+void Table::setRowHeight(int row, int height) {
+  if (row < 0 || row >= rowCount_) return;
+  height = std::max(height, 0);
+  if (rowHeights_.empty() && height == 0) return;
+  rowHeights_.resize(static_cast<std::size_t>(rowCount_), 0);
+  rowHeights_[static_cast<std::size_t>(row)] = height;
+  scrollBarsStale_ = true;
+  invalidate();
+}
+
+int Table::getRowHeightOf(int row) const {
+  if (row >= 0 && static_cast<std::size_t>(row) < rowHeights_.size() && rowHeights_[row] > 0) return rowHeights_[row];
+  return getRowHeight();
 }
 
 int Table::displayRowCount() const {

@@ -20,6 +20,7 @@
 #include <memory>
 #include <set>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "toolkit/core/cXComponent.h"
@@ -74,6 +75,11 @@ public:
   // Owner-drawing event (id 2 given to dispatchEvent): params = DC, RECT*, state,
   // column, row (stored).
   static constexpr int kEventDrawCell = 2;
+  // Row layout event (given to dispatchEvent; an id no window message uses) sent before
+  // painting when the client width is not the one last announced: params = client
+  // width. An owner that gives rows heights of their own (setRowHeight) sets them again
+  // for that width.
+  static constexpr int kEventLayoutRows = 0x101;
   static constexpr UINT_PTR kTimer = 0xF001;
   static constexpr int kDefaultWidth = 100;
   static constexpr int kMarkSize = 12;  // bool and state marks
@@ -112,6 +118,9 @@ public:
   int appendRowLong(int column, int value, int userData);
   int appendRowDouble(int column, double value, int userData);
   bool setCellText(int column, int row, const char* text);
+  // A text cell in any script: stored as it is in a wide text column (kind 9), through
+  // the ANSI code page in a text column.
+  bool setCellWideText(int column, int row, std::wstring_view text);
   bool setCellLong(int column, int row, int value);
   bool setCellDouble(int column, int row, double value);
   bool setUserData(int column, int row, int value);
@@ -123,7 +132,9 @@ public:
   DataTable* getCell(int column, int row) const;
   int getCellLong(int column, int row) const;
   double getCellDouble(int column, int row) const;
-  std::string getCellText(int row, int column) const;
+  std::string getCellText(int row, int column) const;  // wide texts in the ANSI code page
+  // The cell's text in UTF-16: a wide text cell as stored, others widened from getCellText.
+  std::wstring getCellWideText(int row, int column) const;
 
   // ---- current cell and selection (stored rows; -1 for none)
   int getCurrentRow() const { return currentRow_; }
@@ -156,7 +167,10 @@ public:
   void setColumnVisible(int column, bool visible);
   void setRowVisible(int row, bool visible);
   void setBoolColors(int pair, int background, int foreground);
-  int getRowHeight() const;
+  int getRowHeight() const;  // of the header and of rows without a height of their own
+  // A height of the row's own (stored row); 0 gives it back the table's height.
+  void setRowHeight(int row, int height);
+  int getRowHeightOf(int row) const;
   int getTopRow() const { return topRow_; }
   // Cell rectangle in client coordinates (column -1: the whole row); empty when not shown.
   RECT getCellRect(int column, int row) const;
@@ -213,6 +227,8 @@ private:
   void storeEditedValue();
   void growRows(int column);
   void selectRange(int from, int to);
+  bool ownRowHeights() const { return !rowHeights_.empty(); }
+  int shownRowHeight(int index) const { return getRowHeightOf(nthShownRow(index)); }
 
   DataTable columns_;
   int ownerColumns_ = 0;
@@ -238,6 +254,8 @@ private:
   int resizeStartWidth_ = 0;
   int pressedHeader_ = -1;
   mutable int rowHeight_ = 0;     // cached; 0 = measure again
+  std::vector<int> rowHeights_;   // per stored row, 0 = rowHeight_; empty while no row has its own
+  int laidOutWidth_ = -1;         // client width of the last kEventLayoutRows
   bool scrollBarsStale_ = false;  // rows were added since the scroll bars were set
   std::vector<int> editLimits_;  // per column, 0 = the kind's; shorter than the columns = 0
   std::unique_ptr<cXEdit2> editor_;

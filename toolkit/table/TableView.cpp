@@ -5,6 +5,7 @@
 
 #include "toolkit/core/Palette.h"
 #include "toolkit/table/logic/cell_kinds.h"
+#include "toolkit/table/logic/row_heights.h"
 
 namespace toolkit {
 
@@ -38,17 +39,27 @@ int Table::columnLeft(int column) const {
 int Table::visibleRowCount() const {
   const RECT client = getClientRect();
   const int height = getRowHeight();
+  if (ownRowHeights()) {
+    const RowHeightOf heightOf = [this](int index) { return shownRowHeight(index); };
+    return rowsFitting(heightOf, displayRowCount(), topRow_, static_cast<int>(client.bottom) - height);
+  }
   return std::max(0, static_cast<int>(client.bottom - height) / height);
 }
 
 RECT Table::getCellRect(int column, int row) const {
   RECT rect{0, 0, 0, 0};
-  const int height = getRowHeight();
+  int height = getRowHeight();
   int top = 0;
   if (row >= 0) {
     const int index = shownIndexOf(row);
     if (index < 0) return rect;
-    top = height * (index - topRow_ + 1);
+    if (ownRowHeights()) {
+      const RowHeightOf heightOf = [this](int i) { return shownRowHeight(i); };
+      top = height + rowOffset(heightOf, topRow_, index);
+      height = getRowHeightOf(row);
+    } else {
+      top = height * (index - topRow_ + 1);
+    }
   }
   if (column < 0) {
     const RECT client = getClientRect();
@@ -63,7 +74,12 @@ bool Table::hitTest(int x, int y, int& row, int& column) const {
   const int height = getRowHeight();
   row = -1;
   if (y >= height) {
-    row = nthShownRow(topRow_ + (y - height) / height);
+    if (ownRowHeights()) {
+      const RowHeightOf heightOf = [this](int index) { return shownRowHeight(index); };
+      row = nthShownRow(rowAtOffset(heightOf, displayRowCount(), topRow_, y - height));
+    } else {
+      row = nthShownRow(topRow_ + (y - height) / height);
+    }
     if (row < 0) return false;
   }
   column = -1;
@@ -89,7 +105,15 @@ void Table::updateScrollBars() {
   info.fMask = SIF_RANGE | SIF_PAGE | SIF_POS;
   info.nMin = 0;
   info.nMax = std::max(displayRowCount() - 1, 0);
-  info.nPage = static_cast<UINT>(std::max(visibleRowCount(), 1));
+  if (ownRowHeights() && displayRowCount() > 0) {
+    // Rows of their own heights: the page is what is left below the lowest top row.
+    const RowHeightOf heightOf = [this](int index) { return shownRowHeight(index); };
+    const int lowestTop =
+        firstRowEndingAt(heightOf, displayRowCount() - 1, static_cast<int>(client.bottom) - getRowHeight());
+    info.nPage = static_cast<UINT>(std::max(displayRowCount() - lowestTop, 1));
+  } else {
+    info.nPage = static_cast<UINT>(std::max(visibleRowCount(), 1));
+  }
   topRow_ = std::max(0, std::min(topRow_, displayRowCount() - static_cast<int>(info.nPage)));
   info.nPos = topRow_;
   setScrollInfo(SB_VERT, info, true);
@@ -113,7 +137,14 @@ void Table::scrollIntoView(int row) {
   const int visible = std::max(visibleRowCount(), 1);
   const int before = topRow_;
   if (index < topRow_) topRow_ = index;
-  else if (index >= topRow_ + visible) topRow_ = index - visible + 1;
+  else if (index >= topRow_ + visible) {
+    if (ownRowHeights()) {
+      const RowHeightOf heightOf = [this](int i) { return shownRowHeight(i); };
+      topRow_ = firstRowEndingAt(heightOf, index, static_cast<int>(getClientRect().bottom) - getRowHeight());
+    } else {
+      topRow_ = index - visible + 1;
+    }
+  }
   if (topRow_ != before) {
     updateScrollBars();
     invalidate();
@@ -137,18 +168,25 @@ void Table::fillLastColumn() {
 }
 
 void Table::paint(HDC dc) {
-  if (scrollBarsStale_) updateScrollBars();
   RECT client = getClientRect();
+  if (client.right > 0 && client.right != laidOutWidth_) {
+    laidOutWidth_ = client.right;
+    ToolkitEvent layout(this, kEventLayoutRows, getHandle());
+    layout.params[0] = client.right;
+    dispatchEvent(layout);
+  }
+  if (scrollBarsStale_) updateScrollBars();
+  client = getClientRect();
   if (client.right <= 0 || client.bottom <= 0) return;
   HFONT font = getFont();
   Selected selectedFont(dc, font ? static_cast<HGDIOBJ>(font) : GetStockObject(DEFAULT_GUI_FONT));
   const int oldMode = SetBkMode(dc, TRANSPARENT);
   drawHeader(dc, client);
-  const int height = getRowHeight();
-  int y = height;
-  for (int index = topRow_; y < client.bottom; ++index, y += height) {
+  int y = getRowHeight();
+  for (int index = topRow_, height = 0; y < client.bottom; ++index, y += height) {
     const int row = nthShownRow(index);
     if (row < 0) break;
+    height = getRowHeightOf(row);
     int x = -leftPixel_;
     for (int column : displayOrder_) {
       if (!isColumnVisible(column)) continue;
@@ -229,14 +267,22 @@ void Table::drawCell(HDC dc, RECT rect, int column, int row) {
     drawMark(dc, rect, kind, getCellLong(column, row), selected);
     return;
   }
-  const std::string text = getCellText(row, column);
-  if (text.empty()) return;
   RECT box{rect.left + 3, rect.top + 1, rect.right - 3, rect.bottom - 1};
   const int align = static_cast<int>(columns_.integer(kColumnAlign, column));
-  const UINT horizontal = (align & 2) ? DT_RIGHT : (align & 4) ? DT_CENTER : DT_LEFT;
+  const UINT format = ((align & 2) ? DT_RIGHT : (align & 4) ? DT_CENTER : DT_LEFT) | DT_SINGLELINE | DT_VCENTER |
+                      DT_NOPREFIX | DT_END_ELLIPSIS;
+  if (kind == kCellWideText) {
+    const std::wstring text = getCellWideText(row, column);
+    if (text.empty()) return;
+    const COLORREF oldColour = SetTextColor(dc, GetSysColor(textColour));
+    DrawTextW(dc, text.c_str(), static_cast<int>(text.size()), &box, format);
+    SetTextColor(dc, oldColour);
+    return;
+  }
+  const std::string text = getCellText(row, column);
+  if (text.empty()) return;
   const COLORREF oldColour = SetTextColor(dc, GetSysColor(textColour));
-  DrawTextA(dc, text.c_str(), static_cast<int>(text.size()), &box,
-            horizontal | DT_SINGLELINE | DT_VCENTER | DT_NOPREFIX | DT_END_ELLIPSIS);
+  DrawTextA(dc, text.c_str(), static_cast<int>(text.size()), &box, format);
   SetTextColor(dc, oldColour);
 }
 

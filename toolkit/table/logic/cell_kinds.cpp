@@ -2,7 +2,7 @@
 
 namespace toolkit::table {
 
-int normalizeKind(int kind) { return kind >= kCellLong && kind <= kCellDateTime ? kind : kCellText; }
+int normalizeKind(int kind) { return kind >= kCellLong && kind <= kCellWideText ? kind : kCellText; }
 
 const char* cellColumnName(int kind) {
   switch (normalizeKind(kind)) {
@@ -13,6 +13,7 @@ const char* cellColumnName(int kind) {
     case kCellLatitude: return "Cell data (Latitude)";
     case kCellLongitude: return "Cell data (Longitud)";
     case kCellDateTime: return "Cell data (datetime)";
+    case kCellWideText: return "Cell data (wide text)";
     default: return "Cell data (text)";
   }
 }
@@ -26,6 +27,7 @@ ColumnType cellStorage(int kind) {
     case kCellLatitude:
     case kCellLongitude:
     case kCellDateTime: return ColumnType::Double;
+    case kCellWideText: return ColumnType::WideText;
     default: return ColumnType::Text;
   }
 }

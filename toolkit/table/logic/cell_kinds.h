@@ -17,9 +17,10 @@ enum CellKind : int {
   kCellLatitude = 6,
   kCellLongitude = 7,
   kCellDateTime = 8,
+  kCellWideText = 9,  // UTF-16 text: texts in any script, whatever the ANSI code page
 };
 
-// Kinds 2..8 are kept; anything else is a text column.
+// Kinds 2..9 are kept; anything else is a text column.
 int normalizeKind(int kind);
 // "Cell data (text)", "Cell data (long)", ...; kind 7 is spelled "Cell data (Longitud)".
 const char* cellColumnName(int kind);

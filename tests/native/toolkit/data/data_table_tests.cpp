@@ -49,3 +49,34 @@ TEST_CASE("nested tables are owned by their cell") {
   columns.clear();
   CHECK((columns.rowCount() == 0 && columns.cursor() == -1 && columns.columnCount() == 2));
 }
+
+TEST_CASE("wide text cells keep UTF-16 texts whole through row inserts and deletes") {
+  DataTable t;
+  t.addColumn(ColumnType::Integer, "Type");
+  const int wide = t.addColumn(ColumnType::WideText, "Text");
+  CHECK(t.columnType(wide) == ColumnType::WideText);
+  const std::wstring arabic = L"\x0645\x064A\x0646\x0627\x0621";  // four letters and a hamza
+  const std::wstring thai = L"\x0E17\x0E48\x0E32\x0E40\x0E23\x0E37\x0E2D";
+  t.appendRowInteger(1);
+  CHECK(t.setWideText(wide, 0, arabic));
+  t.appendRowInteger(2);
+  CHECK(t.setWideText(wide, 1, thai));
+  // A row put in before the others moves them down with their texts.
+  t.moveTo(0);
+  t.insertRow();
+  CHECK((t.wideText(wide, 0).empty() && t.wideText(wide, 1) == arabic && t.wideText(wide, 2) == thai));
+  CHECK(t.deleteRowAt(1));
+  CHECK(t.wideText(wide, 1) == thai);
+  CHECK(t.integer(0, 1) == 2);
+  // The narrow accessors read and write nothing in a wide column, nor the wide ones in others.
+  CHECK_FALSE(t.setText(wide, 0, "x"));
+  CHECK(t.text(wide, 1).empty());
+  CHECK_FALSE(t.setWideText(0, 0, L"x"));
+  CHECK(t.wideText(0, 1).empty());
+  CHECK_FALSE(t.setWideText(wide, 2, L"past the end"));
+  // A column added later gets empty cells for the rows there are.
+  const int later = t.addColumn(ColumnType::WideText, "Later");
+  CHECK((t.wideText(later, 0).empty() && t.wideText(later, 1).empty() && t.setWideText(later, 1, L"x")));
+  t.clear();
+  CHECK((t.rowCount() == 0 && t.columnCount() == 3));
+}

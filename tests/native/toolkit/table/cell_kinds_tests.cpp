@@ -7,9 +7,9 @@
 using namespace toolkit;
 using namespace toolkit::table;
 
-TEST_CASE("kinds outside 2..8 are text columns") {
-  for (int kind : {0, 9, -3}) CHECK(normalizeKind(kind) == kCellText);
-  for (int kind = 2; kind <= 8; ++kind) CHECK(normalizeKind(kind) == kind);
+TEST_CASE("kinds outside 2..9 are text columns") {
+  for (int kind : {0, 10, -3}) CHECK(normalizeKind(kind) == kCellText);
+  for (int kind = 2; kind <= 9; ++kind) CHECK(normalizeKind(kind) == kind);
 }
 
 TEST_CASE("each kind's cell table has its named cell column and User data") {
@@ -18,7 +18,8 @@ TEST_CASE("each kind's cell table has its named cell column and User data") {
     const char* name;
     ColumnType storage;
   };
-  const Expect expected[] = {{6, "Cell data (Latitude)", ColumnType::Double}, {0, "Cell data (text)", ColumnType::Text}};
+  const Expect expected[] = {{6, "Cell data (Latitude)", ColumnType::Double}, {0, "Cell data (text)", ColumnType::Text},
+                             {9, "Cell data (wide text)", ColumnType::WideText}};
   for (const Expect& e : expected) {
     CAPTURE(e.kind);
     auto cells = makeCellTable(e.kind);
