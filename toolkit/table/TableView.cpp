@@ -168,15 +168,18 @@ void Table::fillLastColumn() {
 }
 
 void Table::paint(HDC dc) {
+  // Twice at most: rows laid out for one width may bring the scroll bar that narrows it.
   RECT client = getClientRect();
-  if (client.right > 0 && client.right != laidOutWidth_) {
-    laidOutWidth_ = client.right;
-    ToolkitEvent layout(this, kEventLayoutRows, getHandle());
-    layout.params[0] = client.right;
-    dispatchEvent(layout);
+  for (int pass = 0; pass < 2; ++pass) {
+    if (client.right > 0 && client.right != laidOutWidth_) {
+      laidOutWidth_ = client.right;
+      ToolkitEvent layout(this, kEventLayoutRows, getHandle());
+      layout.params[0] = client.right;
+      dispatchEvent(layout);
+    }
+    if (scrollBarsStale_) updateScrollBars();
+    client = getClientRect();
   }
-  if (scrollBarsStale_) updateScrollBars();
-  client = getClientRect();
   if (client.right <= 0 || client.bottom <= 0) return;
   HFONT font = getFont();
   Selected selectedFont(dc, font ? static_cast<HGDIOBJ>(font) : GetStockObject(DEFAULT_GUI_FONT));

@@ -2,6 +2,7 @@
 // and row data through the shown order are the port list suite's (TidesPortList).
 #include <doctest/doctest.h>
 
+#include "tests/wine/common/AccessibleReader.h"
 #include "tests/wine/common/widget_test_support.h"
 #include "toolkit/core/Palette.h"
 #include "toolkit/table/Table.h"
@@ -219,4 +220,96 @@ TEST_CASE("while editing only Esc stays with the table; Enter, Page Up/Down and 
     CHECK(m.selections() == step.notified);
     CHECK(GetFocus() == m.table.getHandle());
   }
+}
+
+namespace {
+
+// A table of a wide text column that records the layout events it hears and gives
+// each row a height of its own from them.
+struct WideMounted : wtest::MountedPanel {
+  Table table;
+  std::vector<int> widths;  // client widths of the layout events, in order
+  std::vector<int> heights;
+
+  WideMounted() {
+    add(&table, "table");
+    table.setBounds(0, 0, 300, 200, true, true);
+    table.addColumn("text", "Text", 9, 0, nullptr, false);
+  }
+  int dispatchEvent(toolkit::ToolkitEvent& event) override {
+    if (event.source == &table && event.id == Table::kEventLayoutRows) {
+      widths.push_back(static_cast<int>(event.params[0]));
+      for (int row = 0; row < table.getRowCount() && row < static_cast<int>(heights.size()); ++row)
+        table.setRowHeight(row, heights[row]);
+      return 1;
+    }
+    return RecordingPanel::dispatchEvent(event);
+  }
+};
+
+}  // namespace
+
+TEST_CASE("wide text cells keep texts in any script for clients; text cells go through the code page") {
+  WideMounted m;
+  const std::wstring greek = L"\x039B\x03B9\x03BC\x03AC\x03BD\x03B9";  // a harbour in Greek
+  const std::wstring arabic = L"\x0645\x064A\x0646\x0627\x0621";
+  REQUIRE(m.table.appendRowText(0, nullptr, 0) == 0);
+  CHECK(m.table.setCellWideText(0, 0, greek));
+  REQUIRE(m.table.appendRowText(0, "Brest", 1) == 1);
+  CHECK(m.table.getCellWideText(0, 0) == greek);
+  CHECK(m.table.getCellWideText(1, 0) == L"Brest");
+  CHECK(m.table.getCellText(1, 0) == "Brest");
+  CHECK(m.table.setCellWideText(0, 1, arabic));
+  // Clients read the rows as stored.
+  CoInitialize(nullptr);
+  br::test::AccessibleReader reader(m.table.getHandle());
+  REQUIRE(reader.get() != nullptr);
+  CHECK(reader.ChildNames() == std::vector<std::wstring>{greek, arabic});
+  // A narrow text column takes a wide text through the ANSI code page: letters it lacks are lost.
+  m.table.addColumn("narrow", "Narrow", 1, 0, nullptr, false);
+  CHECK(m.table.setCellWideText(1, 0, L"Brest"));
+  CHECK(m.table.getCellWideText(0, 1) == L"Brest");
+  CHECK(m.table.setCellWideText(1, 1, arabic));
+  CHECK(m.table.getCellWideText(1, 1) != arabic);
+}
+
+TEST_CASE("rows of their own heights: cell rectangles, hit tests, scrolling and the layout event") {
+  WideMounted m;
+  for (int row = 0; row < 6; ++row) m.table.appendRowText(0, "row", row);
+  const int h = m.table.getRowHeight();
+  m.heights = {h, 4 * h, h, 3 * h, h, 2 * h};
+  wtest::Canvas canvas(300, 200, RGB(1, 2, 3));
+  m.table.paint(canvas.dc());
+  // The first paint announces the client width (again once the rows have brought the
+  // scroll bar); the owner's heights hold from then on.
+  REQUIRE(!m.widths.empty());
+  CHECK(m.widths.back() == m.table.getClientRect().right);
+  const std::size_t announced = m.widths.size();
+  CHECK(m.table.getCellRect(0, 0).top == h);
+  CHECK(m.table.getCellRect(0, 1).top == 2 * h);
+  CHECK(m.table.getCellRect(0, 1).bottom == 6 * h);
+  CHECK(m.table.getCellRect(0, 2).top == 6 * h);
+  CHECK(m.table.getCellRect(-1, 3).bottom == 10 * h);
+  int row = -1, column = -1;
+  CHECK((m.table.hitTest(10, 4 * h, row, column) && row == 1 && column == 0));
+  CHECK((m.table.hitTest(10, 6 * h + 1, row, column) && row == 2));
+  CHECK((m.table.hitTest(10, 8 * h, row, column) && row == 3));
+  // A second paint at the same width announces nothing.
+  m.table.paint(canvas.dc());
+  CHECK(m.widths.size() == announced);
+  // Selecting the last row scrolls until it is the last one shown whole.
+  const int space = static_cast<int>(m.table.getClientRect().bottom) - h;
+  REQUIRE(space < 12 * h);  // not every row fits
+  REQUIRE(m.table.selectRow(5, false));
+  const RECT last = m.table.getCellRect(-1, 5);
+  CHECK(last.bottom <= m.table.getClientRect().bottom);
+  CHECK(m.table.getTopRow() > 0);
+  // A row above the top row lies above the header.
+  CHECK(m.table.getCellRect(-1, 0).top < h);
+  // Height 0 gives the row back the table's height.
+  m.table.setRowHeight(1, 0);
+  CHECK(m.table.getRowHeightOf(1) == h);
+  m.table.removeAllRows();
+  m.table.appendRowText(0, "again", 0);
+  CHECK(m.table.getRowHeightOf(0) == h);
 }
