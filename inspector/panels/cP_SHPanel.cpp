@@ -377,6 +377,14 @@ int cP_SHPanel::MeasureCellText(HDC dc, const std::wstring& text, int width, Pan
   return y;
 }
 
+// Texts wrap at the window's edge when a column reaches past it (the last column only
+// ever grows to fill the table).
+int cP_SHPanel::VisibleWidth(int column) const {
+  const RECT cell = table_.getCellRect(column, -1);
+  const LONG right = std::min(cell.right, table_.getClientRect().right);
+  return std::max(static_cast<int>(right - cell.left), 1);
+}
+
 void cP_SHPanel::LayOutRows() {
   const int rows = table_.getRowCount();
   if (rows == 0) return;
@@ -390,8 +398,8 @@ void cP_SHPanel::LayOutRows() {
     const PanelRowKind kind = KindOf(row);
     int textHeight = 0;
     if (!TableLayout()) {
-      textHeight = MeasureCellText(dc, table_.getCellWideText(row, textColumn_), table_.getColumnWidth(textColumn_),
-                                   kind, lineHeight);
+      textHeight =
+          MeasureCellText(dc, table_.getCellWideText(row, textColumn_), VisibleWidth(textColumn_), kind, lineHeight);
     } else if (kind == PanelRowKind::Heading) {
       // A heading spans the row from the name column's left edge.
       const int left = static_cast<int>(table_.getCellRect(kSideNameColumn, -1).left);
@@ -401,7 +409,7 @@ void cP_SHPanel::LayOutRows() {
     } else {
       for (int column : {kSideNameColumn, textColumn_}) {
         textHeight = std::max(textHeight, MeasureCellText(dc, table_.getCellWideText(row, column),
-                                                          table_.getColumnWidth(column), kind, lineHeight));
+                                                          VisibleWidth(column), kind, lineHeight));
       }
     }
     table_.setRowHeight(row, PanelRowHeight(textHeight, lineHeight, kind, row == rows - 1));
@@ -417,8 +425,9 @@ void cP_SHPanel::LayOutRows() {
 void cP_SHPanel::DrawCellText(HDC dc, const RECT& area, const std::wstring& text, PanelRowKind kind) {
   FillRect(dc, &area, GetSysColorBrush(COLOR_WINDOW));
   const int lineHeight = PrepareEngine(dc);
-  const RECT box{area.left + PanelRowIndent(kind, TableLayout()), area.top,
-                 std::max<LONG>(area.right - kRightMargin, area.left + PanelRowIndent(kind, TableLayout()) + 1),
+  const int indent = PanelRowIndent(kind, TableLayout());
+  const LONG right = std::min(area.right, table_.getClientRect().right);
+  const RECT box{area.left + indent, area.top, std::max<LONG>(right - kRightMargin, area.left + indent + 1),
                  area.bottom};
   const int oldMode = SetBkMode(dc, TRANSPARENT);
   const COLORREF oldColour = SetTextColor(dc, GetSysColor(kind == PanelRowKind::Heading ? COLOR_HIGHLIGHT : COLOR_WINDOWTEXT));

@@ -102,6 +102,7 @@ private:
   // of the chart-database kind, when the caller knows.
   HRESULT AddPrintableAttribute(IGeoAttribute* attribute, std::optional<bool> chartOwner);
   void AddObjectAttributes(IGeoObject* object);
+  int VisibleWidth(int column) const;
   // The engine in the rows' font; answers the height of one line.
   int PrepareEngine(HDC dc);
   // Height of a cell's wrapped lines in `width` pixels from the kind's indent.
