@@ -281,10 +281,16 @@ HRESULT cP_SHPanel::AddPrintableAttribute(IGeoAttribute* attribute, std::optiona
   std::optional<AttributeText> pair = SplitAttributeText(formatted);
   if (!pair) return S_FALSE;
 
+  bool ansiValue = false;
   if (variation) {
     pair->value = *variation;
   } else {
-    if (chart && code == kCodeTidalStream) pair->value = TidalStreamValue(pair->value);
+    if (chart && code == kCodeTidalStream) {
+      // The table is laid out in the ANSI code page, as its captions and degree signs are.
+      const std::wstring wide = WideText(pair->value);
+      pair->value = TidalStreamValue(AnsiText(wide.c_str(), wide.size()));
+      ansiValue = true;
+    }
     pair->value = CleanAttributeValue(pair->value);
   }
   if (IsHiddenInformation(code, pair->value)) return S_FALSE;
@@ -294,7 +300,7 @@ HRESULT cP_SHPanel::AddPrintableAttribute(IGeoAttribute* attribute, std::optiona
     // Written here in Latin-1 (the degree sign), which maps byte for unit.
     for (char c : *variation) value += static_cast<wchar_t>(static_cast<unsigned char>(c));
   } else {
-    value = WideText(pair->value);
+    value = ansiValue ? AnsiWideText(pair->value) : WideText(pair->value);
   }
   AddRow(WideText(pair->name), value);
   return S_OK;
@@ -302,20 +308,12 @@ HRESULT cP_SHPanel::AddPrintableAttribute(IGeoAttribute* attribute, std::optiona
 
 std::string cP_SHPanel::TidalStreamValue(const std::string& raw) {
   TidalStreamCaptions captions;
-  // The value is UTF-8 here; the localised captions are in the ANSI code page.
-  const auto caption = [](int id, const char* fallback) {
-    const std::wstring wide = AnsiWideText(GetText("ObjInspector", id, fallback));
-    BSTR text = SysAllocStringLen(wide.data(), static_cast<UINT>(wide.size()));
-    std::string utf8 = Utf8Text(text);
-    SysFreeString(text);
-    return utf8;
-  };
-  captions.highWater = caption(59, "HighWater");
-  captions.lowWater = caption(60, "LowWater");
-  captions.time = caption(61, "Time");
-  captions.direction = caption(62, "Direction");
-  captions.velocity = caption(63, "Velocity");
-  captions.knots = caption(64, "kn");
+  captions.highWater = GetText("ObjInspector", 59, "HighWater");
+  captions.lowWater = GetText("ObjInspector", 60, "LowWater");
+  captions.time = GetText("ObjInspector", 61, "Time");
+  captions.direction = GetText("ObjInspector", 62, "Direction");
+  captions.velocity = GetText("ObjInspector", 63, "Velocity");
+  captions.knots = GetText("ObjInspector", 64, "kn");
   return TidalStreamText(raw, captions);
 }
 

@@ -100,14 +100,24 @@ HRESULT ComponentAccessible::textAnswer(const std::wstring& text, BSTR* out, HRE
   return *out ? S_OK : E_OUTOFMEMORY;
 }
 
-std::wstring ComponentAccessible::wideNameOf(LONG child) const {
-  const std::string text = nameOf(child);
+namespace {
+std::wstring WidenAnsi(const std::string& text) {
   if (text.empty()) return std::wstring();
   const int length = MultiByteToWideChar(CP_ACP, 0, text.data(), static_cast<int>(text.size()), nullptr, 0);
   if (length <= 0) return std::wstring();
   std::wstring wide(static_cast<std::size_t>(length), L'\0');
   MultiByteToWideChar(CP_ACP, 0, text.data(), static_cast<int>(text.size()), wide.data(), length);
   return wide;
+}
+}  // namespace
+
+std::wstring ComponentAccessible::wideNameOf(LONG child) const { return WidenAnsi(nameOf(child)); }
+
+bool ComponentAccessible::wideValueOf(LONG child, std::wstring& value) const {
+  std::string text;
+  if (!valueOf(child, text)) return false;
+  value = WidenAnsi(text);
+  return true;
 }
 
 // ---- IUnknown and IDispatch
@@ -190,8 +200,8 @@ HRESULT ComponentAccessible::get_accValue(VARIANT child, BSTR* value) {
   if (!value) return E_POINTER;
   *value = nullptr;
   return forChild(child, [&](LONG id) -> HRESULT {
-    std::string text;
-    if (!valueOf(id, text)) return DISP_E_MEMBERNOTFOUND;
+    std::wstring text;
+    if (!wideValueOf(id, text)) return DISP_E_MEMBERNOTFOUND;
     if (text.empty()) {
       *value = SysAllocString(L"");
       return *value ? S_OK : E_OUTOFMEMORY;

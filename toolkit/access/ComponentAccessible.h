@@ -95,6 +95,8 @@ protected:
   // The name as clients read it: nameOf's ANSI text widened, unless a component keeps
   // texts in UTF-16 and answers them as they are.
   virtual std::wstring wideNameOf(LONG child) const;
+  // The value as clients read it, likewise: valueOf's text widened unless overridden.
+  virtual bool wideValueOf(LONG child, std::wstring& value) const;
   virtual bool valueOf(LONG child, std::string& value) const;  // false: no value
   virtual LONG roleOf(LONG child) const;
   virtual LONG stateOf(LONG child) const;

@@ -134,19 +134,30 @@ bool TableAccessible::valueOf(LONG child, std::string& value) const {
 }
 
 // Wide text cells reach the client as they are stored, never through the ANSI code page.
-std::wstring TableAccessible::wideNameOf(LONG child) const {
-  if (child == CHILDID_SELF) return ComponentAccessible::wideNameOf(child);
+std::wstring TableAccessible::wideCellsOf(int row) const {
   const Table& t = table();
-  const int row = rowOf(child);
-  std::wstring name;
+  std::wstring cells;
   bool first = true;
   for (int column : t.displayOrder()) {
     if (!t.isColumnVisible(column)) continue;
-    if (!first) name += L'\t';
-    name += t.getCellWideText(row, column);
+    if (!first) cells += L'\t';
+    cells += t.getCellWideText(row, column);
     first = false;
   }
-  return name;
+  return cells;
+}
+
+std::wstring TableAccessible::wideNameOf(LONG child) const {
+  if (child == CHILDID_SELF || !table().rowName(rowOf(child)).empty()) return ComponentAccessible::wideNameOf(child);
+  return wideCellsOf(rowOf(child));
+}
+
+bool TableAccessible::wideValueOf(LONG child, std::wstring& value) const {
+  if (child == CHILDID_SELF || table().rowName(rowOf(child)).empty()) {
+    return ComponentAccessible::wideValueOf(child, value);
+  }
+  value = wideCellsOf(rowOf(child));
+  return true;
 }
 
 LONG TableAccessible::roleOf(LONG child) const {

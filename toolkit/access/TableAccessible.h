@@ -33,6 +33,7 @@ protected:
   std::string nameOf(LONG child) const override;
   bool valueOf(LONG child, std::string& value) const override;
   std::wstring wideNameOf(LONG child) const override;
+  bool wideValueOf(LONG child, std::wstring& value) const override;
   LONG roleOf(LONG child) const override;
   LONG stateOf(LONG child) const override;
   RECT screenRectOf(LONG child) const override;
@@ -46,6 +47,7 @@ private:
   Table& table() const;
   int rowOf(LONG child) const;  // stored row of a child id
   std::string cellsOf(int row) const;  // the visible cells joined by tabs
+  std::wstring wideCellsOf(int row) const;  // likewise, wide text cells as stored
 };
 
 }  // namespace toolkit

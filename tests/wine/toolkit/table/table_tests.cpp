@@ -265,6 +265,12 @@ TEST_CASE("wide text cells keep texts in any script for clients; text cells go t
   br::test::AccessibleReader reader(m.table.getHandle());
   REQUIRE(reader.get() != nullptr);
   CHECK(reader.ChildNames() == std::vector<std::wstring>{greek, arabic});
+  // A row its owner names gives its cells as its value, as stored too.
+  m.table.setRowNamer([](int row) { return row == 0 ? std::string("Harbour") : std::string(); });
+  CHECK(reader.Name(1) == L"Harbour");
+  CHECK(reader.Value(1) == greek);
+  CHECK(reader.Name(2) == arabic);
+  m.table.setRowNamer(nullptr);
   // A narrow text column takes a wide text through the ANSI code page: letters it lacks are lost.
   m.table.addColumn("narrow", "Narrow", 1, 0, nullptr, false);
   CHECK(m.table.setCellWideText(1, 0, L"Brest"));
