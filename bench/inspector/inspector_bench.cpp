@@ -2,12 +2,17 @@
 // holds, in a chart database, 1,000 beacons with a light and a topmark each (the fill adds
 // both below every beacon: 3,000 items), and in a user database 1,000 objects of mixed
 // classes (grouped, no relations). Each round replaces the whole tree; the figures are the
-// best and the median of the rounds. Usage: inspector_bench [ROUNDS]
+// best and the median of the rounds. With "scale": one chart dataset of 100,000 objects,
+// 20,000 beacons each holding a light, a topmark, a fog signal, a radio station and the next
+// beacon's light, and SetInfo of 5,000 of the beacons, which the fill cuts at its item cap;
+// the process's memory is printed before and after.
+// Usage: inspector_bench [ROUNDS] [scale]
 #include "BR_Info.h"
 #include "GeoData.h"
 
 #include <windows.h>
 #include <commctrl.h>
+#include <psapi.h>
 
 #include <algorithm>
 #include <chrono>
@@ -46,6 +51,32 @@ std::string SceneJson() {
   return "{\"format\":\"chartscene 1\",\"databases\":["
          "{\"name\":\"BENCH\",\"kind\":\"chart\",\"datasets\":[{\"id\":\"BENCH001\",\"objects\":[" + chart + "]}]},"
          "{\"name\":\"USERS\",\"kind\":\"user\",\"datasets\":[{\"id\":\"USER0001\",\"objects\":[" + user + "]}]}]}";
+}
+
+// 100,000 objects in one dataset, related densely: every light belongs to two beacons.
+std::string ScaleJson() {
+  constexpr int kBeacons = 20000;
+  std::string objects;
+  objects.reserve(16u << 20);
+  for (int i = 0; i < kBeacons; ++i) {
+    const std::string n = std::to_string(i), next = std::to_string((i + 1) % kBeacons);
+    if (i) objects += ",";
+    objects += "{\"name\":\"b" + n + "\",\"class\":\"BCNLAT\",\"point\":[48.3,-4.5],\"attributes\":{\"OBJNAM\":\"Beacon " +
+               n + "\"},\"members\":[\"l" + n + "\",\"t" + n + "\",\"f" + n + "\",\"r" + n + "\",\"l" + next + "\"]}";
+    objects += ",{\"name\":\"l" + n + "\",\"class\":\"LIGHTS\",\"point\":[48.3,-4.5],\"attributes\":{\"SIGPER\":4.0}}";
+    objects += ",{\"name\":\"t" + n + "\",\"class\":\"TOPMAR\",\"point\":[48.3,-4.5],\"attributes\":{\"TOPSHP\":3}}";
+    objects += ",{\"name\":\"f" + n + "\",\"class\":\"FOGSIG\",\"point\":[48.3,-4.5]}";
+    objects += ",{\"name\":\"r" + n + "\",\"class\":\"RDOSTA\",\"point\":[48.3,-4.5]}";
+  }
+  return "{\"format\":\"chartscene 1\",\"databases\":[{\"name\":\"SCALE\",\"kind\":\"chart\",\"datasets\":"
+         "[{\"id\":\"SCALE001\",\"objects\":[" + objects + "]}]}]}";
+}
+
+double MemoryMb() {
+  PROCESS_MEMORY_COUNTERS counters{};
+  counters.cb = sizeof counters;
+  if (!K32GetProcessMemoryInfo(GetCurrentProcess(), &counters, sizeof counters)) return -1;
+  return static_cast<double>(counters.PagefileUsage) / (1024.0 * 1024.0);
 }
 
 class Scene {
@@ -130,7 +161,7 @@ HWND FindTree(HWND parent) {
   return nullptr;
 }
 
-int Run(int rounds) {
+int Run(int rounds, bool scale) {
   HMODULE atl = LoadLibraryW(L"atl.dll");
   using InitFn = BOOL(WINAPI*)();
   using GetControlFn = HRESULT(WINAPI*)(HWND, IUnknown**);
@@ -142,7 +173,7 @@ int Run(int rounds) {
   wchar_t folder[MAX_PATH] = {};
   GetTempPathW(MAX_PATH, folder);
   const std::wstring path = std::wstring(folder) + L"inspector_bench_" + std::to_wstring(GetCurrentProcessId()) + L".json";
-  const std::string json = SceneJson();
+  const std::string json = scale ? ScaleJson() : SceneJson();
   HANDLE file = CreateFileW(path.c_str(), GENERIC_WRITE, 0, nullptr, CREATE_ALWAYS, FILE_ATTRIBUTE_NORMAL, nullptr);
   if (file == INVALID_HANDLE_VALUE) return Fail("the scene file cannot be written");
   DWORD written = 0;
@@ -155,15 +186,17 @@ int Run(int rounds) {
     const bool loaded = scene.Load(path);
     DeleteFileW(path.c_str());
     if (!loaded) return Fail("ChartScene.Scene cannot load the scene (is chartscene.dll registered?)");
+    const double loadedMb = MemoryMb();
     std::wstring beacons, users;
-    for (int i = 0; i < 1000; ++i) {
+    for (int i = 0; i < (scale ? 5000 : 1000); ++i) {
       beacons += (i ? L",b" : L"b") + std::to_wstring(i);
       users += (i ? L",u" : L"u") + std::to_wstring(i);
     }
     VARIANT chartRecords = scene.Call(L"ObjectRecords", beacons);
     VARIANT userRecords = scene.Call(L"ObjectRecords", users);
     VARIANT oneRecord = scene.Call(L"ObjectRecords", L"b0");
-    if (chartRecords.vt != (VT_ARRAY | VT_UI1) || userRecords.vt != (VT_ARRAY | VT_UI1)) return Fail("no records");
+    if (chartRecords.vt != (VT_ARRAY | VT_UI1) || (!scale && userRecords.vt != (VT_ARRAY | VT_UI1)))
+      return Fail("no records");
 
     HWND host = CreateWindowExW(0, L"AtlAxWin", L"BR_Info.XObjectInspector", WS_POPUP | WS_VISIBLE, 0, 0, 600, 400,
                                 nullptr, nullptr, GetModuleHandleW(nullptr), nullptr);
@@ -173,6 +206,22 @@ int Run(int rounds) {
         FAILED(control->QueryInterface(IID_IXObjectInspector, reinterpret_cast<void**>(&inspector)))) {
       status = Fail("BR_Info.XObjectInspector cannot be hosted");
     } else {
+      HWND tree = FindTree(host);
+      if (scale) {
+        const Figures big = Time(inspector, chartRecords, tree, rounds);
+        const double filledMb = MemoryMb();
+        for (int i = 0; i < rounds; ++i) inspector->SetInfo(chartRecords);
+        std::printf("scene: 100000 objects in one dataset, records: 5000, rounds: %d\n", rounds);
+        std::printf("SetInfo, 5000 beacons of 5 related objects each: best %.1f ms, median %.1f ms, processor best "
+                    "%.1f ms (%d items)\n",
+                    big.best, big.median, big.cpuBest, big.items);
+        std::printf("memory: %.1f MB with the scene loaded, %.1f MB after the fills, %.1f MB after %d more\n",
+                    loadedMb, filledMb, MemoryMb(), rounds);
+        inspector->Release();
+        inspector = nullptr;
+      }
+    }
+    if (inspector) {
       HWND tree = FindTree(host);
       const Figures chart = Time(inspector, chartRecords, tree, rounds);
       const Figures user = Time(inspector, userRecords, tree, rounds);
@@ -200,8 +249,9 @@ int Run(int rounds) {
 
 int wmain(int argc, wchar_t** argv) {
   const int rounds = argc > 1 ? std::max(1, _wtoi(argv[1])) : 5;
+  const bool scale = argc > 2 && lstrcmpiW(argv[2], L"scale") == 0;
   if (FAILED(OleInitialize(nullptr))) return Fail("OLE cannot start");
-  const int status = Run(rounds);
+  const int status = Run(rounds, scale);
   OleUninitialize();
   return status;
 }

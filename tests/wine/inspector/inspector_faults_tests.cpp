@@ -89,13 +89,11 @@ struct Outcome {
 };
 
 // One pass of everything the inspector asks the host, with the fault in place throughout.
-Outcome Exercise(const DllUnderTest& dll, const ScratchScene& scene, const std::wstring& lightId) {
+Outcome Exercise(const DllUnderTest& dll, const ScratchScene& scene, VARIANT& records, const std::wstring& lightId) {
   Outcome outcome;
   InspectorControl inspector(dll);
   inspector.Host();
-  VARIANT records = scene.Records(kRecords);
   outcome.fill = inspector->SetInfo(records);
-  VariantClear(&records);
   const std::vector<HTREEITEM> items = AllItems(inspector.Tree());
   outcome.items = items.size();
   for (HTREEITEM item : items) {
@@ -126,9 +124,11 @@ TEST_CASE("every host operation failing or answering nothing: fill, choices, For
   {
     ScratchScene scene{ScratchScene::SampleHarbour{}};
     const std::wstring lightId = IdText(ScratchScene::IdOf(scene.Object(L"minou-light-white").Get()));
+    // Made once: the scene keeps the owners of every record array it hands out.
+    VARIANT records = scene.Records(kRecords);
 
     // A pass without faults: what every row is measured against.
-    const Outcome clean = Exercise(dll, scene, lightId);
+    const Outcome clean = Exercise(dll, scene, records, lightId);
     REQUIRE(clean.fill == S_OK);
     REQUIRE(clean.format == S_OK);
     REQUIRE(clean.dataSet == S_OK);
@@ -139,7 +139,7 @@ TEST_CASE("every host operation failing or answering nothing: fill, choices, For
       for (const Kind& kind : kKinds) {
         INFO(std::string(operation), ": ", std::string(kind.name));
         probe.SetFault(operation, kind.result);
-        const Outcome outcome = Exercise(dll, scene, lightId);
+        const Outcome outcome = Exercise(dll, scene, records, lightId);
         probe.ClearFaults();
         ++run;
 
@@ -158,6 +158,7 @@ TEST_CASE("every host operation failing or answering nothing: fill, choices, For
         }
       }
     }
+    VariantClear(&records);
   }
   std::printf("inspector fault sweep: %d operations x %d kinds = %d rows\n",
               static_cast<int>(sizeof(kOperations) / sizeof(kOperations[0])),
