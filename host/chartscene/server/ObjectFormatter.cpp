@@ -97,6 +97,7 @@ STDMETHODIMP ObjectFormatter::FormatObject(long, long flags, IGeoObject* object,
   ComPtr<IGeoObjectEnum> attributes;
   hr = object->GetAttributes(&attributes);
   if (FAILED(hr)) return hr;
+  if (!attributes) return E_FAIL;  // a success that handed out nothing
   std::wstring all = className + L"#";
   bool first = true;
   for (int guard = 0; guard < 100000; ++guard) {

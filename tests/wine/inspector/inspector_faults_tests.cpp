@@ -136,6 +136,8 @@ TEST_CASE("every host operation failing or answering nothing: fill, choices, For
     const std::vector<long> start = Counters(probe);
 
     for (const char* operation : kOperations) {
+      std::printf("%s\n", operation);
+      std::fflush(stdout);
       for (const Kind& kind : kKinds) {
         INFO(std::string(operation), ": ", std::string(kind.name));
         probe.SetFault(operation, kind.result);
@@ -145,7 +147,9 @@ TEST_CASE("every host operation failing or answering nothing: fill, choices, For
 
         // No failure of the host stops the fill: what cannot be read is left out.
         CHECK(outcome.fill == S_OK);
-        CHECK(outcome.items <= clean.items);
+        // A database of unknown kind is grouped as a user's: items may be added, never more
+        // than the grouping's headings.
+        CHECK(outcome.items <= clean.items + 4);
         // Either a text or a failure, never a success without one.
         CHECK((outcome.format == S_OK) == outcome.formatText);
         if (outcome.format != S_OK) CHECK(FAILED(outcome.format));

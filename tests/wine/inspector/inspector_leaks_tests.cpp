@@ -84,9 +84,8 @@ TEST_CASE("10 000 SetInfo calls and repeated choices leave the heaps, GDI object
     inspector.Host();
     // Fills of different sizes and kinds: lights with their lights tab, a collection, a
     // harbour's services, dataset entries.
-    VARIANT fills[] = {scene.Records(L"minou-lighthouse, minou-light-white, minou-group"),
-                       scene.Records(L"harbour, chandlery, fillettes-rock"),
-                       scene.Records(L"dataset:FR5BR010, dataset:LIBBRST, goulet-stream")};
+    VARIANT fills[] = {scene.Records(L"minou-light-white, minou-group"), scene.Records(L"harbour, fillettes-rock"),
+                       scene.Records(L"dataset:LIBBRST, goulet-stream")};
     auto fill = [&](int i) { CHECK(inspector->SetInfo(fills[i % 3]) == S_OK); };
 
     SUBCASE("SetInfo") {
@@ -103,6 +102,7 @@ TEST_CASE("10 000 SetInfo calls and repeated choices leave the heaps, GDI object
       const std::size_t heapAfter = HeapBytesInUse();
       std::printf("inspector heap in use: %zu bytes before, %zu after 10000 SetInfo calls\n", heap, heapAfter);
       std::printf("inspector GDI objects: %ld before, %ld after\n", gdi, GdiObjects());
+      std::fflush(stdout);
       CHECK(heapAfter <= heap + 8192);
       CHECK(GdiObjects() == gdi);
       CHECK(Live(probe) == live);
@@ -117,14 +117,15 @@ TEST_CASE("10 000 SetInfo calls and repeated choices leave the heaps, GDI object
         }
         Pump();
       };
-      for (int i = 0; i < 30; ++i) chooseAll(i);
+      for (int i = 0; i < 10; ++i) chooseAll(i);
       const std::size_t heap = HeapBytesInUse();
       const long gdi = GdiObjects();
       const long live = Live(probe);
-      for (int i = 0; i < 300; ++i) chooseAll(i);
+      for (int i = 0; i < 100; ++i) chooseAll(i);
       const std::size_t heapAfter = HeapBytesInUse();
-      std::printf("inspector heap in use: %zu bytes before, %zu after 300 rounds of choices\n", heap, heapAfter);
+      std::printf("inspector heap in use: %zu bytes before, %zu after 100 rounds of choices\n", heap, heapAfter);
       std::printf("inspector GDI objects: %ld before, %ld after\n", gdi, GdiObjects());
+      std::fflush(stdout);
       CHECK(heapAfter <= heap + 8192);
       CHECK(GdiObjects() == gdi);
       CHECK(Live(probe) == live);
