@@ -361,23 +361,27 @@ bool ChartWindow::SelectNamed(const std::string& name) {
   return true;
 }
 
+namespace {
+struct ChildSearch {
+  const wchar_t* className;
+  HWND found;
+};
+
+// A named function, not a lambda: the callback must be stdcall on 32-bit Windows.
+BOOL CALLBACK MatchChildClass(HWND child, LPARAM data) {
+  auto* search = reinterpret_cast<ChildSearch*>(data);
+  wchar_t name[64] = {};
+  GetClassNameW(child, name, 64);
+  if (lstrcmpiW(name, search->className) != 0) return TRUE;
+  search->found = child;
+  return FALSE;
+}
+}  // namespace
+
 HWND ChartWindow::InspectorChild(const wchar_t* className) const {
   if (!inspectorHost_) return nullptr;
-  struct Search {
-    const wchar_t* className;
-    HWND found;
-  } search{className, nullptr};
-  EnumChildWindows(
-      inspectorHost_,
-      [](HWND child, LPARAM data) -> BOOL {
-        auto* s = reinterpret_cast<Search*>(data);
-        wchar_t name[64] = {};
-        GetClassNameW(child, name, 64);
-        if (lstrcmpiW(name, s->className) != 0) return TRUE;
-        s->found = child;
-        return FALSE;
-      },
-      reinterpret_cast<LPARAM>(&search));
+  ChildSearch search{className, nullptr};
+  EnumChildWindows(inspectorHost_, MatchChildClass, reinterpret_cast<LPARAM>(&search));
   return search.found;
 }
 
