@@ -1,5 +1,7 @@
 #include "inspector/panels/cXTextDescr.h"
 
+#include "toolkit/core/system_library.h"
+
 #include <richedit.h>
 #include <wrl/client.h>
 
@@ -33,19 +35,10 @@ bool AnsiName(const std::wstring& name, std::string& ansi) {
 
 // "RICHEDIT" is registered only by its library; the newer one is the fallback.
 struct RichEditKind {
-  const char* library;
+  const wchar_t* library;
   const char* windowClass;
 };
-constexpr RichEditKind kRichEdits[] = {{"riched32.dll", "RICHEDIT"}, {"riched20.dll", "RichEdit20A"}};
-
-std::string SystemLibrary(const char* file) {
-  char folder[MAX_PATH] = {};
-  const UINT length = GetSystemDirectoryA(folder, MAX_PATH);
-  if (length == 0 || length >= MAX_PATH) return std::string();
-  std::string path(folder, length);
-  if (path.back() != '\\') path += '\\';
-  return path + file;
-}
+constexpr RichEditKind kRichEdits[] = {{L"riched32.dll", "RICHEDIT"}, {L"riched20.dll", "RichEdit20A"}};
 
 }  // namespace
 
@@ -67,9 +60,7 @@ HWND cXTextDescr::MakeRichEdit(HWND ownWindow, std::size_t kind) {
   HMODULE& held = richEditLibraries_[kind];
   if (!held) {
     // From the system folder only: never a library of that name beside the host.
-    const std::string path = SystemLibrary(kRichEdits[kind].library);
-    if (path.empty()) return nullptr;
-    held = LoadLibraryA(path.c_str());
+    held = toolkit::LoadSystemLibrary(kRichEdits[kind].library);
     if (!held) return nullptr;
   }
   HWND edit = CreateWindowExA(WS_EX_CLIENTEDGE, windowClass, "", kRichEditStyle, 0, 0, 0, 0, ownWindow, nullptr,

@@ -1,6 +1,7 @@
 #include "toolkit/text/ScriptLibrary.h"
 
-#include <cwchar>
+#include "toolkit/core/system_library.h"
+
 #include <string>
 
 namespace toolkit {
@@ -25,18 +26,7 @@ void ScriptLibrary::release() {
 
 bool ScriptLibrary::load(const wchar_t* fileName) {
   release();
-  if (!fileName || !*fileName || std::wcspbrk(fileName, L"\\/:")) return false;
-
-  // A full path keeps the loader from searching the host's folder and the current
-  // directory; the altered search path resolves the library's own imports from
-  // the system folder as well.
-  wchar_t folder[MAX_PATH];
-  const UINT length = GetSystemDirectoryW(folder, MAX_PATH);
-  if (length == 0 || length >= MAX_PATH) return false;
-  std::wstring path(folder, length);
-  if (path.back() != L'\\') path += L'\\';
-  path += fileName;
-  module_ = LoadLibraryExW(path.c_str(), nullptr, LOAD_WITH_ALTERED_SEARCH_PATH);
+  module_ = LoadSystemLibrary(fileName);
   if (!module_) return false;
 
   ScriptEntryPoints& e = entry_;
